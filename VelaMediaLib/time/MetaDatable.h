@@ -1,0 +1,40 @@
+#pragma once
+
+#include <VelaMediaLib/time/Attribute.h>
+
+#include <boost/shared_ptr.hpp>
+#include <map>
+#include <string>
+#include <vector>
+
+namespace VelaMediaLib {
+
+/// String metadata of an object: each key holds an observable attribute.
+/// Reads and writes take the project lock through the object's token.
+class MetaDatable {
+public:
+    typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
+
+    explicit MetaDatable(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
+    virtual ~MetaDatable() = default;
+
+    /// Adds the key, or sets the value of the attribute it already has; returns the attribute.
+    AttributePtr addMetaData(const std::string& key, const std::string& value);
+    /// The attribute of the key, or an empty pointer.
+    AttributePtr metaDataAttribute(const std::string& key) const;
+    /// The text of the key, or the empty text when it has none.
+    std::string metaDataValue(const std::string& key) const;
+    bool hasMetaData(const std::string& key) const;
+    /// Returns whether the key was there.
+    bool removeMetaData(const std::string& key);
+    std::vector<std::string> metaDataKeys() const;
+
+    const boost::weak_ptr<const ThreadSafe>& metaDataToken() const { return token_; }
+    void setMetaDataToken(const boost::weak_ptr<const ThreadSafe>& token);
+
+private:
+    std::map<std::string, AttributePtr> metaData_;
+    boost::weak_ptr<const ThreadSafe> token_;
+};
+
+} // namespace VelaMediaLib

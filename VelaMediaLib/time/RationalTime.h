@@ -1,0 +1,30 @@
+#pragma once
+
+#include <VelaMediaLib/time/SafeRational.h>
+
+namespace VelaMediaLib {
+
+/// A time held as an exact rational: the time of keyframes and parameters.
+class RationalTime {
+public:
+    RationalTime() = default;
+    RationalTime(long long numerator, long long denominator) : value_(numerator, denominator) {}
+    RationalTime(long long ticks) : value_(ticks) {}                   // NOLINT: n/1
+    RationalTime(const SafeRational& value) : value_(value) {}         // NOLINT: same value
+
+    SafeRational asRational() const { return value_; }
+    double asDouble() const { return value_.asDouble(); }
+    RationalTime operator-() const { return RationalTime(-value_); }
+
+    bool operator==(const RationalTime& o) const { return value_ == o.value_; }
+    bool operator!=(const RationalTime& o) const { return value_ != o.value_; }
+    bool operator<(const RationalTime& o) const { return value_ < o.value_; }
+    bool operator<=(const RationalTime& o) const { return value_ <= o.value_; }
+    bool operator>(const RationalTime& o) const { return value_ > o.value_; }
+    bool operator>=(const RationalTime& o) const { return value_ >= o.value_; }
+
+private:
+    SafeRational value_;
+};
+
+} // namespace VelaMediaLib

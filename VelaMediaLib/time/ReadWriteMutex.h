@@ -1,0 +1,82 @@
+#pragma once
+// The project's reader-writer lock. Readers announce themselves in one of
+// several cache-line-sized slots, picked per thread, so that readers on
+// different cores never write the same line; a writer raises one flag and
+// waits for every slot to drain. Waiting spins with a back-off that doubles
+// from 1 to 64 pauses and then stays there, yielding the processor at the
+// ceiling so that a waiting thread does not starve the holder on a small
+// machine.
+//
+// The lock is reentrant per thread: a thread that holds it (for reading or
+// writing) may take it again for reading or writing. A reader that asks for
+// the write lock gives up its read share while it waits and takes it back
+// when the write lock ends, so two upgrading readers cannot deadlock; what it
+// read before may have changed by then.
+
+#include <boost/weak_ptr.hpp>
+#include <atomic>
+#include <boost/shared_ptr.hpp>
+
+namespace VelaMediaLib {
+
+class ThreadSafe;
+
+class ReadWriteMutex {
+public:
+    ReadWriteMutex();
+    ReadWriteMutex(const ReadWriteMutex&) = delete;
+    ReadWriteMutex& operator=(const ReadWriteMutex&) = delete;
+
+    void lockRead();
+    void unlockRead();
+    void lockWrite();
+    void unlockWrite();
+
+    /// Guards that take the lock for their lifetime. The token forms lock the
+    /// project's mutex while the project lives, and nothing once it has gone.
+    class ScopedReadLock {
+    public:
+        explicit ScopedReadLock(ReadWriteMutex& mutex);
+        explicit ScopedReadLock(const boost::weak_ptr<const ThreadSafe>& token);
+        ~ScopedReadLock();
+        ScopedReadLock(const ScopedReadLock&) = delete;
+        ScopedReadLock& operator=(const ScopedReadLock&) = delete;
+
+    private:
+        boost::shared_ptr<const ThreadSafe> keepAlive_;
+        ReadWriteMutex* mutex_;
+    };
+
+    class ScopedWriteLock {
+    public:
+        explicit ScopedWriteLock(ReadWriteMutex& mutex);
+        explicit ScopedWriteLock(const boost::weak_ptr<const ThreadSafe>& token);
+        ~ScopedWriteLock();
+        ScopedWriteLock(const ScopedWriteLock&) = delete;
+        ScopedWriteLock& operator=(const ScopedWriteLock&) = delete;
+
+    private:
+        boost::shared_ptr<const ThreadSafe> keepAlive_;
+        ReadWriteMutex* mutex_;
+    };
+
+private:
+    static const int kSlots = 16;
+    struct alignas(64) Slot {
+        std::atomic<int> readers{0};
+    };
+
+    void acquireShared();
+    void releaseShared();
+    void acquireExclusive();
+    void releaseExclusive();
+    Slot& mySlot();
+
+    Slot slots_[kSlots];
+    alignas(64) std::atomic<bool> writer_{false};
+};
+
+typedef ReadWriteMutex::ScopedReadLock ScopedReadLock;
+typedef ReadWriteMutex::ScopedWriteLock ScopedWriteLock;
+
+} // namespace VelaMediaLib

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <VelaMediaLib/time/ReadWriteMutex.h>
+
+namespace VelaMediaLib {
+
+/// The thread-safety token: the project derives from it, so the project itself
+/// is the token every model object holds (weakly) to find the project's lock.
+class ThreadSafe {
+public:
+    ThreadSafe() = default;
+    virtual ~ThreadSafe();
+    ThreadSafe(const ThreadSafe&) = delete;
+    ThreadSafe& operator=(const ThreadSafe&) = delete;
+
+    ReadWriteMutex& mutex() const { return mutex_; }
+
+private:
+    mutable ReadWriteMutex mutex_;
+};
+
+} // namespace VelaMediaLib

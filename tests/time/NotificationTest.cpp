@@ -1,0 +1,196 @@
+#include <VelaMediaLib/time/Attribute.h>
+#include <VelaMediaLib/time/LambdaObserverWithoutNotifyDelay.h>
+#include <VelaMediaLib/time/MetaDatable.h>
+#include <VelaMediaLib/time/MultiObjectObserver.h>
+#include <VelaMediaLib/time/NotifyDelay.h>
+#include <VelaMediaLib/time/SimpleProjectEditRate.h>
+#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/VelaMediaLibException.h>
+
+#include <boost/make_shared.hpp>
+#include <gtest/gtest.h>
+#include <memory>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+struct CountingObserver : Observer {
+    int count = 0;
+    Observable* last = nullptr;
+    void update(Observable* subject) override {
+        ++count;
+        last = subject;
+    }
+};
+
+class Notification : public ::testing::Test {
+protected:
+    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    boost::shared_ptr<Subject> subject = boost::make_shared<Subject>(project);
+    CountingObserver observer;
+};
+
+} // namespace
+
+TEST_F(Notification, DisablersNest) {
+    subject->attach(&observer);
+    {
+        Subject::NotifyDisabler outer = subject->disableNotifies();
+        {
+            Subject::NotifyDisabler inner = subject->disableNotifies();
+            subject->notify();
+        }
+        subject->notify();
+        EXPECT_EQ(observer.count, 0);
+    }
+    subject->notify();
+    EXPECT_EQ(observer.count, 1);
+    EXPECT_EQ(observer.last, subject.get());
+}
+
+TEST_F(Notification, ADelayCoalescesChangesAndTheUndelayedHearAtOnce) {
+    CountingObserver immediate;
+    Subject other(project);
+    CountingObserver otherObserver;
+    subject->attach(&observer);
+    subject->attachWithoutNotifyDelay(&immediate);
+    other.attach(&otherObserver);
+    {
+        NotifyDelay delay(project);
+        NotifyDelay nested(project); // delays count in and out
+        subject->notify();
+        subject->notify();
+        other.notify();
+        EXPECT_TRUE(NotifyDelay::isActive(project));
+        EXPECT_EQ(immediate.count, 2);
+        EXPECT_EQ(observer.count, 0);
+    }
+    EXPECT_FALSE(NotifyDelay::isActive(project));
+    EXPECT_EQ(observer.count, 1);
+    EXPECT_EQ(otherObserver.count, 1);
+    EXPECT_EQ(immediate.count, 2); // not told again at the end of the delay
+}
+
+TEST_F(Notification, ADelayOpenedDuringDeliveryFails) {
+    std::string message;
+    bool notifyingSeen = false;
+    auto opener = LambdaObserverWithoutNotifyDelay(boost::function<void(Observable*)>([&](Observable*) {
+        notifyingSeen = NotifyDelay::isNotifying(project);
+        try {
+            NotifyDelay again(project);
+        } catch (const VelaMediaLibException& e) {
+            message = e.what();
+        }
+    }));
+    subject->attach(&opener);
+    {
+        NotifyDelay delay(project);
+        subject->notify();
+    }
+    EXPECT_TRUE(notifyingSeen);
+    EXPECT_EQ(message, "nested delays not supported");
+    NotifyDelay afterwards(project); // the registry is idle again
+}
+
+TEST_F(Notification, AnObserverInBothListsIsToldOnceAndDetachWorksFromEither) {
+    subject->attach(&observer);
+    subject->attachWithoutNotifyDelay(&observer);
+    subject->attach(&observer);
+    subject->notify();
+    EXPECT_EQ(observer.count, 1);
+    subject->detach(&observer);
+    subject->notify();
+    EXPECT_EQ(observer.count, 1);
+}
+
+TEST_F(Notification, ASubjectDestroyedWhileHeldBackIsForgotten) {
+    auto doomed = std::make_unique<Subject>(project);
+    doomed->attach(&observer);
+    subject->attach(&observer);
+    {
+        NotifyDelay delay(project);
+        doomed->notify();
+        subject->notify();
+        doomed.reset();
+    }
+    EXPECT_EQ(observer.count, 1);
+    EXPECT_EQ(observer.last, subject.get());
+}
+
+TEST_F(Notification, ASubjectOutlivingItsProjectStillNotifies) {
+    subject->attach(&observer);
+    project.reset();
+    subject->notify();
+    EXPECT_EQ(observer.count, 1);
+}
+
+TEST_F(Notification, ScopedObserversDetachThemselves) {
+    int heard = 0;
+    {
+        auto lambda = LambdaObserverWithoutNotifyDelay::createWithScopedAttachDetach(
+            subject, [&](Observable*) { ++heard; });
+        NotifyDelay delay(project);
+        subject->notify();
+        EXPECT_EQ(heard, 1);
+    }
+    subject->notify();
+    EXPECT_EQ(heard, 1);
+
+    auto second = boost::make_shared<Subject>(project);
+    std::vector<Observable*> changed;
+    {
+        MultiObjectObserver multi([&](Observable* s) { changed.push_back(s); });
+        multi.observe(subject);
+        multi.observe(second);
+        subject->notify();
+        second->notify();
+        second.reset(); // an expired subject is skipped at detach
+    }
+    subject->notify();
+    ASSERT_EQ(changed.size(), 2u);
+    EXPECT_EQ(changed[0], subject.get());
+}
+
+TEST_F(Notification, AttributesAndMetadataTellOnlyRealChanges) {
+    MetaDatable metadata(project);
+    auto attribute = metadata.addMetaData("author", "ada");
+    attribute->attach(&observer);
+    EXPECT_EQ(metadata.addMetaData("author", "ada"), attribute);
+    EXPECT_EQ(observer.count, 0);
+    metadata.addMetaData("author", "grace");
+    EXPECT_EQ(observer.count, 1);
+    EXPECT_EQ(metadata.metaDataValue("author"), "grace");
+    EXPECT_EQ(metadata.metaDataValue("missing"), "");
+    EXPECT_FALSE(metadata.metaDataAttribute("missing"));
+    EXPECT_TRUE(metadata.removeMetaData("author"));
+    EXPECT_FALSE(metadata.removeMetaData("author"));
+    EXPECT_TRUE(metadata.metaDataKeys().empty());
+
+    Attribute<bool> flag("solo", false, project);
+    flag.attach(&observer);
+    EXPECT_FALSE(flag.setValue(false));
+    EXPECT_TRUE(flag.setValue(true));
+    EXPECT_EQ(observer.count, 2);
+    EXPECT_EQ(flag.name(), "solo");
+}
+
+TEST(SimpleProjectEditRate, NotifiesAfterStoringTheRate) {
+    SimpleProjectEditRate rate(boost::rational<unsigned long>(30));
+    struct Reader : Observer {
+        const ProjectEditRate* rate = nullptr;
+        boost::rational<unsigned long> seen;
+        void update(Observable*) override { seen = rate->editRate(); }
+    } reader;
+    reader.rate = &rate;
+    rate.attachEditRateObserver(&reader);
+    rate.setEditRate(boost::rational<unsigned long>(30000, 1001));
+    EXPECT_EQ(reader.seen, boost::rational<unsigned long>(30000, 1001));
+    EXPECT_EQ(rate.videoFrameRate(), 30);
+    EXPECT_EQ(rate.audioSampleRate(), 44100);
+    EXPECT_EQ(rate.durationPerFrame(), 1);
+    EXPECT_EQ(rate.editingUnit(), 1u);
+    EXPECT_THROW(rate.setEditRate(boost::rational<unsigned long>(0)), VelaMediaLibException);
+    EXPECT_EQ(rate.editRate(), boost::rational<unsigned long>(30000, 1001));
+    rate.detachEditRateObserver(&reader);
+}

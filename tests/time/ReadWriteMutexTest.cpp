@@ -1,0 +1,101 @@
+#include <VelaMediaLib/time/ThreadSafe.h>
+
+#include <atomic>
+#include <boost/make_shared.hpp>
+#include <chrono>
+#include <future>
+#include <gtest/gtest.h>
+#include <thread>
+#include <vector>
+
+using namespace VelaMediaLib;
+
+TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
+    ReadWriteMutex mutex;
+    std::atomic<int> inside{0};
+    // Each reader waits, holding the lock, until the other is inside too:
+    // readers that serialised would never both get there.
+    auto reader = [&] {
+        ScopedReadLock lock(mutex);
+        ++inside;
+        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+        while (inside.load() < 2 && std::chrono::steady_clock::now() < deadline) std::this_thread::yield();
+        return inside.load() >= 2;
+    };
+    auto first = std::async(std::launch::async, reader);
+    auto second = std::async(std::launch::async, reader);
+    EXPECT_TRUE(first.get());
+    EXPECT_TRUE(second.get());
+}
+
+TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
+    ReadWriteMutex mutex;
+    std::atomic<int> readers{0}, writers{0}, violations{0};
+    long long sharedValue = 0; // written only under the write lock
+    auto work = [&](int seed) {
+        for (int i = 0; i < 3000; ++i) {
+            if ((i + seed) % 4 == 0) {
+                ScopedWriteLock lock(mutex);
+                if (++writers != 1 || readers.load() != 0) ++violations;
+                ++sharedValue;
+                --writers;
+            } else {
+                ScopedReadLock lock(mutex);
+                ++readers;
+                if (writers.load() != 0) ++violations;
+                volatile long long seen = sharedValue;
+                (void)seen;
+                --readers;
+            }
+        }
+    };
+    std::vector<std::thread> threads;
+    for (int t = 0; t < 4; ++t) threads.emplace_back(work, t);
+    for (std::thread& thread : threads) thread.join();
+    EXPECT_EQ(violations.load(), 0);
+    EXPECT_EQ(sharedValue, 4 * 750);
+}
+
+TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
+    ReadWriteMutex mutex;
+    {
+        ScopedWriteLock write(mutex);
+        ScopedReadLock read(mutex); // a writer may read what it writes
+        ScopedWriteLock again(mutex);
+    }
+    {
+        ScopedReadLock read(mutex);
+        ScopedReadLock nested(mutex);
+        ScopedWriteLock upgraded(mutex);
+    }
+    // Everything was released: another thread can write at once.
+    auto writer = std::async(std::launch::async, [&] { ScopedWriteLock lock(mutex); return true; });
+    ASSERT_EQ(writer.wait_for(std::chrono::seconds(10)), std::future_status::ready);
+}
+
+TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
+    ReadWriteMutex mutex;
+    mutex.lockWrite();
+    mutex.lockRead();
+    mutex.unlockWrite(); // still reading
+    std::atomic<bool> written{false};
+    std::thread writer([&] { ScopedWriteLock lock(mutex); written = true; });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    EXPECT_FALSE(written.load());
+    mutex.unlockRead();
+    writer.join();
+    EXPECT_TRUE(written.load());
+}
+
+TEST(ReadWriteMutexConcurrency, TokenLocksTakeNothingOnceTheProjectIsGone) {
+    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    const boost::weak_ptr<const ThreadSafe> token = project;
+    {
+        ScopedWriteLock lock(token); // keeps the project alive while held
+        project.reset();
+        EXPECT_FALSE(token.expired());
+    }
+    EXPECT_TRUE(token.expired());
+    ScopedReadLock read(token);
+    ScopedWriteLock write(token);
+}
