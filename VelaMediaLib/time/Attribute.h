@@ -10,8 +10,7 @@ namespace VelaMediaLib {
 /// A named value that tells its observers when it changes. Reads take the
 /// project's read lock and writes its write lock; setting the value it
 /// already has changes nothing and tells nobody.
-template <typename T>
-class Attribute : public Subject {
+template <typename T> class Attribute : public Subject {
 public:
     Attribute(std::string name, T value,
               const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())

@@ -15,7 +15,8 @@ class MetaDatable {
 public:
     typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
 
-    explicit MetaDatable(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
+    explicit MetaDatable(
+        const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
     virtual ~MetaDatable() = default;
 
     /// Adds the key, or sets the value of the attribute it already has; returns the attribute.

@@ -5,8 +5,7 @@
 
 namespace VelaMediaLib {
 
-template <typename T>
-class Range {
+template <typename T> class Range {
 public:
     Range() : first_(), second_() {}
     Range(T first, T second) : first_(first), second_(second) {}
@@ -24,9 +23,7 @@ public:
     const T& duration() const { return second_; }
     T end() const { return first_ + second_; }
 
-    bool operator==(const Range& other) const {
-        return first_ == other.first_ && second_ == other.second_;
-    }
+    bool operator==(const Range& other) const { return first_ == other.first_ && second_ == other.second_; }
     bool operator!=(const Range& other) const { return !(*this == other); }
 
 private:
@@ -34,8 +31,7 @@ private:
     T second_;
 };
 
-template <typename T>
-std::ostream& operator<<(std::ostream& out, const Range<T>& range) {
+template <typename T> std::ostream& operator<<(std::ostream& out, const Range<T>& range) {
     return out << "[" << range.first() << ", " << range.second() << "]";
 }
 

@@ -9,8 +9,8 @@ class RationalTime {
 public:
     RationalTime() = default;
     RationalTime(long long numerator, long long denominator) : value_(numerator, denominator) {}
-    RationalTime(long long ticks) : value_(ticks) {}                   // NOLINT: n/1
-    RationalTime(const SafeRational& value) : value_(value) {}         // NOLINT: same value
+    RationalTime(long long ticks) : value_(ticks) {}           // NOLINT: n/1
+    RationalTime(const SafeRational& value) : value_(value) {} // NOLINT: same value
 
     SafeRational asRational() const { return value_; }
     double asDouble() const { return value_.asDouble(); }

@@ -56,8 +56,10 @@ SafeRational RationalUtil::fromDoubleApprox(double x) {
         const long long middle = (lo + hi) / 2;
         candidate = SafeRational(middle, 10000);
         value = candidate.asDouble();
-        if (target > value) lo = middle + 1;
-        else hi = middle - 1;
+        if (target > value)
+            lo = middle + 1;
+        else
+            hi = middle - 1;
     } while (value != target && lo < hi);
 
     const SafeRational magnitude = SafeRational(whole < 0 ? -whole : whole) + candidate;

@@ -5,50 +5,77 @@
 
 #include <thread>
 
+#define VELA_TLS __attribute__((tls_model("initial-exec")))
+
 namespace VelaMediaLib {
 namespace {
 
-// What this thread holds of which mutex. A thread rarely holds more than one
-// project's lock at a time; the table is small and searched linearly.
+const int kOwnedSlots = 64;
+const int kSharedSlot = kOwnedSlots;
+
+// Which reader slot this thread owns; indices go back to the pool when the
+// thread ends. Threads beyond the pool use the shared slot.
+std::atomic<unsigned long long> slotPool{0};
+thread_local int slotOfThread VELA_TLS = -1;
+thread_local char threadMarker VELA_TLS;
+
+struct SlotReleaser {
+    ~SlotReleaser() {
+        if (slotOfThread >= 0 && slotOfThread < kOwnedSlots)
+            slotPool.fetch_and(~(1ULL << slotOfThread), std::memory_order_release);
+        slotOfThread = kSharedSlot; // a lock taken during thread teardown still works
+    }
+};
+
+int claimSlot() {
+    static thread_local SlotReleaser releaser;
+    (void)releaser;
+    unsigned long long used = slotPool.load(std::memory_order_relaxed);
+    while (~used != 0) {
+        const int index = __builtin_ctzll(~used);
+        if (slotPool.compare_exchange_weak(used, used | (1ULL << index), std::memory_order_acquire))
+            return slotOfThread = index;
+    }
+    return slotOfThread = kSharedSlot;
+}
+
+inline int threadSlot() { return __builtin_expect(slotOfThread >= 0, 1) ? slotOfThread : claimSlot(); }
+inline const void* self() { return &threadMarker; }
+
+// Read depths of the threads on the shared slot, which cannot keep them in it.
 struct Held {
     const ReadWriteMutex* mutex;
     int reads;
-    int writes;
-    bool shared; // whether a reader slot is counted for this thread
+    bool counted; // whether this thread's share is counted in the shared slot
 };
 const int kMaxHeld = 8;
-struct HeldTable {
-    Held entries[kMaxHeld];
-    int count;
-};
-thread_local HeldTable held __attribute__((tls_model("initial-exec")));
-thread_local int slotOfThread __attribute__((tls_model("initial-exec"))) = -1;
-std::atomic<int> nextSlot{0};
+thread_local Held heldEntries[kMaxHeld] VELA_TLS;
+thread_local int heldCount VELA_TLS = 0;
 
 Held* findHeld(const ReadWriteMutex* mutex) {
-    for (int i = 0; i < held.count; ++i)
-        if (held.entries[i].mutex == mutex) return &held.entries[i];
+    for (int i = 0; i < heldCount; ++i)
+        if (heldEntries[i].mutex == mutex) return &heldEntries[i];
     return nullptr;
 }
 
 Held* addHeld(const ReadWriteMutex* mutex) {
-    if (held.count == kMaxHeld)
-        throw VelaMediaLibFatalException("too many project locks held by one thread");
-    held.entries[held.count] = Held{mutex, 0, 0, false};
-    return &held.entries[held.count++];
+    if (heldCount == kMaxHeld) throw VelaMediaLibFatalException("too many project locks held by one thread");
+    heldEntries[heldCount] = Held{mutex, 0, false};
+    return &heldEntries[heldCount++];
 }
 
 void dropIfFree(Held* entry) {
-    if (entry->reads != 0 || entry->writes != 0) return;
-    *entry = held.entries[--held.count];
+    if (entry->reads == 0) *entry = heldEntries[--heldCount];
 }
 
 class Backoff {
 public:
     void pause() {
         for (int i = 0; i < spins_; ++i) __builtin_ia32_pause();
-        if (spins_ < 64) spins_ *= 2;
-        else std::this_thread::yield();
+        if (spins_ < 64)
+            spins_ *= 2;
+        else
+            std::this_thread::yield();
     }
 
 private:
@@ -59,23 +86,57 @@ private:
 
 ReadWriteMutex::ReadWriteMutex() = default;
 
-ReadWriteMutex::Slot& ReadWriteMutex::mySlot() {
-    if (slotOfThread < 0) slotOfThread = nextSlot.fetch_add(1, std::memory_order_relaxed) % kSlots;
-    return slots_[slotOfThread];
-}
-
-void ReadWriteMutex::acquireShared() {
-    Slot& slot = mySlot();
+void ReadWriteMutex::lockRead() {
+    const int index = threadSlot();
+    if (index == kSharedSlot) return lockReadShared();
+    std::atomic<int>& readers = slot(index).readers;
+    const int depth = readers.load(std::memory_order_relaxed);
+    if (depth != 0 || writerOwner_.load(std::memory_order_relaxed) == self()) {
+        readers.store(depth + 1, std::memory_order_relaxed); // nested, or reading what we write
+        return;
+    }
     Backoff backoff;
     for (;;) {
-        slot.readers.fetch_add(1, std::memory_order_seq_cst);
+        readers.exchange(1, std::memory_order_seq_cst);
         if (!writer_.load(std::memory_order_seq_cst)) return;
-        slot.readers.fetch_sub(1, std::memory_order_release);
+        readers.store(0, std::memory_order_release);
         while (writer_.load(std::memory_order_acquire)) backoff.pause();
     }
 }
 
-void ReadWriteMutex::releaseShared() { mySlot().readers.fetch_sub(1, std::memory_order_release); }
+void ReadWriteMutex::unlockRead() {
+    const int index = threadSlot();
+    if (index == kSharedSlot) return unlockReadShared();
+    std::atomic<int>& readers = slot(index).readers;
+    readers.store(readers.load(std::memory_order_relaxed) - 1, std::memory_order_release);
+}
+
+void ReadWriteMutex::lockReadShared() {
+    if (Held* entry = findHeld(this)) {
+        ++entry->reads;
+        return;
+    }
+    Held* entry = addHeld(this); // may throw: take nothing before it
+    entry->reads = 1;
+    if (writerOwner_.load(std::memory_order_relaxed) == self()) return;
+    std::atomic<int>& readers = slot(kSharedSlot).readers;
+    Backoff backoff;
+    for (;;) {
+        readers.fetch_add(1, std::memory_order_seq_cst);
+        if (!writer_.load(std::memory_order_seq_cst)) break;
+        readers.fetch_sub(1, std::memory_order_release);
+        while (writer_.load(std::memory_order_acquire)) backoff.pause();
+    }
+    entry->counted = true;
+}
+
+void ReadWriteMutex::unlockReadShared() {
+    Held* entry = findHeld(this);
+    if (!entry) return;
+    if (--entry->reads == 0 && entry->counted)
+        slot(kSharedSlot).readers.fetch_sub(1, std::memory_order_release);
+    dropIfFree(entry);
+}
 
 void ReadWriteMutex::acquireExclusive() {
     Backoff backoff;
@@ -84,60 +145,61 @@ void ReadWriteMutex::acquireExclusive() {
         expected = false;
         backoff.pause();
     }
-    for (Slot& slot : slots_)
-        while (slot.readers.load(std::memory_order_seq_cst) != 0) backoff.pause();
+    for (Slot& each : slots_)
+        while (each.readers.load(std::memory_order_seq_cst) != 0) backoff.pause();
 }
 
-void ReadWriteMutex::releaseExclusive() { writer_.store(false, std::memory_order_release); }
+// A reader asking for the write lock gives its share up while it waits, so
+// that two upgrading readers cannot wait for each other.
+// Returns the reads to take back afterwards (the shared-slot threads keep
+// theirs in their own table).
+int ReadWriteMutex::dropReadShareForWrite(int index) {
+    if (index != kSharedSlot) return slot(index).readers.exchange(0, std::memory_order_release);
+    Held* entry = findHeld(this);
+    if (entry && entry->counted) {
+        slot(kSharedSlot).readers.fetch_sub(1, std::memory_order_release);
+        entry->counted = false;
+    }
+    return 0;
+}
 
-void ReadWriteMutex::lockRead() {
-    if (Held* entry = findHeld(this)) {
-        ++entry->reads;
+// Takes the reads this thread still holds back before the writer flag drops,
+// so that a writer that also reads keeps reading without a gap.
+void ReadWriteMutex::restoreReadShareAfterWrite(int index) {
+    if (index != kSharedSlot) {
+        std::atomic<int>& readers = slot(index).readers;
+        readers.store(readers.load(std::memory_order_relaxed) + savedReads_, std::memory_order_relaxed);
+        savedReads_ = 0;
         return;
     }
-    Held* entry = addHeld(this); // may throw: take nothing before it
-    acquireShared();
-    entry->reads = 1;
-    entry->shared = true;
-}
-
-void ReadWriteMutex::unlockRead() {
     Held* entry = findHeld(this);
-    if (!entry || entry->reads == 0) return;
-    if (--entry->reads == 0 && entry->writes == 0 && entry->shared) releaseShared();
-    dropIfFree(entry);
+    if (entry && entry->reads > 0 && !entry->counted) {
+        slot(kSharedSlot).readers.fetch_add(1, std::memory_order_relaxed);
+        entry->counted = true;
+    }
 }
 
 void ReadWriteMutex::lockWrite() {
-    Held* entry = findHeld(this);
-    if (entry && entry->writes > 0) {
-        ++entry->writes;
+    if (writerOwner_.load(std::memory_order_relaxed) == self()) {
+        ++writeDepth_;
         return;
     }
-    if (!entry) entry = addHeld(this);
-    if (entry->shared) {
-        releaseShared(); // upgrade: give the read share up while waiting
-        entry->shared = false;
-    }
+    const int saved = dropReadShareForWrite(threadSlot());
     acquireExclusive();
-    entry->writes = 1;
+    savedReads_ = saved;
+    writerOwner_.store(self(), std::memory_order_relaxed);
+    writeDepth_ = 1;
 }
 
 void ReadWriteMutex::unlockWrite() {
-    Held* entry = findHeld(this);
-    if (!entry || entry->writes == 0) return;
-    if (--entry->writes > 0) return;
-    if (entry->reads > 0) {
-        mySlot().readers.fetch_add(1, std::memory_order_seq_cst); // downgrade without a gap
-        entry->shared = true;
-    }
-    releaseExclusive();
-    dropIfFree(entry);
+    if (writerOwner_.load(std::memory_order_relaxed) != self()) return;
+    if (--writeDepth_ > 0) return;
+    restoreReadShareAfterWrite(threadSlot());
+    writerOwner_.store(nullptr, std::memory_order_relaxed);
+    writer_.store(false, std::memory_order_release);
 }
 
-ReadWriteMutex::ScopedReadLock::ScopedReadLock(ReadWriteMutex& mutex) : mutex_(&mutex) {
-    mutex_->lockRead();
-}
+ReadWriteMutex::ScopedReadLock::ScopedReadLock(ReadWriteMutex& mutex) : mutex_(&mutex) { mutex_->lockRead(); }
 
 ReadWriteMutex::ScopedReadLock::ScopedReadLock(const boost::weak_ptr<const ThreadSafe>& token)
     : keepAlive_(token.lock()), mutex_(keepAlive_ ? &keepAlive_->mutex() : nullptr) {

@@ -1,8 +1,9 @@
 #pragma once
-// The project's reader-writer lock. Readers announce themselves in one of
-// several cache-line-sized slots, picked per thread, so that readers on
-// different cores never write the same line; a writer raises one flag and
-// waits for every slot to drain. Waiting spins with a back-off that doubles
+// The project's reader-writer lock. Each thread owns a cache-line-sized
+// reader slot (up to 64 threads at once; further threads share one counted
+// slot), so readers on different cores never write the same line and a read
+// lock costs one exchange; a writer raises one flag and waits for every slot
+// to drain. Waiting spins with a back-off that doubles
 // from 1 to 64 pauses and then stays there, yielding the processor at the
 // ceiling so that a waiting thread does not starve the holder on a small
 // machine.
@@ -61,19 +62,23 @@ public:
     };
 
 private:
-    static const int kSlots = 16;
+    static const int kOwnedSlots = 64;
     struct alignas(64) Slot {
         std::atomic<int> readers{0};
     };
 
-    void acquireShared();
-    void releaseShared();
+    Slot& slot(int index) { return slots_[index]; }
+    void lockReadShared();
+    void unlockReadShared();
+    int dropReadShareForWrite(int index);
+    void restoreReadShareAfterWrite(int index);
     void acquireExclusive();
-    void releaseExclusive();
-    Slot& mySlot();
 
-    Slot slots_[kSlots];
+    Slot slots_[kOwnedSlots + 1]; // the last slot is shared by the threads beyond 64
     alignas(64) std::atomic<bool> writer_{false};
+    std::atomic<const void*> writerOwner_{nullptr};
+    int writeDepth_ = 0; // touched only by the writer
+    int savedReads_ = 0; // the writer's own read share, given up while it writes
 };
 
 typedef ReadWriteMutex::ScopedReadLock ScopedReadLock;

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/time/SafeRational.h>
 
+#include <boost/integer/common_factor_rt.hpp>
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
@@ -25,19 +26,10 @@ inline long long wrapDiv(long long a, long long b) { return b == -1 ? wrapNeg(a)
 
 inline Bits magnitude(long long a) { return a < 0 ? Bits(0) - Bits(a) : Bits(a); }
 
-// Binary gcd of the magnitudes; gcd(0, b) = |b|.
-long long gcd(long long a, long long b) {
-    Bits u = magnitude(a), v = magnitude(b);
-    if (u == 0) return (long long)v;
-    if (v == 0) return (long long)u;
-    const int shift = __builtin_ctzll(u | v);
-    u >>= __builtin_ctzll(u);
-    do {
-        v >>= __builtin_ctzll(v);
-        if (u > v) std::swap(u, v);
-        v -= u;
-    } while (v != 0);
-    return (long long)(u << shift);
+// gcd of the magnitudes, gcd(0, b) = |b|; unsigned so that the most negative
+// value has a magnitude.
+inline long long gcd(long long a, long long b) {
+    return (long long)boost::integer::gcd(magnitude(a), magnitude(b));
 }
 
 long long saturatedTruncation(double x) {
@@ -83,9 +75,8 @@ boost::rational<long long> SafeRational::fromDouble(double x) {
 SafeRational guardedResult(long long num, long long den, double expected) {
     if (den > 0) {
         const double exact = double(num) / double(den);
-        const bool close = std::fabs(expected) > 1e-8
-                               ? std::fabs(exact / expected - 1.0) < 0.01
-                               : (num == 0 && den == 1);
+        const bool close =
+            std::fabs(expected) > 1e-8 ? std::fabs(exact / expected - 1.0) < 0.01 : (num == 0 && den == 1);
         if (close) return SafeRational(num, den, SafeRational::Unreduced());
     }
     return SafeRational(SafeRational::fromDouble(expected));
@@ -93,8 +84,8 @@ SafeRational guardedResult(long long num, long long den, double expected) {
 
 SafeRational operator+(const SafeRational& a, const SafeRational& b) {
     const long long g = gcd(a.denominator(), b.denominator());
-    const long long num = wrapAdd(wrapMul(a.numerator(), b.denominator() / g),
-                                  wrapMul(b.numerator(), a.denominator() / g));
+    const long long num =
+        wrapAdd(wrapMul(a.numerator(), b.denominator() / g), wrapMul(b.numerator(), a.denominator() / g));
     const long long g2 = gcd(num, g);
     const long long den = wrapMul(a.denominator() / g, wrapDiv(b.denominator(), g2));
     return guardedResult(wrapDiv(num, g2), den, a.asDouble() + b.asDouble());
@@ -102,8 +93,8 @@ SafeRational operator+(const SafeRational& a, const SafeRational& b) {
 
 SafeRational operator-(const SafeRational& a, const SafeRational& b) {
     const long long g = gcd(a.denominator(), b.denominator());
-    const long long num = wrapSub(wrapMul(a.numerator(), b.denominator() / g),
-                                  wrapMul(b.numerator(), a.denominator() / g));
+    const long long num =
+        wrapSub(wrapMul(a.numerator(), b.denominator() / g), wrapMul(b.numerator(), a.denominator() / g));
     const long long g2 = gcd(num, g);
     const long long den = wrapMul(a.denominator() / g, wrapDiv(b.denominator(), g2));
     return guardedResult(wrapDiv(num, g2), den, a.asDouble() - b.asDouble());

@@ -33,9 +33,7 @@ public:
     /// formed in 128 bits so long recordings at the flick scale do not wrap.
     static long long convertTimeToScale(const long long& time, long long fromScale, long long toScale);
 
-    bool operator==(const ScaledTime& other) const {
-        return time_ == other.time_ && scale_ == other.scale_;
-    }
+    bool operator==(const ScaledTime& other) const { return time_ == other.time_ && scale_ == other.scale_; }
     bool operator!=(const ScaledTime& other) const { return !(*this == other); }
 
 private:

@@ -30,9 +30,7 @@ public:
     static Range<long long> convertRangeToScale(const Range<long long>& range, long long fromScale,
                                                 long long toScale);
 
-    bool operator==(const ScaledTimeRange& o) const {
-        return start_ == o.start_ && duration_ == o.duration_;
-    }
+    bool operator==(const ScaledTimeRange& o) const { return start_ == o.start_ && duration_ == o.duration_; }
     bool operator!=(const ScaledTimeRange& o) const { return !(*this == o); }
 
 private:

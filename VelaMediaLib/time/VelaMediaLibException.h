@@ -24,8 +24,7 @@ private:
 };
 
 /// Carries the value that was refused alongside the message.
-template <typename T>
-class ValueException : public VelaMediaLibException {
+template <typename T> class ValueException : public VelaMediaLibException {
 public:
     ValueException(std::string message, T value)
         : VelaMediaLibException(std::move(message)), value_(std::move(value)) {}
@@ -41,10 +40,10 @@ public:
     using ValueException<long long>::ValueException;
 };
 
-#define VELA_DECLARE_EXCEPTION(Name, Base)                                                         \
-    class Name : public Base {                                                                     \
-    public:                                                                                        \
-        using Base::Base;                                                                          \
+#define VELA_DECLARE_EXCEPTION(Name, Base)                                                                   \
+    class Name : public Base {                                                                               \
+    public:                                                                                                  \
+        using Base::Base;                                                                                    \
     }
 
 VELA_DECLARE_EXCEPTION(KeyFrameException, VelaMediaLibException);
@@ -64,8 +63,7 @@ VELA_DECLARE_EXCEPTION(VelaMediaLibFatalException, VelaMediaLibException);
 class CollisionException : public VelaMediaLibException {
 public:
     CollisionException(Range<long long> range = Range<long long>(),
-                       boost::shared_ptr<Media> clip = boost::shared_ptr<Media>(),
-                       long long start = 0)
+                       boost::shared_ptr<Media> clip = boost::shared_ptr<Media>(), long long start = 0)
         : VelaMediaLibException("Collision exception."), range_(range), clip_(std::move(clip)),
           start_(start) {}
     const Range<long long>& range() const { return range_; }
@@ -79,13 +77,11 @@ private:
 };
 
 /// A weak back-reference (parent, project, source) that had expired when it was needed.
-template <typename T>
-class DanglingWeakPtrException : public VelaMediaLibException {
+template <typename T> class DanglingWeakPtrException : public VelaMediaLibException {
 public:
     DanglingWeakPtrException()
         : VelaMediaLibException(std::string("dangling weak pointer to ") + typeid(T).name()) {}
-    explicit DanglingWeakPtrException(std::string message)
-        : VelaMediaLibException(std::move(message)) {}
+    explicit DanglingWeakPtrException(std::string message) : VelaMediaLibException(std::move(message)) {}
 };
 
 } // namespace VelaMediaLib

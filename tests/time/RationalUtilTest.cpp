@@ -12,7 +12,7 @@ TEST(RationalUtil, RoundingOnBothSidesOfZero) {
         SafeRational x;
         long long floor, ceil, round;
     };
-    const Case cases[] = {{SafeRational(5, 2), 2, 3, 3},   {SafeRational(-5, 2), -3, -2, -3},
+    const Case cases[] = {{SafeRational(5, 2), 2, 3, 3},    {SafeRational(-5, 2), -3, -2, -3},
                           {SafeRational(-1, 2), -1, 0, -1}, {SafeRational(1, 3), 0, 1, 0},
                           {SafeRational(-1, 3), -1, 0, 0},  {SafeRational(4), 4, 4, 4},
                           {SafeRational(-4), -4, -4, -4},   {SafeRational(7, 3), 2, 3, 2}};
@@ -33,7 +33,8 @@ TEST(RationalUtil, ModResAndTicks) {
     EXPECT_EQ(RationalUtil::toVelaTimeRange(Range<SafeRational>(SafeRational(7, 2), SafeRational(-7, 2))),
               Range<long long>(3, -3));
     EXPECT_FLOAT_EQ(RationalUtil::toFloat(SafeRational(1, 4)), 0.25f);
-    EXPECT_EQ(RationalUtil::toDoubleRange(Range<SafeRational>(SafeRational(1, 2), 2)), Range<double>(0.5, 2.0));
+    EXPECT_EQ(RationalUtil::toDoubleRange(Range<SafeRational>(SafeRational(1, 2), 2)),
+              Range<double>(0.5, 2.0));
 }
 
 TEST(RationalUtil, FromDoubleApproxBisectsTenThousandths) {
@@ -61,8 +62,9 @@ TEST(TimeUtil, SecondsAndTicksAtNtscRates) {
     EXPECT_EQ(TimeUtil::fromSecondsToVelaTimeTruncated(1.0, ntsc), 29);
     EXPECT_EQ(TimeUtil::fromSecondsToVelaTimeRounded(-1.0, ntsc), -30);
     EXPECT_DOUBLE_EQ(TimeUtil::fromVelaTimeToSeconds(30000, ntsc), 1001.0);
-    EXPECT_DOUBLE_EQ(TimeUtil::fromVelaRationalToSeconds(SafeRational(1, 2), boost::rational<unsigned long>(30)),
-                     1.0 / 60.0);
+    EXPECT_DOUBLE_EQ(
+        TimeUtil::fromVelaRationalToSeconds(SafeRational(1, 2), boost::rational<unsigned long>(30)),
+        1.0 / 60.0);
     // 10 * 5/4 = 12.5 rounds to 13, then whole units of 4 keep 12.
     EXPECT_EQ(TimeUtil::durationWithScalarRoundedToEditingUnit(10, SafeRational(5, 4), 4), 12);
     EXPECT_EQ(TimeUtil::durationWithScalarRoundedToEditingUnit(10, SafeRational(5, 4), 1), 13);

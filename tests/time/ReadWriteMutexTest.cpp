@@ -28,21 +28,39 @@ TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
     EXPECT_TRUE(second.get());
 }
 
-TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
+namespace {
+
+// Threads that mix reads, nested reads, upgrades and writes, counting any
+// moment at which a writer shares the lock with anyone.
+void runMixedLoad(int threadCount, int iterations) {
     ReadWriteMutex mutex;
     std::atomic<int> readers{0}, writers{0}, violations{0};
     long long sharedValue = 0; // written only under the write lock
+    auto write = [&] {
+        ScopedWriteLock lock(mutex);
+        if (++writers != 1 || readers.load() != 0) ++violations;
+        ++sharedValue;
+        --writers;
+    };
+    std::atomic<int> started{0};
     auto work = [&](int seed) {
-        for (int i = 0; i < 3000; ++i) {
+        {
+            ScopedReadLock lock(mutex); // every thread reads at once before the mix begins
+            ++started;
+            while (started.load() < threadCount) std::this_thread::yield();
+        }
+        for (int i = 0; i < iterations; ++i) {
             if ((i + seed) % 4 == 0) {
-                ScopedWriteLock lock(mutex);
-                if (++writers != 1 || readers.load() != 0) ++violations;
-                ++sharedValue;
-                --writers;
+                write();
+            } else if ((i + seed) % 8 == 1) {
+                ScopedReadLock outer(mutex);
+                ScopedReadLock nested(mutex);
+                write(); // upgrade: the read share is given up meanwhile
             } else {
                 ScopedReadLock lock(mutex);
                 ++readers;
                 if (writers.load() != 0) ++violations;
+                ScopedReadLock nested(mutex);
                 volatile long long seen = sharedValue;
                 (void)seen;
                 --readers;
@@ -50,11 +68,21 @@ TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
         }
     };
     std::vector<std::thread> threads;
-    for (int t = 0; t < 4; ++t) threads.emplace_back(work, t);
+    for (int t = 0; t < threadCount; ++t) threads.emplace_back(work, t);
     for (std::thread& thread : threads) thread.join();
     EXPECT_EQ(violations.load(), 0);
-    EXPECT_EQ(sharedValue, 4 * 750);
+    long long expected = 0;
+    for (int t = 0; t < threadCount; ++t)
+        for (int i = 0; i < iterations; ++i) expected += ((i + t) % 4 == 0 || (i + t) % 8 == 1) ? 1 : 0;
+    EXPECT_EQ(sharedValue, expected);
 }
+
+} // namespace
+
+TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) { runMixedLoad(4, 3000); }
+
+// More threads than reader slots: the extra threads share the counted slot.
+TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElseBeyondTheOwnedSlots) { runMixedLoad(72, 200); }
 
 TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
     ReadWriteMutex mutex;
@@ -69,7 +97,10 @@ TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
         ScopedWriteLock upgraded(mutex);
     }
     // Everything was released: another thread can write at once.
-    auto writer = std::async(std::launch::async, [&] { ScopedWriteLock lock(mutex); return true; });
+    auto writer = std::async(std::launch::async, [&] {
+        ScopedWriteLock lock(mutex);
+        return true;
+    });
     ASSERT_EQ(writer.wait_for(std::chrono::seconds(10)), std::future_status::ready);
 }
 
@@ -79,7 +110,10 @@ TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
     mutex.lockRead();
     mutex.unlockWrite(); // still reading
     std::atomic<bool> written{false};
-    std::thread writer([&] { ScopedWriteLock lock(mutex); written = true; });
+    std::thread writer([&] {
+        ScopedWriteLock lock(mutex);
+        written = true;
+    });
     std::this_thread::sleep_for(std::chrono::milliseconds(50));
     EXPECT_FALSE(written.load());
     mutex.unlockRead();

@@ -41,7 +41,7 @@ TEST(ScaledTime, GridAlignmentIsSymmetricAroundZero) {
     EXPECT_EQ(ScaledTime(flick, -23520001).alignedFloored(30).time(), -47040000);
     EXPECT_EQ(ScaledTime(flick, -23520001).alignedCeiled(30).time(), -23520000);
     EXPECT_EQ(ScaledTime(flick, 23520000).alignedCeiled(30).time(), 23520000);
-    EXPECT_EQ(ScaledTime(flick, 11760000).alignedRounded(30).time(), 23520000);  // half a frame
+    EXPECT_EQ(ScaledTime(flick, 11760000).alignedRounded(30).time(), 23520000); // half a frame
     EXPECT_EQ(ScaledTime(flick, -11760000).alignedRounded(30).time(), -23520000);
     EXPECT_EQ(ScaledTime(flick, 11759999).alignedRounded(30).time(), 0);
     EXPECT_EQ(ScaledTime(flick, 11759999).alignedRounded(30).scale(), flick);
@@ -64,5 +64,6 @@ TEST(ScaledTimeRange, EndsAndConversions) {
 TEST(ScaledTime, TextForm) {
     std::ostringstream out;
     out << ScaledTime(30, 1) << " " << ScaledTimeRange(30, 0, 30);
-    EXPECT_EQ(out.str(), "{ time: 1, scale: 30} { start: { time: 0, scale: 30}, duration: { time: 30, scale: 30}}");
+    EXPECT_EQ(out.str(),
+              "{ time: 1, scale: 30} { start: { time: 0, scale: 30}, duration: { time: 30, scale: 30}}");
 }

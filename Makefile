@@ -1,0 +1,56 @@
+# Thin front door over CMake. Every target installs missing Debian packages first.
+JOBS ?= $(shell nproc)
+BENCH_FILTER ?= .
+CMAKE_FLAGS ?=
+ifneq ($(CI),)
+CMAKE_FLAGS += -DVELA_WERROR=ON
+endif
+CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
+SOURCES = $(shell git ls-files '*.h' '*.cpp' 2>/dev/null)
+
+.PHONY: deps demo test bench sanitize tsan format format-check install-check
+
+deps:
+	@scripts/install-deps
+
+build/build.ninja: deps
+	$(CONFIGURE)=Debug -B build $(CMAKE_FLAGS)
+
+demo: deps build/build.ninja
+	cmake --build build --target vela-demo -j $(JOBS)
+	./build/examples/vela-demo
+
+test: deps build/build.ninja
+	cmake --build build -j $(JOBS)
+	ctest --test-dir build --output-on-failure -j $(JOBS)
+
+bench: deps
+	$(CONFIGURE)=Release -B build-release -DVELA_BUILD_TESTS=OFF -DVELA_BUILD_EXAMPLES=OFF
+	cmake --build build-release -j $(JOBS)
+	@for b in build-release/bench/bench_*; do echo "== $$b"; $$b --benchmark_filter='$(BENCH_FILTER)'; done
+
+sanitize: deps
+	$(CONFIGURE)=Debug -B build-asan -DVELA_SANITIZE=address,undefined -DVELA_BUILD_BENCH=OFF $(CMAKE_FLAGS)
+	cmake --build build-asan -j $(JOBS)
+	ctest --test-dir build-asan --output-on-failure -j $(JOBS)
+
+# The concurrency suites under ThreadSanitizer.
+tsan: deps
+	$(CONFIGURE)=RelWithDebInfo -B build-tsan -DVELA_SANITIZE=thread -DVELA_BUILD_BENCH=OFF -DVELA_BUILD_EXAMPLES=OFF $(CMAKE_FLAGS)
+	cmake --build build-tsan -j $(JOBS)
+	TSAN_OPTIONS=halt_on_error=1 ctest --test-dir build-tsan -R Concurrency --output-on-failure -j $(JOBS)
+
+format:
+	clang-format -i $(SOURCES)
+
+format-check: deps
+	clang-format --dry-run --Werror $(SOURCES)
+
+# Installs into a scratch prefix and builds a small program against the package config.
+install-check: deps build/build.ninja
+	cmake --build build -j $(JOBS)
+	rm -rf build/prefix build/consumer
+	cmake --install build --prefix $(CURDIR)/build/prefix > /dev/null
+	cmake -G Ninja -S tests/install -B build/consumer -DCMAKE_PREFIX_PATH=$(CURDIR)/build/prefix
+	cmake --build build/consumer
+	./build/consumer/vela-consumer

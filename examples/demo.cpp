@@ -1,0 +1,89 @@
+// A tour of what VelaMediaLib answers, printed readably. It grows with the library.
+#include <VelaMediaLib/VelaMediaLib.h>
+
+#include <iomanip>
+#include <iostream>
+#include <sstream>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+typedef boost::rational<unsigned long> Rate;
+
+std::string text(const SafeRational& value) {
+    std::ostringstream out;
+    out << value;
+    return out.str();
+}
+
+std::string rateName(const Rate& rate) {
+    std::ostringstream out;
+    out << rate.numerator();
+    if (rate.denominator() != 1) out << "/" << rate.denominator();
+    return out.str();
+}
+
+void frameRates() {
+    std::cout << "Frame rates: one frame, and the frame that starts just before one minute\n\n";
+    std::cout << std::left << std::setw(12) << "rate" << std::setw(14) << "frame (s)" << std::setw(14)
+              << "frame flicks" << std::setw(10) << "frame" << std::setw(22) << "starts at (s)"
+              << "in 30 fps ticks (truncated / rounded)\n";
+    const Rate rates[] = {Rate(24), Rate(25), Rate(30000, 1001), Rate(60000, 1001), Rate(44100)};
+    for (const Rate& rate : rates) {
+        const SafeRational frame = SafeRational((long long)rate.denominator(), (long long)rate.numerator());
+        const long long lastFrame = TimeUtil::fromSecondsToVelaTimeTruncated(60.0, rate) - 1;
+        const SafeRational start = frame * lastFrame;
+        const long long frameFlicks = RationalUtil::toVelaTime(frame * ScaledTime::kFlickScale);
+        std::cout << std::setw(12) << rateName(rate) << std::setw(14) << text(frame) << std::setw(14)
+                  << frameFlicks << std::setw(10) << lastFrame << std::setw(22) << std::setprecision(12)
+                  << start.asDouble() << RationalUtil::toVelaTime(start * 30) << " / "
+                  << RationalUtil::toVelaTime(RationalUtil::Round(start * 30)) << "\n";
+    }
+}
+
+void seconds() {
+    const Rate ntsc(30000, 1001);
+    std::cout << std::right << "\nSeconds to ticks at 30000/1001 ticks per second\n";
+    for (double s : {1.0, 1.5, -1.5, 10.01}) {
+        std::cout << "  " << std::setw(6) << s << " s -> rounded " << std::setw(4)
+                  << TimeUtil::fromSecondsToVelaTimeRounded(s, ntsc) << ", truncated " << std::setw(4)
+                  << TimeUtil::fromSecondsToVelaTimeTruncated(s, ntsc) << " ticks\n";
+    }
+    std::cout << "  tick 30 starts at " << std::setprecision(17) << TimeUtil::fromVelaTimeToSeconds(30, ntsc)
+              << " s\n";
+}
+
+void grid() {
+    std::cout << "\nFlick times moved onto the 30 fps grid (one frame = 23520000 flicks)\n";
+    for (long long t : {23520001LL, 35280000LL, -23520001LL}) {
+        const ScaledTime time(ScaledTime::kFlickScale, t);
+        std::cout << "  " << std::setw(10) << t << ": floor " << std::setw(9) << time.alignedFloored(30).time()
+                  << "  ceil " << std::setw(9) << time.alignedCeiled(30).time() << "  round " << std::setw(9)
+                  << time.alignedRounded(30).time() << "\n";
+    }
+}
+
+void rounding() {
+    std::cout << "\nExact rounding (halves away from zero)\n";
+    for (const SafeRational& x : {SafeRational(5, 2), SafeRational(-5, 2), SafeRational(1, 3), SafeRational(-1, 2)})
+        std::cout << "  " << std::setw(5) << text(x) << ": floor " << std::setw(3)
+                  << RationalUtil::Floor(x).asVelaTime() << "  ceil " << std::setw(3)
+                  << RationalUtil::Ceil(x).asVelaTime() << "  round " << std::setw(3)
+                  << RationalUtil::Round(x).asVelaTime() << "\n";
+    std::cout << "  1/3 + 1/6 = " << SafeRational(1, 3) + SafeRational(1, 6) << "\n";
+    const SafeRational a(1000000007, 3037000500), b(3037000507, 3037000501);
+    std::cout << "  " << a << " * " << b << " overflows 64 bits;\n    the guard answers " << a * b
+              << " (\"%f\" of " << std::setprecision(15) << a.asDouble() * b.asDouble() << ")\n";
+}
+
+} // namespace
+
+int main() {
+    std::cout << "VelaMediaLib: exact time at work\n\n";
+    frameRates();
+    seconds();
+    grid();
+    rounding();
+    return 0;
+}
