@@ -11,8 +11,7 @@ namespace {
 
 const size_t kOperands = 1024;
 
-template <typename T>
-std::vector<T> operands() {
+template <typename T> std::vector<T> operands() {
     std::mt19937_64 random(42);
     std::uniform_int_distribution<long long> num(-100000, 100000), den(1, 30000);
     std::vector<T> values;
@@ -23,8 +22,7 @@ std::vector<T> operands() {
     return values;
 }
 
-template <typename T, typename Op>
-void run(benchmark::State& state, Op op) {
+template <typename T, typename Op> void run(benchmark::State& state, Op op) {
     const std::vector<T> values = operands<T>();
     size_t i = 0;
     for (auto _ : state) {
@@ -35,15 +33,21 @@ void run(benchmark::State& state, Op op) {
 
 typedef boost::rational<long long> Boost;
 
-void BM_Add_Boost(benchmark::State& s) { run<Boost>(s, [](const Boost& a, const Boost& b) { return a + b; }); }
+void BM_Add_Boost(benchmark::State& s) {
+    run<Boost>(s, [](const Boost& a, const Boost& b) { return a + b; });
+}
 void BM_Add_Safe(benchmark::State& s) {
     run<SafeRational>(s, [](const SafeRational& a, const SafeRational& b) { return a + b; });
 }
-void BM_Mul_Boost(benchmark::State& s) { run<Boost>(s, [](const Boost& a, const Boost& b) { return a * b; }); }
+void BM_Mul_Boost(benchmark::State& s) {
+    run<Boost>(s, [](const Boost& a, const Boost& b) { return a * b; });
+}
 void BM_Mul_Safe(benchmark::State& s) {
     run<SafeRational>(s, [](const SafeRational& a, const SafeRational& b) { return a * b; });
 }
-void BM_Div_Boost(benchmark::State& s) { run<Boost>(s, [](const Boost& a, const Boost& b) { return a / b; }); }
+void BM_Div_Boost(benchmark::State& s) {
+    run<Boost>(s, [](const Boost& a, const Boost& b) { return a / b; });
+}
 void BM_Div_Safe(benchmark::State& s) {
     run<SafeRational>(s, [](const SafeRational& a, const SafeRational& b) { return a / b; });
 }

@@ -58,15 +58,17 @@ void grid() {
     std::cout << "\nFlick times moved onto the 30 fps grid (one frame = 23520000 flicks)\n";
     for (long long t : {23520001LL, 35280000LL, -23520001LL}) {
         const ScaledTime time(ScaledTime::kFlickScale, t);
-        std::cout << "  " << std::setw(10) << t << ": floor " << std::setw(9) << time.alignedFloored(30).time()
-                  << "  ceil " << std::setw(9) << time.alignedCeiled(30).time() << "  round " << std::setw(9)
+        std::cout << "  " << std::setw(10) << t << ": floor " << std::setw(9)
+                  << time.alignedFloored(30).time() << "  ceil " << std::setw(9)
+                  << time.alignedCeiled(30).time() << "  round " << std::setw(9)
                   << time.alignedRounded(30).time() << "\n";
     }
 }
 
 void rounding() {
     std::cout << "\nExact rounding (halves away from zero)\n";
-    for (const SafeRational& x : {SafeRational(5, 2), SafeRational(-5, 2), SafeRational(1, 3), SafeRational(-1, 2)})
+    for (const SafeRational& x :
+         {SafeRational(5, 2), SafeRational(-5, 2), SafeRational(1, 3), SafeRational(-1, 2)})
         std::cout << "  " << std::setw(5) << text(x) << ": floor " << std::setw(3)
                   << RationalUtil::Floor(x).asVelaTime() << "  ceil " << std::setw(3)
                   << RationalUtil::Ceil(x).asVelaTime() << "  round " << std::setw(3)
