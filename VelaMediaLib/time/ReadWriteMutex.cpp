@@ -82,6 +82,19 @@ private:
     int spins_ = 1;
 };
 
+// A reader announces itself, then looks for a writer; if one is there it
+// withdraws and waits for the flag to drop before trying again.
+template <typename Enter, typename Withdraw>
+void enterWhenNoWriter(const std::atomic<bool>& writer, Enter enter, Withdraw withdraw) {
+    Backoff backoff;
+    for (;;) {
+        enter();
+        if (!writer.load(std::memory_order_seq_cst)) return;
+        withdraw();
+        while (writer.load(std::memory_order_acquire)) backoff.pause();
+    }
+}
+
 } // namespace
 
 ReadWriteMutex::ReadWriteMutex() = default;
@@ -95,13 +108,9 @@ void ReadWriteMutex::lockRead() {
         readers.store(depth + 1, std::memory_order_relaxed); // nested, or reading what we write
         return;
     }
-    Backoff backoff;
-    for (;;) {
-        readers.exchange(1, std::memory_order_seq_cst);
-        if (!writer_.load(std::memory_order_seq_cst)) return;
-        readers.store(0, std::memory_order_release);
-        while (writer_.load(std::memory_order_acquire)) backoff.pause();
-    }
+    enterWhenNoWriter(
+        writer_, [&] { readers.exchange(1, std::memory_order_seq_cst); },
+        [&] { readers.store(0, std::memory_order_release); });
 }
 
 void ReadWriteMutex::unlockRead() {
@@ -120,13 +129,9 @@ void ReadWriteMutex::lockReadShared() {
     entry->reads = 1;
     if (writerOwner_.load(std::memory_order_relaxed) == self()) return;
     std::atomic<int>& readers = slot(kSharedSlot).readers;
-    Backoff backoff;
-    for (;;) {
-        readers.fetch_add(1, std::memory_order_seq_cst);
-        if (!writer_.load(std::memory_order_seq_cst)) break;
-        readers.fetch_sub(1, std::memory_order_release);
-        while (writer_.load(std::memory_order_acquire)) backoff.pause();
-    }
+    enterWhenNoWriter(
+        writer_, [&] { readers.fetch_add(1, std::memory_order_seq_cst); },
+        [&] { readers.fetch_sub(1, std::memory_order_release); });
     entry->counted = true;
 }
 
