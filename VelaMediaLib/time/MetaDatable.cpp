@@ -1,5 +1,7 @@
 #include <VelaMediaLib/time/MetaDatable.h>
 
+#include <VelaMediaLib/document/JSONWriter.h>
+
 namespace VelaMediaLib {
 
 MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
@@ -8,7 +10,8 @@ MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const
     AttributePtr attribute;
     {
         ScopedWriteLock lock(token_);
-        AttributePtr& slot = metaData_[key];
+        if (!metaData_) metaData_.reset(new Map);
+        AttributePtr& slot = (*metaData_)[key];
         if (!slot) {
             slot.reset(new Attribute<std::string>(key, value, token_));
             return slot;
@@ -21,8 +24,9 @@ MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const
 
 MetaDatable::AttributePtr MetaDatable::metaDataAttribute(const std::string& key) const {
     ScopedReadLock lock(token_);
-    const auto found = metaData_.find(key);
-    return found == metaData_.end() ? AttributePtr() : found->second;
+    if (!metaData_) return AttributePtr();
+    const auto found = metaData_->find(key);
+    return found == metaData_->end() ? AttributePtr() : found->second;
 }
 
 std::string MetaDatable::metaDataValue(const std::string& key) const {
@@ -34,20 +38,38 @@ bool MetaDatable::hasMetaData(const std::string& key) const { return bool(metaDa
 
 bool MetaDatable::removeMetaData(const std::string& key) {
     ScopedWriteLock lock(token_);
-    return metaData_.erase(key) > 0;
+    return metaData_ && metaData_->erase(key) > 0;
 }
 
 std::vector<std::string> MetaDatable::metaDataKeys() const {
     ScopedReadLock lock(token_);
     std::vector<std::string> keys;
-    for (const auto& entry : metaData_) keys.push_back(entry.first);
+    if (metaData_)
+        for (const auto& entry : *metaData_) keys.push_back(entry.first);
     return keys;
 }
 
 void MetaDatable::setMetaDataToken(const boost::weak_ptr<const ThreadSafe>& token) {
     ScopedWriteLock lock(token_);
     token_ = token;
-    for (auto& entry : metaData_) entry.second->setProjectMutex(token);
+    if (metaData_)
+        for (auto& entry : *metaData_) entry.second->setProjectMutex(token);
+}
+
+std::map<std::string, std::string> MetaDatable::metaDataCopy() const {
+    ScopedReadLock lock(token_);
+    std::map<std::string, std::string> copy;
+    if (metaData_)
+        for (const auto& entry : *metaData_) copy[entry.first] = entry.second->value();
+    return copy;
+}
+
+void MetaDatable::toJSON(JSONWriter& writer, const MetaDatable& object) {
+    const std::map<std::string, std::string> entries = object.metaDataCopy();
+    if (entries.empty()) return;
+    writer.key("metadata");
+    JSONWriter members(writer.options(), writer.memberLevel());
+    for (const auto& entry : entries) members.key(entry.first) << quotedJSONString(entry.second);
 }
 
 } // namespace VelaMediaLib

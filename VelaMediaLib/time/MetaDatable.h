@@ -4,6 +4,7 @@
 
 #include <boost/shared_ptr.hpp>
 #include <map>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -11,6 +12,8 @@ namespace VelaMediaLib {
 
 /// String metadata of an object: each key holds an observable attribute.
 /// Reads and writes take the project lock through the object's token.
+class JSONWriter;
+
 class MetaDatable {
 public:
     typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
@@ -33,8 +36,15 @@ public:
     const boost::weak_ptr<const ThreadSafe>& metaDataToken() const { return token_; }
     void setMetaDataToken(const boost::weak_ptr<const ThreadSafe>& token);
 
+    /// Writes the keys as the "metadata" member of the object being written,
+    /// when there are any.
+    static void toJSON(JSONWriter& writer, const MetaDatable& object);
+    /// A copy of the keys and values, for cloning.
+    std::map<std::string, std::string> metaDataCopy() const;
+
 private:
-    std::map<std::string, AttributePtr> metaData_;
+    typedef std::map<std::string, AttributePtr> Map;
+    std::unique_ptr<Map> metaData_; // allocated with the first key: most objects carry none
     boost::weak_ptr<const ThreadSafe> token_;
 };
 

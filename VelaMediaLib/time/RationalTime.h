@@ -2,6 +2,8 @@
 
 #include <VelaMediaLib/time/SafeRational.h>
 
+#include <ostream>
+
 namespace VelaMediaLib {
 
 /// A time held as an exact rational: the time of keyframes and parameters.
@@ -26,5 +28,17 @@ public:
 private:
     SafeRational value_;
 };
+
+inline RationalTime operator+(const RationalTime& a, const RationalTime& b) {
+    return RationalTime(a.asRational() + b.asRational());
+}
+inline RationalTime operator-(const RationalTime& a, const RationalTime& b) {
+    return RationalTime(a.asRational() - b.asRational());
+}
+
+/// Written as its rational ("1/30").
+inline std::ostream& operator<<(std::ostream& out, const RationalTime& time) {
+    return out << time.asRational();
+}
 
 } // namespace VelaMediaLib

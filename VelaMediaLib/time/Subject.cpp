@@ -26,22 +26,28 @@ Subject::Subject(const boost::weak_ptr<const ThreadSafe>& token) : token_(token)
 
 Subject::~Subject() { NotifyDelay::removeSubject(this); }
 
+Subject::Lists& Subject::lists() {
+    if (!lists_) lists_.reset(new Lists);
+    return *lists_;
+}
+
 void Subject::attach(Observer* observer) {
     auto guard = lockLists();
-    removeFrom(observersWithoutDelay_, observer);
-    addTo(observers_, observer);
+    removeFrom(lists().withoutDelay, observer);
+    addTo(lists().ordinary, observer);
 }
 
 void Subject::attachWithoutNotifyDelay(Observer* observer) {
     auto guard = lockLists();
-    removeFrom(observers_, observer);
-    addTo(observersWithoutDelay_, observer);
+    removeFrom(lists().ordinary, observer);
+    addTo(lists().withoutDelay, observer);
 }
 
 void Subject::detach(Observer* observer) {
     auto guard = lockLists();
-    removeFrom(observers_, observer);
-    removeFrom(observersWithoutDelay_, observer);
+    if (!lists_) return;
+    removeFrom(lists_->ordinary, observer);
+    removeFrom(lists_->withoutDelay, observer);
 }
 
 // Walks a snapshot, skipping observers detached meanwhile and observers
@@ -59,23 +65,25 @@ void Subject::notify() {
     ScopedReadLock lock(token_);
     if (!notifiesEnabled()) return;
     auto guard = lockLists();
+    if (!lists_) return;
     std::vector<Observer*> told;
-    if (!observersWithoutDelay_.empty()) tell(observersWithoutDelay_, told);
-    if (observers_.empty()) return;
+    if (!lists_->withoutDelay.empty()) tell(lists_->withoutDelay, told);
+    if (lists_->ordinary.empty()) return;
     const boost::shared_ptr<const ThreadSafe> token = token_.lock();
     if (token && NotifyDelay::isActive(token)) {
         NotifyDelay::addSubject(this, token);
         return;
     }
-    tell(observers_, told);
+    tell(lists_->ordinary, told);
 }
 
 void Subject::tellOrdinaryObservers() {
     ScopedReadLock lock(token_);
     if (!notifiesEnabled()) return;
     auto guard = lockLists();
+    if (!lists_) return;
     std::vector<Observer*> told;
-    tell(observers_, told);
+    tell(lists_->ordinary, told);
 }
 
 Subject::NotifyDisabler::NotifyDisabler(Subject& subject) : subject_(subject) { ++subject_.disableCount_; }

@@ -3,6 +3,7 @@
 #include <VelaMediaLib/time/Observable.h>
 
 #include <atomic>
+#include <memory>
 #include <boost/weak_ptr.hpp>
 #include <mutex>
 #include <vector>
@@ -54,11 +55,17 @@ protected:
 
 private:
     friend class NotifyDelay;
+    // Most subjects (keyframes, parameters) never have observers: the lists
+    // are allocated with the first one.
+    struct Lists {
+        std::vector<Observer*> ordinary;
+        std::vector<Observer*> withoutDelay;
+    };
+    Lists& lists();
     void tell(const std::vector<Observer*>& list, std::vector<Observer*>& told);
     void tellOrdinaryObservers();
 
-    std::vector<Observer*> observers_;
-    std::vector<Observer*> observersWithoutDelay_;
+    std::unique_ptr<Lists> lists_;
     std::atomic<int> disableCount_{0};
     bool pendingInDelay_ = false; // guarded by the NotifyDelay registry mutex
     boost::weak_ptr<const ThreadSafe> token_;

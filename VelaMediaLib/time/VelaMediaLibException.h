@@ -3,6 +3,7 @@
 // throwing derives from VelaMediaLibException, which carries its message.
 
 #include <VelaMediaLib/time/Range.h>
+#include <VelaMediaLib/time/RationalTime.h>
 
 #include <boost/shared_ptr.hpp>
 #include <exception>
@@ -46,7 +47,6 @@ public:
         using Base::Base;                                                                                    \
     }
 
-VELA_DECLARE_EXCEPTION(KeyFrameException, VelaMediaLibException);
 VELA_DECLARE_EXCEPTION(TypeException, VelaMediaLibException);
 VELA_DECLARE_EXCEPTION(IOException, VelaMediaLibException);
 VELA_DECLARE_EXCEPTION(IndexException, VelaMediaLibException);
@@ -57,6 +57,21 @@ VELA_DECLARE_EXCEPTION(ParserVersionException, ParserException);
 VELA_DECLARE_EXCEPTION(VelaMediaLibFatalException, VelaMediaLibException);
 
 #undef VELA_DECLARE_EXCEPTION
+
+/// A keyframe operation that could not be carried out: the time it was asked
+/// for and the identifying text of the parameter.
+class KeyFrameException : public VelaMediaLibException {
+public:
+    explicit KeyFrameException(std::string message, RationalTime time = RationalTime(),
+                               std::string identifier = std::string())
+        : VelaMediaLibException(std::move(message)), time_(time), identifier_(std::move(identifier)) {}
+    const RationalTime& time() const { return time_; }
+    const std::string& identifier() const { return identifier_; }
+
+private:
+    RationalTime time_;
+    std::string identifier_;
+};
 
 /// A clip refused by a track because it would overlap another: which range
 /// collided, the clip that was being placed and the start asked for.

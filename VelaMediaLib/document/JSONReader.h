@@ -1,0 +1,37 @@
+#pragma once
+
+#include <VelaMediaLib/time/RationalTime.h>
+#include <VelaMediaLib/time/SafeRational.h>
+
+#include <json/value.h>
+#include <string>
+
+namespace VelaMediaLib {
+
+class MetaDatable;
+
+/// The base of the document readers and the conversions they share.
+class JSONReader {
+public:
+    virtual ~JSONReader() = default;
+
+    /// An integer (n/1) or a string "n/d" whose halves are base-10 64-bit
+    /// integers. A malformed half throws std::invalid_argument or
+    /// std::out_of_range, a zero denominator boost::bad_rational, any other
+    /// JSON type ParserException "Invalid project json - unsupported json
+    /// type for VelaRational: " and the value.
+    static SafeRational jsonValueAsVelaRational(const Json::Value& value);
+    static RationalTime jsonValueAsRationalTime(const Json::Value& value);
+    /// A count of ticks: a 64-bit integer (a whole-valued rational is accepted too).
+    static long long jsonValueAsVelaTime(const Json::Value& value);
+    static SafeRational asRational(const Json::Value& value) { return jsonValueAsVelaRational(value); }
+    static long long asLongLong(const Json::Value& value) { return jsonValueAsVelaTime(value); }
+
+    static const char* idTagName() { return "id"; }
+    static const char* parametersTagName() { return "parameters"; }
+
+    /// Fills the object's metadata from the "metadata" member of the value, if any.
+    static void readMetaData(const Json::Value& value, MetaDatable& object);
+};
+
+} // namespace VelaMediaLib

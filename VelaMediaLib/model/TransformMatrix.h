@@ -1,0 +1,42 @@
+#pragma once
+
+#include <VelaMediaLib/model/Point3d.h>
+
+#include <array>
+#include <ostream>
+
+namespace VelaMediaLib {
+
+/// A 4x4 affine transform, row-major, acting on column vectors (x, y, z, 1).
+class TransformMatrix {
+public:
+    typedef std::array<double, 16> Elements;
+
+    /// The identity.
+    TransformMatrix();
+    explicit TransformMatrix(const Elements& elements) : m_(elements) {}
+
+    static TransformMatrix identity() { return TransformMatrix(); }
+    static TransformMatrix translation(double x, double y, double z);
+    static TransformMatrix scaling(double x, double y, double z);
+    /// Rotation about the z axis, in radians, counter-clockwise.
+    static TransformMatrix rotationZ(double radians);
+
+    double at(int row, int column) const { return m_[row * 4 + column]; }
+    void set(int row, int column, double value) { m_[row * 4 + column] = value; }
+    const Elements& elements() const { return m_; }
+
+    /// this * other: other is applied first.
+    TransformMatrix operator*(const TransformMatrix& other) const;
+    Point3d apply(const Point3d& point) const;
+
+    bool operator==(const TransformMatrix& o) const { return m_ == o.m_; }
+    bool operator!=(const TransformMatrix& o) const { return !(*this == o); }
+
+private:
+    Elements m_;
+};
+
+std::ostream& operator<<(std::ostream& out, const TransformMatrix& matrix);
+
+} // namespace VelaMediaLib

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <VelaMediaLib/time/ParameterImpl.h>
+
+namespace VelaMediaLib {
+
+/// A parameter that only steps: every segment holds the earlier keyframe's
+/// value until the next keyframe, whatever interpolater a keyframe names.
+template <typename T>
+class LeftParameter : public ParameterImpl<T> {
+public:
+    typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
+    using ParameterImpl<T>::ParameterImpl;
+
+    static boost::shared_ptr<LeftParameter> create(const boost::weak_ptr<const ThreadSafe>& token,
+                                                   const std::string& identifier, const T& value,
+                                                   const TimeScalable* scalable = nullptr) {
+        boost::shared_ptr<LeftParameter> parameter(new LeftParameter(token, identifier, scalable));
+        parameter->setDefaultValue(value);
+        return parameter;
+    }
+
+protected:
+    boost::shared_ptr<ParameterImpl<T>> cloneImpl() const override {
+        return boost::shared_ptr<ParameterImpl<T>>(new LeftParameter(*this));
+    }
+    InterpolaterPtr defaultInterpolater() const override { return LeftInterpolater<T>::getInstance(); }
+    InterpolaterPtr segmentInterpolater(const KeyFrame<T>&) const override { return defaultInterpolater(); }
+};
+
+} // namespace VelaMediaLib

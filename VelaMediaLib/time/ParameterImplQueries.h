@@ -1,0 +1,229 @@
+#pragma once
+// ParameterImpl: construction, description and queries.
+
+namespace VelaMediaLib {
+
+// What is read from the other parameter is gathered under its read lock and
+// put in place after it, so that nothing here asks for the write lock while
+// holding the read lock.
+template <typename T>
+ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
+    : Base(other.projectMutex()), identifier_(other.identifier()), scalable_(other.scalable_) {
+    std::map<std::string, std::string> metadata;
+    {
+        ScopedReadLock lock(other.projectMutex());
+        for (const auto& entry : other.keyframes_) keyframes_.push_back({entry.time, entry.keyframe->clone()});
+        if (other.extras_) {
+            extras().bounds = other.extras_->bounds;
+            extras().hints = other.extras_->hints;
+        }
+        metadata = other.generateMetaDataMap();
+    }
+    for (const auto& entry : metadata) metaDataPtr()->addMetaData(entry.first, entry.second);
+}
+
+template <typename T>
+typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
+    if (!extras_) extras_.reset(new Extras);
+    return *extras_;
+}
+
+template <typename T>
+std::string ParameterImpl<T>::identifier() const {
+    ScopedReadLock lock(this->projectMutex());
+    if (extras_ && extras_->identAttribute) return extras_->identAttribute->value();
+    return identifier_;
+}
+
+template <typename T>
+boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
+    ScopedWriteLock lock(this->projectMutex());
+    if (!extras().identAttribute)
+        extras().identAttribute.reset(new Attribute<std::string>("ident", identifier_, this->projectMutex()));
+    return extras().identAttribute;
+}
+
+template <typename T>
+bool ParameterImpl<T>::hasValueBounds() const {
+    ScopedReadLock lock(this->projectMutex());
+    return extras_ && extras_->bounds;
+}
+
+template <typename T>
+bool ParameterImpl<T>::hasUIHints() const {
+    ScopedReadLock lock(this->projectMutex());
+    return extras_ && extras_->hints;
+}
+
+template <typename T>
+boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
+    ScopedReadLock lock(this->projectMutex());
+    return extras_ ? extras_->bounds : boost::none;
+}
+
+template <typename T>
+void ParameterImpl<T>::setValueBounds(const T& minValue, const T& maxValue, const T& defaultValue) {
+    edit([&] { extras().bounds = ValueBounds<T>{minValue, maxValue, defaultValue}; });
+}
+
+template <typename T>
+boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
+    ScopedReadLock lock(this->projectMutex());
+    return extras_ ? extras_->hints : boost::none;
+}
+
+template <typename T>
+void ParameterImpl<T>::setUIHints(const std::string& userInterfaceType, const std::string& unitType) {
+    edit([&] { extras().hints = UIHints{userInterfaceType, unitType}; });
+}
+
+template <typename T>
+MetaDatable* ParameterImpl<T>::metaDataPtr() {
+    ScopedWriteLock lock(this->projectMutex());
+    if (!extras().metadata) extras().metadata.reset(new MetaDatable(this->projectMutex()));
+    return extras().metadata.get();
+}
+
+template <typename T>
+std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
+    ScopedReadLock lock(this->projectMutex());
+    if (!extras_ || !extras_->metadata) return std::map<std::string, std::string>();
+    return extras_->metadata->metaDataCopy();
+}
+
+template <typename T>
+T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
+    ScopedReadLock lock(this->projectMutex());
+    return valueAtTimeLocked(time);
+}
+
+// No extrapolation: before the first and after the last keyframe the end
+// values hold; a time less than one tick before a keyframe is that keyframe.
+template <typename T>
+T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
+    if (keyframes_.empty()) throw KeyFrameException("parameter " + identifier_ + " has no keyframe", RationalTime(0), identifier_);
+    if (keyframes_.size() == 1 || time <= keyframes_.front().time) return keyframes_.front().keyframe->value_;
+    if (time >= keyframes_.back().time) return keyframes_.back().keyframe->value_;
+    const auto next = MapUtil::firstAtOrAfter(keyframes_, time);
+    const KeyFrame<T>& end = *next->keyframe;
+    if (next->time == time) return end.value_;
+    if (scalable_ && (next->time.asRational() - time.asRational()) * scalable_->timeScale() < SafeRational(1))
+        return end.value_;
+    const auto previous = next - 1;
+    return segmentInterpolater(end)->interpolate(previous->keyframe->value_, end.value_, previous->time, next->time,
+                                     time.asDouble(), end.leadIn_);
+}
+
+template <typename T>
+size_t ParameterImpl<T>::numKeyFrames() const {
+    ScopedReadLock lock(this->projectMutex());
+    return keyframes_.size();
+}
+
+template <typename T>
+typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::exactKeyFrame(const RationalTime& time) const {
+    const auto found = MapUtil::find(keyframes_, time);
+    return found == keyframes_.end() ? KeyFramePtr() : found->keyframe;
+}
+
+template <typename T>
+typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::exactKeyFrameOrThrow(const RationalTime& time,
+                                                                              const char* operation) const {
+    const KeyFramePtr keyframe = exactKeyFrame(time);
+    if (!keyframe) refuse(std::string(operation) + ": no keyframe", time);
+    return keyframe;
+}
+
+template <typename T>
+typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::keyframeAtTime(const RationalTime& time) {
+    ScopedReadLock lock(this->projectMutex());
+    return exactKeyFrame(time);
+}
+
+template <typename T>
+typename ParameterImpl<T>::ConstKeyFramePtr ParameterImpl<T>::keyframeAtTime(const RationalTime& time) const {
+    ScopedReadLock lock(this->projectMutex());
+    return exactKeyFrame(time);
+}
+
+template <typename T>
+boost::shared_ptr<KeyFrameInterface> ParameterImpl<T>::keyFrameInterfaceAtTime(const RationalTime& time) const {
+    ScopedReadLock lock(this->projectMutex());
+    return exactKeyFrame(time);
+}
+
+template <typename T>
+bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
+    return bool(keyFrameInterfaceAtTime(time));
+}
+
+template <typename T>
+bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
+    ScopedReadLock lock(this->projectMutex());
+    return MapUtil::anyInRange(keyframes_, range.start(), range.start() + range.duration());
+}
+
+template <typename T>
+boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
+    ScopedReadLock lock(this->projectMutex());
+    boost::shared_ptr<std::vector<RationalTime>> times(new std::vector<RationalTime>);
+    times->reserve(keyframes_.size());
+    for (const auto& entry : keyframes_) times->push_back(entry.time);
+    return times;
+}
+
+template <typename T>
+Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
+    ScopedReadLock lock(this->projectMutex());
+    if (keyframes_.empty()) return Range<RationalTime>();
+    return Range<RationalTime>(keyframes_.front().time, keyframes_.back().time - keyframes_.front().time);
+}
+
+template <typename T>
+RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
+    ScopedReadLock lock(this->projectMutex());
+    if (keyframes_.empty()) refuse("firstKeyFrameTime: no keyframe", RationalTime(0));
+    return keyframes_.front().time;
+}
+
+template <typename T>
+RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
+    ScopedReadLock lock(this->projectMutex());
+    const auto next = MapUtil::firstAfter(keyframes_, time);
+    return next == keyframes_.end() ? time : next->time;
+}
+
+template <typename T>
+RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
+    ScopedReadLock lock(this->projectMutex());
+    const auto atOrAfter = MapUtil::firstAtOrAfter(keyframes_, time);
+    return atOrAfter == keyframes_.begin() ? time : (atOrAfter - 1)->time;
+}
+
+template <typename T>
+bool ParameterImpl<T>::valuesDifferAtTimes(const RationalTime& a, const RationalTime& b) const {
+    ScopedReadLock lock(this->projectMutex());
+    return !Similarity::same(valueAtTimeLocked(a), valueAtTimeLocked(b));
+}
+
+template <typename T>
+typename ParameterImpl<T>::InterpolaterPtr ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) const {
+    ScopedReadLock lock(this->projectMutex());
+    return keyframe ? segmentInterpolater(*keyframe) : defaultInterpolater();
+}
+
+template <typename T>
+bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
+    if (this == &other) return true;
+    if (parameterTypeString() != other.parameterTypeString() || numKeyFrames() != other.numKeyFrames()) return false;
+    const boost::shared_ptr<std::vector<RationalTime>> times = keyframeTimes();
+    for (const RationalTime& time : *times) {
+        const ConstKeyFramePtr mine = keyframeAtTime(time), theirs = other.keyframeAtTime(time);
+        if (!theirs || !Similarity::same(mine->value(), theirs->value()) || mine->duration() != theirs->duration() ||
+            interpolaterForKeyFrame(mine)->name() != other.interpolaterForKeyFrame(theirs)->name())
+            return false;
+    }
+    return true;
+}
+
+} // namespace VelaMediaLib

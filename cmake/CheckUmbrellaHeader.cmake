@@ -1,0 +1,13 @@
+# Fails when VelaMediaLib/VelaMediaLib.h does not include every public header.
+file(READ ${ROOT}/VelaMediaLib/VelaMediaLib.h umbrella)
+file(GLOB_RECURSE headers RELATIVE ${ROOT} ${ROOT}/VelaMediaLib/*/*.h)
+set(missing "")
+foreach(header ${headers})
+  string(FIND "${umbrella}" "#include <${header}>" found)
+  if(found EQUAL -1)
+    list(APPEND missing ${header})
+  endif()
+endforeach()
+if(missing)
+  message(FATAL_ERROR "VelaMediaLib.h does not include: ${missing}")
+endif()
