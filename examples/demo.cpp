@@ -4,6 +4,7 @@
 #include <iomanip>
 #include <iostream>
 #include <sstream>
+#include <vector>
 
 using namespace VelaMediaLib;
 
@@ -79,6 +80,33 @@ void rounding() {
               << " (\"%f\" of " << std::setprecision(15) << a.asDouble() * b.asDouble() << ")\n";
 }
 
+void parameters() {
+    std::cout
+        << "\nKeyframed opacity: 0 at tick 0, 1 at tick 30, back to 0 at tick 60 with a 10-tick lead-in\n";
+    const boost::shared_ptr<ThreadSafe> project(new ThreadSafe);
+    const char* kinds[] = {"linr", "esIn", "esOt", "eios", "bnce", "sprg"};
+    std::cout << "  tick";
+    for (const char* kind : kinds) std::cout << std::setw(8) << kind;
+    std::cout << "\n";
+    std::vector<boost::shared_ptr<InterpolatingParam<double>>> curves;
+    for (const char* kind : kinds) {
+        auto opacity = InterpolatingParam<double>::create(project, "opacity", 0.0,
+                                                          InterpolaterFactory<double>::byName(kind));
+        opacity->addKeyFrame(RationalTime(30), 1.0, RationalTime(0));
+        opacity->addKeyFrame(RationalTime(60), 0.0, RationalTime(10));
+        curves.push_back(opacity);
+    }
+    for (long long tick : {0LL, 10LL, 15LL, 20LL, 30LL, 45LL, 50LL, 55LL, 60LL}) {
+        std::cout << "  " << std::setw(4) << tick << std::fixed << std::setprecision(3);
+        for (const auto& curve : curves) std::cout << std::setw(8) << curve->valueAtTime(RationalTime(tick));
+        std::cout << std::defaultfloat << "\n";
+    }
+    std::cout << "\nThe linear curve as the project document holds it:\n  ";
+    XMLOptions options(std::cout);
+    curves.front()->toJSON(options, 1, "opacity");
+    std::cout << "\n";
+}
+
 } // namespace
 
 int main() {
@@ -87,5 +115,6 @@ int main() {
     seconds();
     grid();
     rounding();
+    parameters();
     return 0;
 }

@@ -44,7 +44,8 @@ void JSONReader::readMetaData(const Json::Value& value, MetaDatable& object) {
     const Json::Value& metadata = value["metadata"];
     if (!metadata.isObject()) return;
     for (const std::string& key : metadata.getMemberNames())
-        object.addMetaData(key, metadata[key].isString() ? metadata[key].asString() : compactJSON(metadata[key]));
+        object.addMetaData(key,
+                           metadata[key].isString() ? metadata[key].asString() : compactJSON(metadata[key]));
 }
 
 } // namespace VelaMediaLib

@@ -8,13 +8,27 @@ std::string quotedJSONString(const std::string& text) {
     std::string quoted = "\"";
     for (const char c : text) {
         switch (c) {
-        case '"': quoted += "\\\""; break;
-        case '\\': quoted += "\\\\"; break;
-        case '\b': quoted += "\\b"; break;
-        case '\f': quoted += "\\f"; break;
-        case '\n': quoted += "\\n"; break;
-        case '\r': quoted += "\\r"; break;
-        case '\t': quoted += "\\t"; break;
+        case '"':
+            quoted += "\\\"";
+            break;
+        case '\\':
+            quoted += "\\\\";
+            break;
+        case '\b':
+            quoted += "\\b";
+            break;
+        case '\f':
+            quoted += "\\f";
+            break;
+        case '\n':
+            quoted += "\\n";
+            break;
+        case '\r':
+            quoted += "\\r";
+            break;
+        case '\t':
+            quoted += "\\t";
+            break;
         default:
             if ((unsigned char)c < 0x20) {
                 char escaped[8];
@@ -30,7 +44,8 @@ std::string quotedJSONString(const std::string& text) {
 
 std::string keyName(const std::string& key) { return quotedJSONString(key) + " : "; }
 
-JSONWriter::JSONWriter(XMLOptions& options, int level, Kind kind) : options_(options), level_(level), kind_(kind) {
+JSONWriter::JSONWriter(XMLOptions& options, int level, Kind kind)
+    : options_(options), level_(level), kind_(kind) {
     options_.stream() << (kind_ == Object ? "{\n" : "[\n");
 }
 

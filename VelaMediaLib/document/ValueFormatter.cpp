@@ -13,11 +13,11 @@ namespace VelaMediaLib {
 namespace {
 
 [[noreturn]] void refuse(const char* expected, const Json::Value& json) {
-    throw ParserException(std::string("Invalid project json - expected ") + expected + ": " + compactJSON(json));
+    throw ParserException(std::string("Invalid project json - expected ") + expected + ": " +
+                          compactJSON(json));
 }
 
-template <typename Number>
-std::string shortest(Number value) {
+template <typename Number> std::string shortest(Number value) {
     if (!std::isfinite(value)) return "null";
     char text[64];
     const std::to_chars_result result = std::to_chars(text, text + sizeof text, value);
@@ -33,8 +33,7 @@ double number(const Json::Value& json) {
 }
 
 // Arrays of numbers: [a, b, c].
-template <size_t N>
-void writeNumbers(std::ostream& out, const double (&values)[N]) {
+template <size_t N> void writeNumbers(std::ostream& out, const double (&values)[N]) {
     out << "[";
     for (size_t i = 0; i < N; ++i) out << (i ? ", " : "") << formatDouble(values[i]);
     out << "]";
@@ -98,8 +97,10 @@ std::string ValueFormatter<std::string>::read(const Json::Value& json) { return 
 
 // Whole numbers as integers, others as "n/d".
 void ValueFormatter<SafeRational>::write(std::ostream& out, const SafeRational& value) {
-    if (value.denominator() == 1) out << value.numerator();
-    else out << '"' << value << '"';
+    if (value.denominator() == 1)
+        out << value.numerator();
+    else
+        out << '"' << value << '"';
 }
 SafeRational ValueFormatter<SafeRational>::read(const Json::Value& json) {
     return JSONReader::jsonValueAsVelaRational(json);
@@ -118,7 +119,8 @@ void ValueFormatter<Range<long long>>::write(std::ostream& out, const Range<long
 }
 Range<long long> ValueFormatter<Range<long long>>::read(const Json::Value& json) {
     numbers(json, 2, "a tick range [start, duration]");
-    return Range<long long>(JSONReader::jsonValueAsVelaTime(json[0]), JSONReader::jsonValueAsVelaTime(json[1]));
+    return Range<long long>(JSONReader::jsonValueAsVelaTime(json[0]),
+                            JSONReader::jsonValueAsVelaTime(json[1]));
 }
 
 void ValueFormatter<Rect<float>>::write(std::ostream& out, const Rect<float>& r) {
@@ -180,12 +182,14 @@ CaptionData ValueFormatter<CaptionData>::read(const Json::Value& json) {
 }
 
 void ValueFormatter<KeystrokeData>::write(std::ostream& out, const KeystrokeData& k) {
-    out << "{" << keyName("key") << quotedJSONString(k.key) << ", " << keyName("modifiers") << k.modifiers << "}";
+    out << "{" << keyName("key") << quotedJSONString(k.key) << ", " << keyName("modifiers") << k.modifiers
+        << "}";
 }
 KeystrokeData ValueFormatter<KeystrokeData>::read(const Json::Value& json) {
     const char* what = "a keystroke {\"key\", \"modifiers\"}";
     const Json::Value& modifiers = member(json, "modifiers", what);
-    return KeystrokeData(text(member(json, "key", what)), modifiers.isNull() ? 0 : ValueFormatter<int>::read(modifiers));
+    return KeystrokeData(text(member(json, "key", what)),
+                         modifiers.isNull() ? 0 : ValueFormatter<int>::read(modifiers));
 }
 
 void ValueFormatter<TextAttributeList>::write(std::ostream& out, const TextAttributeList& list) {
@@ -203,7 +207,8 @@ TextAttributeList ValueFormatter<TextAttributeList>::read(const Json::Value& jso
     const char* what = "attributed text {\"text\", \"runs\"}";
     TextAttributeList list(text(member(json, "text", what)));
     for (const Json::Value& run : member(json, "runs", what)) {
-        if (!run.isObject() || !run["start"].isUInt64() || !run["length"].isUInt64()) refuse("a text run", run);
+        if (!run.isObject() || !run["start"].isUInt64() || !run["length"].isUInt64())
+            refuse("a text run", run);
         if (!list.addRun(size_t(run["start"].asUInt64()), size_t(run["length"].asUInt64()), text(run["name"]),
                          text(run["value"])))
             refuse("a text run inside the text", run);

@@ -26,19 +26,17 @@
 
 namespace VelaMediaLib {
 
-template <typename T>
-struct ValueFormatter; // write(std::ostream&, const T&) and read(const Json::Value&)
+template <typename T> struct ValueFormatter; // write(std::ostream&, const T&) and read(const Json::Value&)
 
 std::string formatDouble(double value);
 std::string formatFloat(float value);
 /// The value on one line, for messages.
 std::string compactJSON(const Json::Value& value);
 
-#define VELA_VALUE_FORMATTER(Type)                                                                                     \
-    template <>                                                                                                        \
-    struct ValueFormatter<Type> {                                                                                      \
-        static void write(std::ostream& out, const Type& value);                                                       \
-        static Type read(const Json::Value& json);                                                                     \
+#define VELA_VALUE_FORMATTER(Type)                                                                           \
+    template <> struct ValueFormatter<Type> {                                                                \
+        static void write(std::ostream& out, const Type& value);                                             \
+        static Type read(const Json::Value& json);                                                           \
     }
 
 VELA_VALUE_FORMATTER(bool);

@@ -2,7 +2,8 @@
 
 namespace VelaMediaLib {
 
-bool TextAttributeList::addRun(size_t start, size_t length, const std::string& name, const std::string& value) {
+bool TextAttributeList::addRun(size_t start, size_t length, const std::string& name,
+                               const std::string& value) {
     if (start > text_.size() || length > text_.size() - start) return false;
     runs_.push_back(Run{start, length, name, value});
     return true;

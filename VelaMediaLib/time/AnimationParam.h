@@ -18,8 +18,7 @@ struct Animation {
 /// that lead-in, which the track records. When read from a document, a
 /// keyframe without a lead-in adds no keyframe: its value goes to the keyframe
 /// in force at its time (the last one at or before it, else the first).
-template <typename T>
-class AnimationParam : public InterpolatingParam<T> {
+template <typename T> class AnimationParam : public InterpolatingParam<T> {
 public:
     typedef typename ParameterImpl<T>::KeyFramePtr KeyFramePtr;
     using InterpolatingParam<T>::InterpolatingParam;
@@ -48,7 +47,8 @@ protected:
         return boost::shared_ptr<ParameterImpl<T>>(new AnimationParam(*this));
     }
 
-    KeyFramePtr placeReadKeyFrame(const RationalTime& end, const T& value, const RationalTime& leadIn) override {
+    KeyFramePtr placeReadKeyFrame(const RationalTime& end, const T& value,
+                                  const RationalTime& leadIn) override {
         if (leadIn <= RationalTime(0) && !this->keyframes_.empty() && !this->exactKeyFrame(end)) {
             auto inForce = KeyFrameMapUtil<KeyFrame<T>>::firstAfter(this->keyframes_, end);
             if (inForce != this->keyframes_.begin()) --inForce;
@@ -57,7 +57,8 @@ protected:
         }
         const KeyFramePtr keyframe = ParameterImpl<T>::placeReadKeyFrame(end, value, leadIn);
         if (leadIn > RationalTime(0))
-            addAnimationLocked(Range<RationalTime>(end - leadIn, leadIn), this->defaultInterpolater()->name());
+            addAnimationLocked(Range<RationalTime>(end - leadIn, leadIn),
+                               this->defaultInterpolater()->name());
         return keyframe;
     }
 

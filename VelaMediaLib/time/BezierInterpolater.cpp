@@ -36,13 +36,15 @@ BezierInterpolater::BezierInterpolater(const Point3d& cp1, const Point3d& cp2,
       temporal_(InterpolaterFactory<double>::byName(temporalInterpolaterName)) {}
 
 std::string BezierInterpolater::asJson() const {
-    return "\"" + name() + "(" + temporalInterpolaterName() + ";" + pointText(cp1_) + ";" + pointText(cp2_) + ")\"";
+    return "\"" + name() + "(" + temporalInterpolaterName() + ";" + pointText(cp1_) + ";" + pointText(cp2_) +
+           ")\"";
 }
 
 Point3d BezierInterpolater::pointAt(const Point3d& a, const Point3d& b, double s) const {
     const double r = 1.0 - s;
     const double wa = r * r * r, w1 = 3.0 * s * r * r, w2 = 3.0 * s * s * r, wb = s * s * s;
-    return Point3d(wa * a.x + w1 * cp1_.x + w2 * cp2_.x + wb * b.x, wa * a.y + w1 * cp1_.y + w2 * cp2_.y + wb * b.y,
+    return Point3d(wa * a.x + w1 * cp1_.x + w2 * cp2_.x + wb * b.x,
+                   wa * a.y + w1 * cp1_.y + w2 * cp2_.y + wb * b.y,
                    wa * a.z + w1 * cp1_.z + w2 * cp2_.z + wb * b.z);
 }
 
@@ -60,7 +62,8 @@ boost::shared_ptr<BezierInterpolater> BezierInterpolater::fromName(const std::st
     const size_t first = body.find(';'), second = body.find(';', first + 1);
     if (first == std::string::npos || second == std::string::npos) return {};
     Point3d cp1, cp2;
-    if (!parsePoint(body.substr(first + 1, second - first - 1), cp1) || !parsePoint(body.substr(second + 1), cp2))
+    if (!parsePoint(body.substr(first + 1, second - first - 1), cp1) ||
+        !parsePoint(body.substr(second + 1), cp2))
         return {};
     return boost::shared_ptr<BezierInterpolater>(new BezierInterpolater(cp1, cp2, body.substr(0, first)));
 }

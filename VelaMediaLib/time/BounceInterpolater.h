@@ -9,7 +9,7 @@ namespace VelaMediaLib {
 /// Arrives like a dropped ball, bouncing on the value.
 template <typename T>
 class BounceInterpolater : public TweenableInterpolater<T>,
-                            public SharedInterpolaterInstance<BounceInterpolater<T>> {
+                           public SharedInterpolaterInstance<BounceInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::bounce(u); }
 

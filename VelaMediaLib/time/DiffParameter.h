@@ -12,8 +12,7 @@ namespace VelaMediaLib {
 /// source altogether. Its curve is the source's with the difference applied,
 /// and follows the source when the source changes. Any edit made through the
 /// parameter's operations is kept as a difference.
-template <typename T>
-class DiffParameter : public ParameterImpl<T> {
+template <typename T> class DiffParameter : public ParameterImpl<T> {
 public:
     typedef ParameterImpl<T> Base;
     typedef typename Base::KeyFrameMap KeyFrameMap;
@@ -68,7 +67,9 @@ public:
     }
 
 protected:
-    boost::shared_ptr<Base> cloneImpl() const override { return boost::shared_ptr<Base>(new DiffParameter(*this)); }
+    boost::shared_ptr<Base> cloneImpl() const override {
+        return boost::shared_ptr<Base>(new DiffParameter(*this));
+    }
     void keyframesEdited() override { recomputeDifference(); }
     bool writtenBare(const std::string&, const std::string&) const override { return false; }
 
@@ -90,7 +91,8 @@ protected:
         object.key("deletions");
         {
             JSONWriter deletions(object.options(), object.memberLevel(), JSONWriter::Array);
-            for (const RationalTime& time : deletions_) ValueFormatter<RationalTime>::write(deletions.element(), time);
+            for (const RationalTime& time : deletions_)
+                ValueFormatter<RationalTime>::write(deletions.element(), time);
         }
         object.key("ignoreSource") << (ignoreSource_ ? "true" : "false");
     }
@@ -99,17 +101,22 @@ protected:
         KeyFrameMap edits;
         for (const Json::Value& entry : json["edits"]) {
             if (!entry.isObject() || !entry.isMember("time") || !entry.isMember("value"))
-                throw ParserException("Invalid project json - an edit of " + this->identifier() + " needs a time and a value");
+                throw ParserException("Invalid project json - an edit of " + this->identifier() +
+                                      " needs a time and a value");
             const RationalTime time = JSONReader::jsonValueAsRationalTime(entry["time"]);
-            const RationalTime leadIn = entry.isMember("duration") ? JSONReader::jsonValueAsRationalTime(entry["duration"])
-                                                                   : RationalTime(0);
-            const typename Base::KeyFramePtr keyframe = this->newKeyFrame(time, ValueFormatter<T>::read(entry["value"]), leadIn);
+            const RationalTime leadIn = entry.isMember("duration")
+                                            ? JSONReader::jsonValueAsRationalTime(entry["duration"])
+                                            : RationalTime(0);
+            const typename Base::KeyFramePtr keyframe =
+                this->newKeyFrame(time, ValueFormatter<T>::read(entry["value"]), leadIn);
             if (entry.isMember("interp"))
-                keyframe->setInterpolater(InterpolaterFactory<T>::byName(ParameterDocument::requiredString(entry["interp"], "interp")));
+                keyframe->setInterpolater(InterpolaterFactory<T>::byName(
+                    ParameterDocument::requiredString(entry["interp"], "interp")));
             MapUtil::put(edits, time, keyframe);
         }
         std::set<RationalTime> deletions;
-        for (const Json::Value& time : json["deletions"]) deletions.insert(JSONReader::jsonValueAsRationalTime(time));
+        for (const Json::Value& time : json["deletions"])
+            deletions.insert(JSONReader::jsonValueAsRationalTime(time));
         edits_.swap(edits);
         deletions_.swap(deletions);
         ignoreSource_ = json["ignoreSource"].isBool() && json["ignoreSource"].asBool();
@@ -156,7 +163,8 @@ private:
     }
 
     static bool sameKeyFrame(const KeyFrame<T>& a, const KeyFrame<T>& b) {
-        return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() && a.interpolaterName() == b.interpolaterName();
+        return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() &&
+               a.interpolaterName() == b.interpolaterName();
     }
 
     // After an edit of the curve: what differs from the source becomes the difference.
@@ -170,7 +178,8 @@ private:
                 edits.push_back({entry.time, entry.keyframe->clone()});
         }
         for (const auto& entry : source)
-            if (MapUtil::find(this->keyframes_, entry.time) == this->keyframes_.end()) deletions.insert(entry.time);
+            if (MapUtil::find(this->keyframes_, entry.time) == this->keyframes_.end())
+                deletions.insert(entry.time);
         edits_.swap(edits);
         deletions_.swap(deletions);
     }

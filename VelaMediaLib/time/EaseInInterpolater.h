@@ -8,7 +8,7 @@ namespace VelaMediaLib {
 /// Starts slowly: u squared.
 template <typename T>
 class EaseInInterpolater : public ExponentialEaseInterpolater<T>,
-                            public SharedInterpolaterInstance<EaseInInterpolater<T>> {
+                           public SharedInterpolaterInstance<EaseInInterpolater<T>> {
 private:
     friend class SharedInterpolaterInstance<EaseInInterpolater<T>>;
     EaseInInterpolater() : ExponentialEaseInterpolater<T>(InterpolaterNameConstants::s_easeInName, 2.0) {}

@@ -8,14 +8,16 @@ namespace VelaMediaLib {
 
 /// A quadratic in-out curve.
 template <typename T>
-class EaseInOutDoubleExponentialSigmoidInterpolater : public TweenableInterpolater<T>,
-                            public SharedInterpolaterInstance<EaseInOutDoubleExponentialSigmoidInterpolater<T>> {
+class EaseInOutDoubleExponentialSigmoidInterpolater
+    : public TweenableInterpolater<T>,
+      public SharedInterpolaterInstance<EaseInOutDoubleExponentialSigmoidInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::easeInOutDoubleExponentialSigmoid(u); }
 
 private:
     friend class SharedInterpolaterInstance<EaseInOutDoubleExponentialSigmoidInterpolater<T>>;
-    EaseInOutDoubleExponentialSigmoidInterpolater() : TweenableInterpolater<T>(InterpolaterNameConstants::s_easeInOutDoubleExponentialSigmoidName) {}
+    EaseInOutDoubleExponentialSigmoidInterpolater()
+        : TweenableInterpolater<T>(InterpolaterNameConstants::s_easeInOutDoubleExponentialSigmoidName) {}
 };
 
 } // namespace VelaMediaLib

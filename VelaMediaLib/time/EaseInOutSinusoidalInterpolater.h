@@ -8,14 +8,16 @@ namespace VelaMediaLib {
 
 /// Half a sine wave: slow, fast, slow.
 template <typename T>
-class EaseInOutSinusoidalInterpolater : public TweenableInterpolater<T>,
-                            public SharedInterpolaterInstance<EaseInOutSinusoidalInterpolater<T>> {
+class EaseInOutSinusoidalInterpolater
+    : public TweenableInterpolater<T>,
+      public SharedInterpolaterInstance<EaseInOutSinusoidalInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::easeInOutSinusoidal(u); }
 
 private:
     friend class SharedInterpolaterInstance<EaseInOutSinusoidalInterpolater<T>>;
-    EaseInOutSinusoidalInterpolater() : TweenableInterpolater<T>(InterpolaterNameConstants::s_easeInOutSinusoidalName) {}
+    EaseInOutSinusoidalInterpolater()
+        : TweenableInterpolater<T>(InterpolaterNameConstants::s_easeInOutSinusoidalName) {}
 };
 
 } // namespace VelaMediaLib

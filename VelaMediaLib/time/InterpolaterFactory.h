@@ -23,8 +23,7 @@ namespace VelaMediaLib {
 /// Which interpolater kinds a value type has: every type steps ("left");
 /// numeric and geometric types tween linearly and with the exponential
 /// eases; some of those also have the in-out, bounce and spring curves.
-template <typename T>
-struct InterpolaterKinds {
+template <typename T> struct InterpolaterKinds {
     static constexpr bool linear =
         std::is_same<T, int>::value || std::is_same<T, float>::value || std::is_same<T, double>::value ||
         std::is_same<T, long long>::value || std::is_same<T, Rect<float>>::value ||
@@ -32,13 +31,13 @@ struct InterpolaterKinds {
         std::is_same<T, Point3d>::value || std::is_same<T, TransformMatrix>::value;
     static constexpr bool inOut = std::is_same<T, int>::value || std::is_same<T, float>::value ||
                                   std::is_same<T, double>::value || std::is_same<T, Rect<float>>::value ||
-                                  std::is_same<T, TemplatedColor<int>>::value || std::is_same<T, Point3d>::value;
+                                  std::is_same<T, TemplatedColor<int>>::value ||
+                                  std::is_same<T, Point3d>::value;
 };
 
 /// The shared interpolater of a name for a value type. A name the type does
 /// not have throws ParserException "trying to read an unknown interpolater".
-template <typename T>
-class InterpolaterFactory {
+template <typename T> class InterpolaterFactory {
 public:
     typedef boost::shared_ptr<Interpolater<T>> Pointer;
 
@@ -57,7 +56,8 @@ public:
             if (name == N::s_easeOutName) return EaseOutInterpolater<T>::getInstance();
         }
         if constexpr (InterpolaterKinds<T>::inOut) {
-            if (name == N::s_easeInOutSinusoidalName) return EaseInOutSinusoidalInterpolater<T>::getInstance();
+            if (name == N::s_easeInOutSinusoidalName)
+                return EaseInOutSinusoidalInterpolater<T>::getInstance();
             if (name == N::s_easeInOutDoubleExponentialSigmoidName)
                 return EaseInOutDoubleExponentialSigmoidInterpolater<T>::getInstance();
             if (name == N::s_bounceName) return BounceInterpolater<T>::getInstance();
@@ -69,8 +69,10 @@ public:
 
     /// The kind new keyframes get: linear where the type tweens, a step otherwise.
     static Pointer defaultInterpolater() {
-        if constexpr (InterpolaterKinds<T>::linear) return LinearInterpolater<T>::getInstance();
-        else return LeftInterpolater<T>::getInstance();
+        if constexpr (InterpolaterKinds<T>::linear)
+            return LinearInterpolater<T>::getInstance();
+        else
+            return LeftInterpolater<T>::getInstance();
     }
 };
 

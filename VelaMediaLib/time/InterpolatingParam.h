@@ -7,8 +7,7 @@ namespace VelaMediaLib {
 /// A numeric parameter with an interpolater of its own that its keyframes
 /// follow unless they name one; the document carries it as the parameter's
 /// "interp".
-template <typename T>
-class InterpolatingParam : public ParameterImpl<T> {
+template <typename T> class InterpolatingParam : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
 
@@ -21,7 +20,8 @@ public:
     create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
            const InterpolaterPtr& interpolater = InterpolaterFactory<T>::defaultInterpolater(),
            const TimeScalable* scalable = nullptr) {
-        boost::shared_ptr<InterpolatingParam> parameter(new InterpolatingParam(token, identifier, scalable, interpolater));
+        boost::shared_ptr<InterpolatingParam> parameter(
+            new InterpolatingParam(token, identifier, scalable, interpolater));
         parameter->setDefaultValue(value);
         return parameter;
     }

@@ -7,19 +7,18 @@
 
 namespace VelaMediaLib {
 
-template <typename T>
-class ParameterImpl;
+template <typename T> class ParameterImpl;
 
 /// One keyframe of a parameter of value type T. Its interpolater governs the
 /// transition that ends at this keyframe; an empty one means the parameter's
 /// own default.
-template <typename T>
-class KeyFrame : public KeyFrameInterface {
+template <typename T> class KeyFrame : public KeyFrameInterface {
 public:
     typedef boost::shared_ptr<Interpolater<T>> InterpolaterPtr;
 
     KeyFrame(const boost::weak_ptr<const ThreadSafe>& token, const RationalTime& endTime, const T& value,
-             const RationalTime& leadIn = RationalTime(), const InterpolaterPtr& interpolater = InterpolaterPtr())
+             const RationalTime& leadIn = RationalTime(),
+             const InterpolaterPtr& interpolater = InterpolaterPtr())
         : KeyFrameInterface(token, endTime, leadIn), value_(value), interpolater_(interpolater) {}
 
     T value() const {
@@ -50,7 +49,8 @@ public:
         std::map<std::string, std::string> metadata;
         {
             ScopedReadLock lock(metaDataToken());
-            copy.reset(new KeyFrame(boost::weak_ptr<const ThreadSafe>(), endTime_, value_, leadIn_, interpolater_));
+            copy.reset(
+                new KeyFrame(boost::weak_ptr<const ThreadSafe>(), endTime_, value_, leadIn_, interpolater_));
             metadata = metaDataCopy();
         }
         for (const auto& entry : metadata) copy->addMetaData(entry.first, entry.second);
@@ -66,11 +66,12 @@ protected:
     }
 
     void writeValue(std::ostream& out) const override { ValueFormatter<T>::write(out, value_); }
-    std::string interpolaterJson() const override { return interpolater_ ? interpolater_->asJson() : std::string(); }
+    std::string interpolaterJson() const override {
+        return interpolater_ ? interpolater_->asJson() : std::string();
+    }
 
 private:
-    template <typename>
-    friend class ParameterImpl;
+    template <typename> friend class ParameterImpl;
 
     T value_;
     InterpolaterPtr interpolater_;

@@ -5,8 +5,8 @@
 
 namespace VelaMediaLib {
 
-KeyFrameInterface::KeyFrameInterface(const boost::weak_ptr<const ThreadSafe>& token, const RationalTime& endTime,
-                                     const RationalTime& leadIn)
+KeyFrameInterface::KeyFrameInterface(const boost::weak_ptr<const ThreadSafe>& token,
+                                     const RationalTime& endTime, const RationalTime& leadIn)
     : MetaDatable(token), endTime_(endTime), leadIn_(leadIn) {}
 
 RationalTime KeyFrameInterface::endTime() const {

@@ -11,14 +11,12 @@ namespace VelaMediaLib {
 /// A parameter's keyframes: a map from end time to keyframe, kept as a
 /// vector sorted by time so that lookups are binary searches over memory
 /// that lies together.
-template <typename K>
-struct KeyFrameEntry {
+template <typename K> struct KeyFrameEntry {
     RationalTime time;
     boost::shared_ptr<K> keyframe;
 };
 
-template <typename K>
-class KeyFrameMapUtil {
+template <typename K> class KeyFrameMapUtil {
 public:
     typedef std::vector<KeyFrameEntry<K>> Map;
     typedef typename Map::iterator Iterator;
@@ -26,17 +24,20 @@ public:
 
     /// The first entry whose time is not less than t.
     static ConstIterator firstAtOrAfter(const Map& map, const RationalTime& t) {
-        return std::lower_bound(map.begin(), map.end(), t,
-                                [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
+        return std::lower_bound(
+            map.begin(), map.end(), t,
+            [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
     }
     static Iterator firstAtOrAfter(Map& map, const RationalTime& t) {
-        return std::lower_bound(map.begin(), map.end(), t,
-                                [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
+        return std::lower_bound(
+            map.begin(), map.end(), t,
+            [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
     }
     /// The first entry whose time is greater than t.
     static ConstIterator firstAfter(const Map& map, const RationalTime& t) {
-        return std::upper_bound(map.begin(), map.end(), t,
-                                [](const RationalTime& time, const KeyFrameEntry<K>& entry) { return time < entry.time; });
+        return std::upper_bound(
+            map.begin(), map.end(), t,
+            [](const RationalTime& time, const KeyFrameEntry<K>& entry) { return time < entry.time; });
     }
     /// The entry at exactly t, or end.
     static ConstIterator find(const Map& map, const RationalTime& t) {

@@ -9,7 +9,7 @@ namespace VelaMediaLib {
 /// Straight-line motion.
 template <typename T>
 class LinearInterpolater : public TweenableInterpolater<T>,
-                            public SharedInterpolaterInstance<LinearInterpolater<T>> {
+                           public SharedInterpolaterInstance<LinearInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::linear(u); }
 

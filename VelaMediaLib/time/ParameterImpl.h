@@ -27,10 +27,7 @@
 namespace VelaMediaLib {
 
 /// The minimum, maximum and default a user interface offers for a parameter.
-template <typename T>
-struct ValueBounds {
-    T minValue, maxValue, defaultValue;
-};
+template <typename T> struct ValueBounds { T minValue, maxValue, defaultValue; };
 
 /// How a user interface presents a parameter: its control and its unit.
 struct UIHints {
@@ -38,8 +35,7 @@ struct UIHints {
     std::string unitType;
 };
 
-template <typename T>
-class ParameterImpl : public Parameter<T> {
+template <typename T> class ParameterImpl : public Parameter<T> {
 public:
     typedef Parameter<T> Base;
     typedef typename Base::KeyFramePtr KeyFramePtr;
@@ -114,9 +110,12 @@ public:
 
     // Copies
     boost::shared_ptr<ParameterInterface> cloneParameter() const override { return clone(); }
-    boost::shared_ptr<ParameterImpl> clone() const { return boost::static_pointer_cast<ParameterImpl>(cloneImpl()); }
+    boost::shared_ptr<ParameterImpl> clone() const {
+        return boost::static_pointer_cast<ParameterImpl>(cloneImpl());
+    }
     boost::shared_ptr<Parameter<T>> copyPortion(const Range<RationalTime>& range) const override;
-    boost::shared_ptr<ParameterInterface> copyPortionInterface(const Range<RationalTime>& range) const override {
+    boost::shared_ptr<ParameterInterface>
+    copyPortionInterface(const Range<RationalTime>& range) const override {
         return copyPortion(range);
     }
     void setupSharedClone(const boost::shared_ptr<ParameterInterface>& clone) const override;
@@ -137,7 +136,9 @@ protected:
         return boost::shared_ptr<ParameterImpl>(new ParameterImpl(*this));
     }
     /// The interpolater of keyframes that have none of their own.
-    virtual InterpolaterPtr defaultInterpolater() const { return InterpolaterFactory<T>::defaultInterpolater(); }
+    virtual InterpolaterPtr defaultInterpolater() const {
+        return InterpolaterFactory<T>::defaultInterpolater();
+    }
     /// The interpolater of the segment that ends at the keyframe.
     virtual InterpolaterPtr segmentInterpolater(const KeyFrame<T>& end) const {
         return end.interpolater_ ? end.interpolater_ : defaultInterpolater();
@@ -156,7 +157,8 @@ protected:
     /// Puts a keyframe read from a document at its end time: an existing one
     /// takes the value, otherwise one is added. Returns the keyframe, or null
     /// when the kind took the value without a keyframe.
-    virtual KeyFramePtr placeReadKeyFrame(const RationalTime& end, const T& value, const RationalTime& leadIn);
+    virtual KeyFramePtr placeReadKeyFrame(const RationalTime& end, const T& value,
+                                          const RationalTime& leadIn);
     /// Adopts what a scratch copy read from a document; kinds with state of
     /// their own take theirs too.
     virtual void takeStateFrom(ParameterImpl& read);
@@ -186,8 +188,7 @@ protected:
         return out.str();
     }
     /// Runs a change under the write lock, then tells the observers.
-    template <typename Change>
-    void edit(Change change) {
+    template <typename Change> void edit(Change change) {
         {
             ScopedWriteLock lock(this->projectMutex());
             change();

@@ -14,12 +14,13 @@ namespace ParameterDocument {
 /// Whether a document value is a parameter object rather than a bare value
 /// (no value type's own JSON form uses these keys).
 inline bool isParameterObject(const Json::Value& json) {
-    return json.isObject() && (json.isMember("keyframes") || json.isMember("type") || json.isMember("edits") ||
-                               json.isMember("valueBounds"));
+    return json.isObject() && (json.isMember("keyframes") || json.isMember("type") ||
+                               json.isMember("edits") || json.isMember("valueBounds"));
 }
 
 inline std::string requiredString(const Json::Value& json, const char* what) {
-    if (!json.isString()) throw ParserException(std::string("Invalid project json - expected a string for ") + what);
+    if (!json.isString())
+        throw ParserException(std::string("Invalid project json - expected a string for ") + what);
     return json.asString();
 }
 
@@ -33,8 +34,8 @@ bool ParameterImpl<T>::writtenBare(const std::string& name, const std::string& t
     const std::string interp = parameterInterpolaterName();
     if (!interp.empty() && interp != InterpolaterFactory<T>::defaultInterpolater()->name()) return false;
     const KeyFrame<T>& only = *keyframes_.front().keyframe;
-    return keyframes_.front().time == RationalTime(0) && only.leadIn_ == RationalTime(0) && !only.interpolater_ &&
-           only.metaDataKeys().empty();
+    return keyframes_.front().time == RationalTime(0) && only.leadIn_ == RationalTime(0) &&
+           !only.interpolater_ && only.metaDataKeys().empty();
 }
 
 template <typename T>
@@ -68,8 +69,7 @@ void ParameterImpl<T>::toJSON(XMLOptions& options, int indent, const std::string
     if (extras_ && extras_->metadata) MetaDatable::toJSON(object, *extras_->metadata);
 }
 
-template <typename T>
-void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
+template <typename T> void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
     object.key("keyframes");
     JSONWriter array(object.options(), object.memberLevel(), JSONWriter::Array);
     for (const auto& entry : keyframes_) {
@@ -78,23 +78,23 @@ void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
     }
 }
 
-template <typename T>
-void ParameterImpl<T>::readFromJSON(const Json::Value& json) {
+template <typename T> void ParameterImpl<T>::readFromJSON(const Json::Value& json) {
     const boost::shared_ptr<ParameterImpl> scratch = cloneImpl();
     scratch->readInto(json);
     edit([&] { takeStateFrom(*scratch); });
 }
 
-template <typename T>
-void ParameterImpl<T>::readInto(const Json::Value& json) {
+template <typename T> void ParameterImpl<T>::readInto(const Json::Value& json) {
     if (!ParameterDocument::isParameterObject(json)) {
         setDefaultValue(ValueFormatter<T>::read(json)); // a bare value is the only keyframe, at time 0
         return;
     }
-    if (json.isMember("interp")) readParameterInterpolater(ParameterDocument::requiredString(json["interp"], "interp"));
+    if (json.isMember("interp"))
+        readParameterInterpolater(ParameterDocument::requiredString(json["interp"], "interp"));
     if (json.isMember("valueBounds")) {
         const Json::Value& bounds = json["valueBounds"];
-        setValueBounds(ValueFormatter<T>::read(bounds["minValue"]), ValueFormatter<T>::read(bounds["maxValue"]),
+        setValueBounds(ValueFormatter<T>::read(bounds["minValue"]),
+                       ValueFormatter<T>::read(bounds["maxValue"]),
                        ValueFormatter<T>::read(bounds["defaultValue"]));
     }
     if (json.isMember("uiHints")) {
@@ -108,29 +108,31 @@ void ParameterImpl<T>::readInto(const Json::Value& json) {
 
 // A "keyframes" array replaces the curve: reading starts from no keyframes,
 // and a later entry at the same end time replaces the value of an earlier one.
-template <typename T>
-void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
+template <typename T> void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
     const Json::Value& array = json["keyframes"];
     if (array.isNull()) return;
     if (!array.isArray()) throw ParserException("Invalid project json - \"keyframes\" is not an array");
     keyframes_.clear();
     for (const Json::Value& keyframe : array) readKeyFrame(keyframe);
-    if (keyframes_.empty()) throw ParserException("Invalid project json - parameter " + identifier_ + " has no keyframe");
+    if (keyframes_.empty())
+        throw ParserException("Invalid project json - parameter " + identifier_ + " has no keyframe");
 }
 
-template <typename T>
-void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
+template <typename T> void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
     if (!json.isObject() || !json.isMember("value"))
         throw ParserException("Invalid project json - a keyframe of " + identifier_ + " has no value");
-    const RationalTime leadIn = json.isMember("duration") ? JSONReader::jsonValueAsRationalTime(json["duration"]) : RationalTime(0);
+    const RationalTime leadIn =
+        json.isMember("duration") ? JSONReader::jsonValueAsRationalTime(json["duration"]) : RationalTime(0);
     if (!json.isMember("endTime") && !json.isMember("time"))
         throw ParserException("Invalid project json - a keyframe of " + identifier_ + " has no time");
-    const RationalTime end = json.isMember("endTime") ? JSONReader::jsonValueAsRationalTime(json["endTime"])
-                                                      : JSONReader::jsonValueAsRationalTime(json["time"]) + leadIn;
+    const RationalTime end = json.isMember("endTime")
+                                 ? JSONReader::jsonValueAsRationalTime(json["endTime"])
+                                 : JSONReader::jsonValueAsRationalTime(json["time"]) + leadIn;
     const T value = ValueFormatter<T>::read(json["value"]);
     InterpolaterPtr interpolater;
     if (json.isMember("interp"))
-        interpolater = InterpolaterFactory<T>::byName(ParameterDocument::requiredString(json["interp"], "interp"));
+        interpolater =
+            InterpolaterFactory<T>::byName(ParameterDocument::requiredString(json["interp"], "interp"));
     const KeyFramePtr keyframe = placeReadKeyFrame(end, value, leadIn);
     if (!keyframe) return;
     keyframe->interpolater_ = interpolater;
@@ -138,8 +140,8 @@ void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
 }
 
 template <typename T>
-typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::placeReadKeyFrame(const RationalTime& end, const T& value,
-                                                                           const RationalTime& leadIn) {
+typename ParameterImpl<T>::KeyFramePtr
+ParameterImpl<T>::placeReadKeyFrame(const RationalTime& end, const T& value, const RationalTime& leadIn) {
     if (const KeyFramePtr existing = exactKeyFrame(end)) {
         existing->value_ = value;
         return existing;
@@ -148,8 +150,7 @@ typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::placeReadKeyFrame(const
     return exactKeyFrame(end);
 }
 
-template <typename T>
-void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
+template <typename T> void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
     keyframes_.swap(read.keyframes_);
     for (auto& entry : keyframes_) entry.keyframe->setMetaDataToken(this->projectMutex());
     if (!read.extras_ && !extras_) return;

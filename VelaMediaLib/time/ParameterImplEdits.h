@@ -21,8 +21,7 @@ bool ParameterImpl<T>::canAddKeyFrame(const RationalTime& time, const RationalTi
     return true;
 }
 
-template <typename T>
-T ParameterImpl<T>::setDefaultValue(const T& value) {
+template <typename T> T ParameterImpl<T>::setDefaultValue(const T& value) {
     T previous = value;
     edit([&] {
         if (!keyframes_.empty()) previous = valueAtTimeLocked(RationalTime(0));
@@ -33,8 +32,7 @@ T ParameterImpl<T>::setDefaultValue(const T& value) {
     return previous;
 }
 
-template <typename T>
-T ParameterImpl<T>::setValueAtTime(const T& value, const RationalTime& time) {
+template <typename T> T ParameterImpl<T>::setValueAtTime(const T& value, const RationalTime& time) {
     T previous = value;
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrame(time);
@@ -49,7 +47,8 @@ template <typename T>
 void ParameterImpl<T>::addKeyFrame(const RationalTime& time, const T& value, const RationalTime& leadIn) {
     edit([&] {
         const KeyFramePtr existing = exactKeyFrame(time);
-        if (!canAddKeyFrame(time, leadIn, existing.get())) refuse("addKeyFrame: a keyframe may not stand", time);
+        if (!canAddKeyFrame(time, leadIn, existing.get()))
+            refuse("addKeyFrame: a keyframe may not stand", time);
         if (existing) {
             existing->value_ = value;
             existing->leadIn_ = leadIn;
@@ -59,8 +58,7 @@ void ParameterImpl<T>::addKeyFrame(const RationalTime& time, const T& value, con
     });
 }
 
-template <typename T>
-void ParameterImpl<T>::addKeyFrame(const KeyFramePtr& keyframe) {
+template <typename T> void ParameterImpl<T>::addKeyFrame(const KeyFramePtr& keyframe) {
     if (!keyframe) throw KeyFrameException("addKeyFrame: no keyframe given", RationalTime(0), identifier());
     edit([&] {
         const RationalTime time = keyframe->endTime_;
@@ -85,8 +83,7 @@ typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::removeKeyFrame(const Ra
     return removed;
 }
 
-template <typename T>
-T ParameterImpl<T>::changeKeyFrame(const RationalTime& time, const T& value) {
+template <typename T> T ParameterImpl<T>::changeKeyFrame(const RationalTime& time, const T& value) {
     T previous = value;
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrameOrThrow(time, "changeKeyFrame");
@@ -96,14 +93,15 @@ T ParameterImpl<T>::changeKeyFrame(const RationalTime& time, const T& value) {
     return previous;
 }
 
-template <typename T>
-T ParameterImpl<T>::changeKeyFrame(const ConstKeyFramePtr& keyframe, const T& value) {
+template <typename T> T ParameterImpl<T>::changeKeyFrame(const ConstKeyFramePtr& keyframe, const T& value) {
     T previous = value;
     edit([&] {
-        const auto found = std::find_if(keyframes_.begin(), keyframes_.end(),
-                                        [&](const KeyFrameEntry<KeyFrame<T>>& e) { return e.keyframe == keyframe; });
+        const auto found =
+            std::find_if(keyframes_.begin(), keyframes_.end(),
+                         [&](const KeyFrameEntry<KeyFrame<T>>& e) { return e.keyframe == keyframe; });
         if (found == keyframes_.end())
-            refuse("changeKeyFrame: the keyframe is not in this parameter", keyframe ? keyframe->endTime() : RationalTime());
+            refuse("changeKeyFrame: the keyframe is not in this parameter",
+                   keyframe ? keyframe->endTime() : RationalTime());
         previous = found->keyframe->value_;
         found->keyframe->value_ = value;
     });
@@ -125,24 +123,26 @@ typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::changeKeyFrame(const Ra
 }
 
 template <typename T>
-RationalTime ParameterImpl<T>::changeKeyFrameLeadInLength(const RationalTime& time, const RationalTime& leadIn) {
+RationalTime ParameterImpl<T>::changeKeyFrameLeadInLength(const RationalTime& time,
+                                                          const RationalTime& leadIn) {
     RationalTime previous;
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrameOrThrow(time, "changeKeyFrameLeadInLength");
-        if (!canAddKeyFrame(time, leadIn, keyframe.get())) refuse("changeKeyFrameLeadInLength: the lead-in does not fit", time);
+        if (!canAddKeyFrame(time, leadIn, keyframe.get()))
+            refuse("changeKeyFrameLeadInLength: the lead-in does not fit", time);
         previous = keyframe->leadIn_;
         keyframe->leadIn_ = leadIn;
     });
     return previous;
 }
 
-template <typename T>
-void ParameterImpl<T>::moveKeyFrame(const RationalTime& from, const RationalTime& to) {
+template <typename T> void ParameterImpl<T>::moveKeyFrame(const RationalTime& from, const RationalTime& to) {
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrameOrThrow(from, "moveKeyFrame");
         if (from == to) return;
         if (exactKeyFrame(to)) refuse("moveKeyFrame: another keyframe stands", to);
-        if (!canAddKeyFrame(to, keyframe->leadIn_, keyframe.get())) refuse("moveKeyFrame: a keyframe may not stand", to);
+        if (!canAddKeyFrame(to, keyframe->leadIn_, keyframe.get()))
+            refuse("moveKeyFrame: a keyframe may not stand", to);
         keyframes_.erase(MapUtil::find(keyframes_, from));
         keyframe->endTime_ = to;
         MapUtil::put(keyframes_, to, keyframe);
@@ -169,11 +169,14 @@ boost::shared_ptr<Parameter<T>> ParameterImpl<T>::copyPortion(const Range<Ration
     KeyFrameMap kept;
     auto keep = [&](const RationalTime& time, const KeyFramePtr& keyframe) {
         keyframe->endTime_ = time - start;
-        if (keyframe->leadIn_ > keyframe->endTime_) keyframe->leadIn_ = keyframe->endTime_; // starts inside the range
+        if (keyframe->leadIn_ > keyframe->endTime_)
+            keyframe->leadIn_ = keyframe->endTime_; // starts inside the range
         MapUtil::put(kept, keyframe->endTime_, keyframe);
     };
-    if (keyframes_.size() > 1 && !exactKeyFrame(start)) keep(start, newKeyFrame(start, valueAtTimeLocked(start), RationalTime(0)));
-    for (auto it = MapUtil::firstAtOrAfter(keyframes_, start); it != keyframes_.end() && it->time <= end; ++it)
+    if (keyframes_.size() > 1 && !exactKeyFrame(start))
+        keep(start, newKeyFrame(start, valueAtTimeLocked(start), RationalTime(0)));
+    for (auto it = MapUtil::firstAtOrAfter(keyframes_, start); it != keyframes_.end() && it->time <= end;
+         ++it)
         keep(it->time, it->keyframe->clone());
     if (keyframes_.size() > 1 && !exactKeyFrame(end) && end > start) {
         const auto cut = MapUtil::firstAfter(keyframes_, end);

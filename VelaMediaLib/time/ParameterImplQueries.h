@@ -12,7 +12,8 @@ ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
     std::map<std::string, std::string> metadata;
     {
         ScopedReadLock lock(other.projectMutex());
-        for (const auto& entry : other.keyframes_) keyframes_.push_back({entry.time, entry.keyframe->clone()});
+        for (const auto& entry : other.keyframes_)
+            keyframes_.push_back({entry.time, entry.keyframe->clone()});
         if (other.extras_) {
             extras().bounds = other.extras_->bounds;
             extras().hints = other.extras_->hints;
@@ -22,41 +23,35 @@ ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
     for (const auto& entry : metadata) metaDataPtr()->addMetaData(entry.first, entry.second);
 }
 
-template <typename T>
-typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
+template <typename T> typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
     if (!extras_) extras_.reset(new Extras);
     return *extras_;
 }
 
-template <typename T>
-std::string ParameterImpl<T>::identifier() const {
+template <typename T> std::string ParameterImpl<T>::identifier() const {
     ScopedReadLock lock(this->projectMutex());
     if (extras_ && extras_->identAttribute) return extras_->identAttribute->value();
     return identifier_;
 }
 
-template <typename T>
-boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
+template <typename T> boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
     ScopedWriteLock lock(this->projectMutex());
     if (!extras().identAttribute)
         extras().identAttribute.reset(new Attribute<std::string>("ident", identifier_, this->projectMutex()));
     return extras().identAttribute;
 }
 
-template <typename T>
-bool ParameterImpl<T>::hasValueBounds() const {
+template <typename T> bool ParameterImpl<T>::hasValueBounds() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ && extras_->bounds;
 }
 
-template <typename T>
-bool ParameterImpl<T>::hasUIHints() const {
+template <typename T> bool ParameterImpl<T>::hasUIHints() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ && extras_->hints;
 }
 
-template <typename T>
-boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
+template <typename T> boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ ? extras_->bounds : boost::none;
 }
@@ -66,8 +61,7 @@ void ParameterImpl<T>::setValueBounds(const T& minValue, const T& maxValue, cons
     edit([&] { extras().bounds = ValueBounds<T>{minValue, maxValue, defaultValue}; });
 }
 
-template <typename T>
-boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
+template <typename T> boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ ? extras_->hints : boost::none;
 }
@@ -77,31 +71,29 @@ void ParameterImpl<T>::setUIHints(const std::string& userInterfaceType, const st
     edit([&] { extras().hints = UIHints{userInterfaceType, unitType}; });
 }
 
-template <typename T>
-MetaDatable* ParameterImpl<T>::metaDataPtr() {
+template <typename T> MetaDatable* ParameterImpl<T>::metaDataPtr() {
     ScopedWriteLock lock(this->projectMutex());
     if (!extras().metadata) extras().metadata.reset(new MetaDatable(this->projectMutex()));
     return extras().metadata.get();
 }
 
-template <typename T>
-std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
+template <typename T> std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
     ScopedReadLock lock(this->projectMutex());
     if (!extras_ || !extras_->metadata) return std::map<std::string, std::string>();
     return extras_->metadata->metaDataCopy();
 }
 
-template <typename T>
-T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
+template <typename T> T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     return valueAtTimeLocked(time);
 }
 
 // No extrapolation: before the first and after the last keyframe the end
 // values hold; a time less than one tick before a keyframe is that keyframe.
-template <typename T>
-T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
-    if (keyframes_.empty()) throw KeyFrameException("parameter " + identifier_ + " has no keyframe", RationalTime(0), identifier_);
+template <typename T> T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
+    if (keyframes_.empty())
+        throw KeyFrameException("parameter " + identifier_ + " has no keyframe", RationalTime(0),
+                                identifier_);
     if (keyframes_.size() == 1 || time <= keyframes_.front().time) return keyframes_.front().keyframe->value_;
     if (time >= keyframes_.back().time) return keyframes_.back().keyframe->value_;
     const auto next = MapUtil::firstAtOrAfter(keyframes_, time);
@@ -110,12 +102,11 @@ T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
     if (scalable_ && (next->time.asRational() - time.asRational()) * scalable_->timeScale() < SafeRational(1))
         return end.value_;
     const auto previous = next - 1;
-    return segmentInterpolater(end)->interpolate(previous->keyframe->value_, end.value_, previous->time, next->time,
-                                     time.asDouble(), end.leadIn_);
+    return segmentInterpolater(end)->interpolate(previous->keyframe->value_, end.value_, previous->time,
+                                                 next->time, time.asDouble(), end.leadIn_);
 }
 
-template <typename T>
-size_t ParameterImpl<T>::numKeyFrames() const {
+template <typename T> size_t ParameterImpl<T>::numKeyFrames() const {
     ScopedReadLock lock(this->projectMutex());
     return keyframes_.size();
 }
@@ -147,24 +138,22 @@ typename ParameterImpl<T>::ConstKeyFramePtr ParameterImpl<T>::keyframeAtTime(con
 }
 
 template <typename T>
-boost::shared_ptr<KeyFrameInterface> ParameterImpl<T>::keyFrameInterfaceAtTime(const RationalTime& time) const {
+boost::shared_ptr<KeyFrameInterface>
+ParameterImpl<T>::keyFrameInterfaceAtTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     return exactKeyFrame(time);
 }
 
-template <typename T>
-bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
+template <typename T> bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
     return bool(keyFrameInterfaceAtTime(time));
 }
 
-template <typename T>
-bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
+template <typename T> bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
     ScopedReadLock lock(this->projectMutex());
     return MapUtil::anyInRange(keyframes_, range.start(), range.start() + range.duration());
 }
 
-template <typename T>
-boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
+template <typename T> boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
     ScopedReadLock lock(this->projectMutex());
     boost::shared_ptr<std::vector<RationalTime>> times(new std::vector<RationalTime>);
     times->reserve(keyframes_.size());
@@ -172,29 +161,25 @@ boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() c
     return times;
 }
 
-template <typename T>
-Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
+template <typename T> Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
     ScopedReadLock lock(this->projectMutex());
     if (keyframes_.empty()) return Range<RationalTime>();
     return Range<RationalTime>(keyframes_.front().time, keyframes_.back().time - keyframes_.front().time);
 }
 
-template <typename T>
-RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
+template <typename T> RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
     ScopedReadLock lock(this->projectMutex());
     if (keyframes_.empty()) refuse("firstKeyFrameTime: no keyframe", RationalTime(0));
     return keyframes_.front().time;
 }
 
-template <typename T>
-RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
+template <typename T> RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     const auto next = MapUtil::firstAfter(keyframes_, time);
     return next == keyframes_.end() ? time : next->time;
 }
 
-template <typename T>
-RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
+template <typename T> RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     const auto atOrAfter = MapUtil::firstAtOrAfter(keyframes_, time);
     return atOrAfter == keyframes_.begin() ? time : (atOrAfter - 1)->time;
@@ -207,19 +192,21 @@ bool ParameterImpl<T>::valuesDifferAtTimes(const RationalTime& a, const Rational
 }
 
 template <typename T>
-typename ParameterImpl<T>::InterpolaterPtr ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) const {
+typename ParameterImpl<T>::InterpolaterPtr
+ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) const {
     ScopedReadLock lock(this->projectMutex());
     return keyframe ? segmentInterpolater(*keyframe) : defaultInterpolater();
 }
 
-template <typename T>
-bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
+template <typename T> bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
     if (this == &other) return true;
-    if (parameterTypeString() != other.parameterTypeString() || numKeyFrames() != other.numKeyFrames()) return false;
+    if (parameterTypeString() != other.parameterTypeString() || numKeyFrames() != other.numKeyFrames())
+        return false;
     const boost::shared_ptr<std::vector<RationalTime>> times = keyframeTimes();
     for (const RationalTime& time : *times) {
         const ConstKeyFramePtr mine = keyframeAtTime(time), theirs = other.keyframeAtTime(time);
-        if (!theirs || !Similarity::same(mine->value(), theirs->value()) || mine->duration() != theirs->duration() ||
+        if (!theirs || !Similarity::same(mine->value(), theirs->value()) ||
+            mine->duration() != theirs->duration() ||
             interpolaterForKeyFrame(mine)->name() != other.interpolaterForKeyFrame(theirs)->name())
             return false;
     }

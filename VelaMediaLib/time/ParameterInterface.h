@@ -61,7 +61,8 @@ public:
     virtual RationalTime changeKeyFrameLeadInLength(const RationalTime& time, const RationalTime& leadIn) = 0;
 
     virtual boost::shared_ptr<ParameterInterface> cloneParameter() const = 0;
-    virtual boost::shared_ptr<ParameterInterface> copyPortionInterface(const Range<RationalTime>& range) const = 0;
+    virtual boost::shared_ptr<ParameterInterface>
+    copyPortionInterface(const Range<RationalTime>& range) const = 0;
     /// Gives a clone what it shares with this parameter: its time scale, value
     /// bounds and interface hints.
     virtual void setupSharedClone(const boost::shared_ptr<ParameterInterface>& clone) const = 0;

@@ -9,7 +9,8 @@ namespace VelaMediaLib {
 /// Arrives like a mass on a spring (damping 10, stiffness 100 for the shared
 /// instance), overshooting the value and settling on it.
 template <typename T>
-class SpringInterpolater : public TweenableInterpolater<T>, public SharedInterpolaterInstance<SpringInterpolater<T>> {
+class SpringInterpolater : public TweenableInterpolater<T>,
+                           public SharedInterpolaterInstance<SpringInterpolater<T>> {
 public:
     /// Throws ValueException<double> when damping or stiffness is zero or less.
     SpringInterpolater(double damping, double stiffness)

@@ -10,7 +10,8 @@ SpringResponse::SpringResponse(double damping, double stiffness)
     : damping_(damping), stiffness_(stiffness), half_(damping / 2.0),
       discriminant_(stiffness - half_ * half_), omega_(std::sqrt(std::fabs(discriminant_))) {
     if (!(damping > 0.0)) throw ValueException<double>("spring damping must be greater than zero", damping);
-    if (!(stiffness > 0.0)) throw ValueException<double>("spring stiffness must be greater than zero", stiffness);
+    if (!(stiffness > 0.0))
+        throw ValueException<double>("spring stiffness must be greater than zero", stiffness);
     // Bisection on the falling deviation bound for where it meets the tolerance.
     double lo = 0.0, hi = 1.0;
     while (deviationBound(hi) > kSettlingTolerance) hi *= 2.0;
@@ -25,7 +26,8 @@ SpringResponse::SpringResponse(double damping, double stiffness)
 double SpringResponse::response(double tau) const {
     double oscillation;
     if (discriminant_ > 0.0) {
-        oscillation = std::exp(-half_ * tau) * (std::cos(omega_ * tau) + (half_ / omega_) * std::sin(omega_ * tau));
+        oscillation =
+            std::exp(-half_ * tau) * (std::cos(omega_ * tau) + (half_ / omega_) * std::sin(omega_ * tau));
     } else if (discriminant_ == 0.0) {
         oscillation = std::exp(-half_ * tau) * (1.0 + half_ * tau);
     } else {

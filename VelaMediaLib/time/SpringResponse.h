@@ -26,9 +26,9 @@ private:
     double deviationBound(double tau) const;
 
     double damping_, stiffness_;
-    double half_;          // damping / 2
-    double discriminant_;  // stiffness - half^2: > 0 underdamped, 0 critical, < 0 overdamped
-    double omega_;         // sqrt(|discriminant|)
+    double half_;         // damping / 2
+    double discriminant_; // stiffness - half^2: > 0 underdamped, 0 critical, < 0 overdamped
+    double omega_;        // sqrt(|discriminant|)
     double settlingTime_ = 1.0;
     double normaliser_ = 1.0;
 };

@@ -13,7 +13,8 @@ public:
     using ParameterImpl<std::vector<double>>::ParameterImpl;
 
     static boost::shared_ptr<VectorParam> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                 const std::string& identifier, const std::vector<double>& value) {
+                                                 const std::string& identifier,
+                                                 const std::vector<double>& value) {
         boost::shared_ptr<VectorParam> parameter(new VectorParam(token, identifier));
         parameter->setDefaultValue(value);
         return parameter;

@@ -39,16 +39,20 @@ const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
 } // namespace
 
 TEST(ParameterDocument, ABareParameterIsItsValue) {
-    EXPECT_EQ(written(*ParameterImpl<double>::create(project, "opacity", 0.5), "opacity"), "\"opacity\" : 0.5");
+    EXPECT_EQ(written(*ParameterImpl<double>::create(project, "opacity", 0.5), "opacity"),
+              "\"opacity\" : 0.5");
     EXPECT_EQ(written(*ParameterImpl<double>::create(project, "opacity", 1.0), ""), "1.0");
-    EXPECT_EQ(written(*ParameterImpl<Point3d>::create(project, "p", Point3d(1, 2, 3)), "p"), "\"p\" : [1.0, 2.0, 3.0]");
+    EXPECT_EQ(written(*ParameterImpl<Point3d>::create(project, "p", Point3d(1, 2, 3)), "p"),
+              "\"p\" : [1.0, 2.0, 3.0]");
     ParameterImpl<double>::namesWrittenInFull().insert("always");
-    EXPECT_NE(written(*ParameterImpl<double>::create(project, "always", 1.0), "always").find("keyframes"), std::string::npos);
+    EXPECT_NE(written(*ParameterImpl<double>::create(project, "always", 1.0), "always").find("keyframes"),
+              std::string::npos);
     ParameterImpl<double>::namesWrittenInFull().erase("always");
 }
 
 TEST(ParameterDocument, AnObjectParameterIsWrittenMemberByMemberInItsOrder) {
-    auto parameter = InterpolatingParam<double>::create(project, "volume", 0.0, EaseInInterpolater<double>::getInstance());
+    auto parameter =
+        InterpolatingParam<double>::create(project, "volume", 0.0, EaseInInterpolater<double>::getInstance());
     parameter->setValueBounds(0.0, 2.0, 1.0);
     parameter->setUIHints("slider", "percent");
     parameter->addKeyFrame(RationalTime(30), 1.5, RationalTime(10));
@@ -110,14 +114,17 @@ TEST(ParameterDocument, AFailedReadChangesNothing) {
     auto parameter = ParameterImpl<double>::create(project, "x", 1.0);
     const auto before = parameter->clone();
     try {
-        parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0, "value": 3.0}, {"time": 5, "value": 1, "interp": "zzzz"}]})"));
+        parameter->readFromJSON(parse(
+            R"({"keyframes": [{"time": 0, "value": 3.0}, {"time": 5, "value": 1, "interp": "zzzz"}]})"));
         FAIL();
     } catch (const ParserException& e) {
         EXPECT_STREQ(e.what(), "trying to read an unknown interpolater");
     }
-    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0, "value": "text"}]})")), ParserException);
+    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0, "value": "text"}]})")),
+                 ParserException);
     EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0}]})")), ParserException);
-    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 1.5, "value": 1}]})")), ParserException);
+    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 1.5, "value": 1}]})")),
+                 ParserException);
     EXPECT_TRUE(*parameter == *before);
 }
 
@@ -146,8 +153,7 @@ void expectRoundTrip(const boost::shared_ptr<Kind>& parameter, const T& later) {
     EXPECT_TRUE(*copy == *parameter) << written(*parameter, "p");
 }
 
-template <typename T>
-void roundTrip(const T& first, const T& later) {
+template <typename T> void roundTrip(const T& first, const T& later) {
     expectRoundTrip(ParameterImpl<T>::create(project, "p", first), later);
 }
 
@@ -161,7 +167,8 @@ TEST(ParameterDocument, EveryValueTypeReadsBackEqual) {
     roundTrip(std::string("tab\there"), std::string("quote \" and \\ and \xc3\xa9"));
     roundTrip(Rect<float>(0, 0, 1920, 1080), Rect<float>(0.5f, -2, 3, 4));
     roundTrip(TemplatedColor<int>(255, 0, 0, 255), TemplatedColor<int>(1, 2, 3, 4));
-    roundTrip(std::list<Rect<float>>{}, std::list<Rect<float>>{Rect<float>(1, 2, 3, 4), Rect<float>(5, 6, 7, 8)});
+    roundTrip(std::list<Rect<float>>{},
+              std::list<Rect<float>>{Rect<float>(1, 2, 3, 4), Rect<float>(5, 6, 7, 8)});
     roundTrip(AudioPosition(-1, 0), AudioPosition(0.25, 1));
     roundTrip(CaptionData("Hello", "en"), CaptionData("Bonjour\n", "fr-CA"));
     roundTrip(KeystrokeData("S", KeystrokeData::Command), KeystrokeData("Tab"));
@@ -174,8 +181,11 @@ TEST(ParameterDocument, EveryValueTypeReadsBackEqual) {
     roundTrip(std::vector<double>{1, 2}, std::vector<double>{});
     roundTrip(InterpolaterFactory<double>::byName("linr"), InterpolaterFactory<double>::byName("bnce"));
     roundTrip(InterpolaterFactory<Point3d>::byName("sprg"),
-              boost::shared_ptr<Interpolater<Point3d>>(new BezierInterpolater(Point3d(1, 2, 3), Point3d(), "esOt")));
-    expectRoundTrip(InterpolatingParam<double>::create(project, "p", 1.0, SpringInterpolater<double>::getInstance()), 2.0);
+              boost::shared_ptr<Interpolater<Point3d>>(
+                  new BezierInterpolater(Point3d(1, 2, 3), Point3d(), "esOt")));
+    expectRoundTrip(
+        InterpolatingParam<double>::create(project, "p", 1.0, SpringInterpolater<double>::getInstance()),
+        2.0);
 }
 
 TEST(ParameterDocument, ADiffParameterWritesOnlyItsDifference) {

@@ -23,8 +23,7 @@ Json::Value parse(const std::string& text) {
     return value;
 }
 
-template <typename T>
-std::string text(const T& value) {
+template <typename T> std::string text(const T& value) {
     std::ostringstream out;
     ValueFormatter<T>::write(out, value);
     return out.str();
@@ -73,7 +72,8 @@ TEST(ValueFormatter, WrongShapesAreRefusedWithTheValue) {
     EXPECT_THROW(ValueFormatter<Point3d>::read(parse("[1, 2]")), ParserException);
     EXPECT_THROW(ValueFormatter<TemplatedColor<int>>::read(parse("[1, 2, 3, 4.5]")), ParserException);
     EXPECT_THROW(ValueFormatter<int>::read(parse("\"3\"")), ParserException);
-    EXPECT_THROW(ValueFormatter<TextAttributeList>::read(parse(R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
+    EXPECT_THROW(ValueFormatter<TextAttributeList>::read(
+                     parse(R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
                  ParserException);
 }
 

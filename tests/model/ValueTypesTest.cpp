@@ -8,7 +8,8 @@ using namespace VelaMediaLib;
 
 TEST(TransformMatrix, ComposesRightToLeft) {
     EXPECT_EQ(TransformMatrix() * TransformMatrix::scaling(2, 3, 4), TransformMatrix::scaling(2, 3, 4));
-    const TransformMatrix moveThenTurn = TransformMatrix::rotationZ(M_PI / 2) * TransformMatrix::translation(1, 0, 0);
+    const TransformMatrix moveThenTurn =
+        TransformMatrix::rotationZ(M_PI / 2) * TransformMatrix::translation(1, 0, 0);
     const Point3d p = moveThenTurn.apply(Point3d(1, 0, 0)); // (2, 0) turned a quarter: (0, 2)
     EXPECT_NEAR(p.x, 0.0, 1e-12);
     EXPECT_NEAR(p.y, 2.0, 1e-12);

@@ -8,8 +8,7 @@ using namespace VelaMediaLib;
 namespace {
 
 // Value between 10 at time 0 and 20 at time 2, at time t.
-template <typename Kind>
-double tween(double t) {
+template <typename Kind> double tween(double t) {
     return Kind::getInstance()->interpolate(10.0, 20.0, RationalTime(0), RationalTime(2), t);
 }
 
@@ -63,9 +62,11 @@ TEST(Interpolater, CompoundValuesBlendMemberByMemberAndIntegersRound) {
         Point3d(0, 0, 0), Point3d(10, 20, -30), RationalTime(0), RationalTime(4), 1.0);
     EXPECT_EQ(point, Point3d(2.5, 5, -7.5));
     const auto colour = LinearInterpolater<TemplatedColor<int>>::getInstance()->interpolate(
-        TemplatedColor<int>(0, 0, 0, 255), TemplatedColor<int>(255, 10, 3, 255), RationalTime(0), RationalTime(2), 1.0);
+        TemplatedColor<int>(0, 0, 0, 255), TemplatedColor<int>(255, 10, 3, 255), RationalTime(0),
+        RationalTime(2), 1.0);
     EXPECT_EQ(colour, TemplatedColor<int>(128, 5, 2, 255)); // 127.5 and 1.5 round away from zero
-    EXPECT_EQ(LinearInterpolater<int>::getInstance()->interpolate(0, 3, RationalTime(0), RationalTime(2), 1.0), 2);
+    EXPECT_EQ(
+        LinearInterpolater<int>::getInstance()->interpolate(0, 3, RationalTime(0), RationalTime(2), 1.0), 2);
     const TransformMatrix halfway = LinearInterpolater<TransformMatrix>::getInstance()->interpolate(
         TransformMatrix(), TransformMatrix::translation(4, 0, 0), RationalTime(0), RationalTime(2), 1.0);
     EXPECT_DOUBLE_EQ(halfway.at(0, 3), 2.0);
@@ -74,10 +75,13 @@ TEST(Interpolater, CompoundValuesBlendMemberByMemberAndIntegersRound) {
 TEST(Interpolater, ALeadInStartsTheTransitionLate) {
     const auto linear = LinearInterpolater<double>::getInstance();
     // Keyframes 0 at 0 and 10 at 10, with a lead-in of 4: holds until 6.
-    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 5.0, RationalTime(4)), 0.0);
-    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 8.0, RationalTime(4)), 5.0);
+    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 5.0, RationalTime(4)),
+                     0.0);
+    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 8.0, RationalTime(4)),
+                     5.0);
     // A lead-in longer than the segment starts at the earlier keyframe.
-    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 5.0, RationalTime(40)), 5.0);
+    EXPECT_DOUBLE_EQ(linear->interpolate(0.0, 10.0, RationalTime(0), RationalTime(10), 5.0, RationalTime(40)),
+                     5.0);
 }
 
 TEST(Interpolater, NamesSharedInstancesAndUnknownNames) {
@@ -99,7 +103,8 @@ TEST(Interpolater, NamesSharedInstancesAndUnknownNames) {
 TEST(BezierInterpolater, FollowsTheCurveAndSurvivesItsName) {
     // Control points a third and two thirds along a straight line make the curve that line.
     const BezierInterpolater straight(Point3d(10, 0, 0), Point3d(20, 0, 0), "linr");
-    const Point3d middle = straight.interpolate(Point3d(0, 0, 0), Point3d(30, 0, 0), RationalTime(0), RationalTime(2), 1.0);
+    const Point3d middle =
+        straight.interpolate(Point3d(0, 0, 0), Point3d(30, 0, 0), RationalTime(0), RationalTime(2), 1.0);
     EXPECT_NEAR(middle.x, 15.0, 1e-12);
     // A bent curve at s = 0.5: (a + 3 cp1 + 3 cp2 + b) / 8.
     const BezierInterpolater bent(Point3d(0, 8, 0), Point3d(8, 8, 0), "linr");
@@ -110,7 +115,8 @@ TEST(BezierInterpolater, FollowsTheCurveAndSurvivesItsName) {
     EXPECT_EQ(parsed->controlPoint2(), Point3d(8, 8.5, -1));
     EXPECT_EQ(parsed->temporalInterpolaterName(), "esIn");
     EXPECT_EQ(parsed->asJson(), "\"bezr(esIn;0.0,8.0,0.0;8.0,8.5,-1.0)\"");
-    EXPECT_EQ(InterpolaterFactory<Point3d>::byName("bezr(esIn;0.0,8.0,0.0;8.0,8.5,-1.0)")->asJson(), parsed->asJson());
+    EXPECT_EQ(InterpolaterFactory<Point3d>::byName("bezr(esIn;0.0,8.0,0.0;8.0,8.5,-1.0)")->asJson(),
+              parsed->asJson());
     EXPECT_FALSE(BezierInterpolater::fromName("bezr(linr;1,2;3,4,5)"));
     EXPECT_THROW(BezierInterpolater(Point3d(), Point3d(), "what"), ParserException);
 }
