@@ -42,7 +42,8 @@ void BM_ValueAtTime_StdMapBaseline(benchmark::State& state) {
 void BM_ValueAtTime_Parameter(benchmark::State& state) {
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     auto parameter = InterpolatingParam<double>::create(project, "x", 0.0);
-    for (int i = 1; i < kKeyFrames; ++i) parameter->addKeyFrame(RationalTime(i * 10), double(i % 7), RationalTime(0));
+    for (int i = 1; i < kKeyFrames; ++i)
+        parameter->addKeyFrame(RationalTime(i * 10), double(i % 7), RationalTime(0));
     std::vector<RationalTime> times;
     for (double t : queryTimes()) times.push_back(RationalTime((long long)(t * 1000), 1000));
     size_t i = 0;

@@ -11,7 +11,8 @@ namespace {
 
 const size_t kOperands = 1024;
 
-template <typename T> std::vector<T> operands() {
+template <typename T>
+std::vector<T> operands() {
     std::mt19937_64 random(42);
     std::uniform_int_distribution<long long> num(-100000, 100000), den(1, 30000);
     std::vector<T> values;
@@ -22,7 +23,8 @@ template <typename T> std::vector<T> operands() {
     return values;
 }
 
-template <typename T, typename Op> void run(benchmark::State& state, Op op) {
+template <typename T, typename Op>
+void run(benchmark::State& state, Op op) {
     const std::vector<T> values = operands<T>();
     size_t i = 0;
     for (auto _ : state) {

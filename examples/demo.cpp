@@ -107,6 +107,37 @@ void parameters() {
     std::cout << "\n";
 }
 
+void printClip(const char* what, const Media& clip) {
+    const Range<VelaTime> track = clip.trackRange();
+    const Range<SafeRational> media = clip.rationalMediaRange();
+    std::cout << "  " << std::left << std::setw(30) << what << std::right << " track [" << std::setw(4)
+              << track.start() << ", " << std::setw(4) << track.end() << ")  media start " << std::setw(5)
+              << text(media.start()) << "  media length " << std::setw(6) << text(media.duration())
+              << "  scalar " << text(clip.state().scalar) << "\n";
+}
+
+void clips() {
+    std::cout << "\nA placeholder clip playing 90 ticks of media 1.5 times as fast (scalar 2/3)\n";
+    const boost::shared_ptr<ThreadSafe> project(new ThreadSafe);
+    const boost::shared_ptr<ProjectEditRate> rate(
+        new SimpleProjectEditRate(boost::rational<unsigned long>(30)));
+    const auto clip = PlaceholderMedia::createFromMediaRange(project, rate, 0, 0, 90, SafeRational(2, 3));
+    printClip("as made", *clip);
+    clip->trimStart(1);
+    printClip("trimStart(1)", *clip);
+    clip->trimEnd(2);
+    printClip("trimEnd(2)", *clip);
+    clip->rationalStretch(SafeRational(3, 2));
+    printClip("rationalStretch(3/2)", *clip);
+    try {
+        clip->trimEnd(-10);
+    } catch (const InvalidTrimRangeException& e) {
+        std::cout << "  trimEnd(-10) is refused: \"" << e.what() << "\" (limit " << clip->trimEndLimit()
+                  << ")\n";
+    }
+    printClip("unchanged", *clip);
+}
+
 } // namespace
 
 int main() {
@@ -116,5 +147,6 @@ int main() {
     grid();
     rounding();
     parameters();
+    clips();
     return 0;
 }

@@ -17,7 +17,8 @@ namespace {
                           compactJSON(json));
 }
 
-template <typename Number> std::string shortest(Number value) {
+template <typename Number>
+std::string shortest(Number value) {
     if (!std::isfinite(value)) return "null";
     char text[64];
     const std::to_chars_result result = std::to_chars(text, text + sizeof text, value);
@@ -33,7 +34,8 @@ double number(const Json::Value& json) {
 }
 
 // Arrays of numbers: [a, b, c].
-template <size_t N> void writeNumbers(std::ostream& out, const double (&values)[N]) {
+template <size_t N>
+void writeNumbers(std::ostream& out, const double (&values)[N]) {
     out << "[";
     for (size_t i = 0; i < N; ++i) out << (i ? ", " : "") << formatDouble(values[i]);
     out << "]";

@@ -26,7 +26,8 @@
 
 namespace VelaMediaLib {
 
-template <typename T> struct ValueFormatter; // write(std::ostream&, const T&) and read(const Json::Value&)
+template <typename T>
+struct ValueFormatter; // write(std::ostream&, const T&) and read(const Json::Value&)
 
 std::string formatDouble(double value);
 std::string formatFloat(float value);
@@ -34,7 +35,8 @@ std::string formatFloat(float value);
 std::string compactJSON(const Json::Value& value);
 
 #define VELA_VALUE_FORMATTER(Type)                                                                           \
-    template <> struct ValueFormatter<Type> {                                                                \
+    template <>                                                                                              \
+    struct ValueFormatter<Type> {                                                                            \
         static void write(std::ostream& out, const Type& value);                                             \
         static Type read(const Json::Value& json);                                                           \
     }

@@ -5,7 +5,8 @@
 namespace VelaMediaLib {
 
 /// An axis-aligned rectangle: origin and size.
-template <typename T> struct Rect {
+template <typename T>
+struct Rect {
     T x{}, y{}, width{}, height{};
 
     Rect() = default;
@@ -17,7 +18,8 @@ template <typename T> struct Rect {
     bool operator!=(const Rect& o) const { return !(*this == o); }
 };
 
-template <typename T> std::ostream& operator<<(std::ostream& out, const Rect<T>& r) {
+template <typename T>
+std::ostream& operator<<(std::ostream& out, const Rect<T>& r) {
     return out << "Rect(" << r.x << ", " << r.y << ", " << r.width << ", " << r.height << ")";
 }
 

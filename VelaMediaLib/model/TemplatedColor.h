@@ -5,7 +5,8 @@
 namespace VelaMediaLib {
 
 /// A colour as red, green, blue and alpha channels (0-255 for int channels).
-template <typename T> struct TemplatedColor {
+template <typename T>
+struct TemplatedColor {
     T red{}, green{}, blue{}, alpha{};
 
     TemplatedColor() = default;
@@ -17,7 +18,8 @@ template <typename T> struct TemplatedColor {
     bool operator!=(const TemplatedColor& o) const { return !(*this == o); }
 };
 
-template <typename T> std::ostream& operator<<(std::ostream& out, const TemplatedColor<T>& c) {
+template <typename T>
+std::ostream& operator<<(std::ostream& out, const TemplatedColor<T>& c) {
     return out << "Color(" << c.red << ", " << c.green << ", " << c.blue << ", " << c.alpha << ")";
 }
 

@@ -24,13 +24,25 @@ TransformMatrix TransformMatrix::scaling(double x, double y, double z) {
     return t;
 }
 
-TransformMatrix TransformMatrix::rotationZ(double radians) {
+// The rotation in the plane of axes a and b (a turning towards b).
+static TransformMatrix planeRotation(int a, int b, double radians) {
     TransformMatrix t;
     const double c = std::cos(radians), s = std::sin(radians);
-    t.set(0, 0, c);
-    t.set(0, 1, -s);
-    t.set(1, 0, s);
-    t.set(1, 1, c);
+    t.set(a, a, c);
+    t.set(a, b, -s);
+    t.set(b, a, s);
+    t.set(b, b, c);
+    return t;
+}
+
+TransformMatrix TransformMatrix::rotationX(double radians) { return planeRotation(1, 2, radians); }
+TransformMatrix TransformMatrix::rotationY(double radians) { return planeRotation(2, 0, radians); }
+TransformMatrix TransformMatrix::rotationZ(double radians) { return planeRotation(0, 1, radians); }
+
+TransformMatrix TransformMatrix::shearing(double xByY, double yByX) {
+    TransformMatrix t;
+    t.set(0, 1, xByY);
+    t.set(1, 0, yByX);
     return t;
 }
 

@@ -19,8 +19,12 @@ public:
     static TransformMatrix identity() { return TransformMatrix(); }
     static TransformMatrix translation(double x, double y, double z);
     static TransformMatrix scaling(double x, double y, double z);
-    /// Rotation about the z axis, in radians, counter-clockwise.
+    /// Rotations about each axis, in radians, counter-clockwise looking down the axis.
+    static TransformMatrix rotationX(double radians);
+    static TransformMatrix rotationY(double radians);
     static TransformMatrix rotationZ(double radians);
+    /// x moves by xByY times y, y by yByX times x.
+    static TransformMatrix shearing(double xByY, double yByX);
 
     double at(int row, int column) const { return m_[row * 4 + column]; }
     void set(int row, int column, double value) { m_[row * 4 + column] = value; }

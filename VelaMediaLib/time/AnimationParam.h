@@ -18,7 +18,8 @@ struct Animation {
 /// that lead-in, which the track records. When read from a document, a
 /// keyframe without a lead-in adds no keyframe: its value goes to the keyframe
 /// in force at its time (the last one at or before it, else the first).
-template <typename T> class AnimationParam : public InterpolatingParam<T> {
+template <typename T>
+class AnimationParam : public InterpolatingParam<T> {
 public:
     typedef typename ParameterImpl<T>::KeyFramePtr KeyFramePtr;
     using InterpolatingParam<T>::InterpolatingParam;

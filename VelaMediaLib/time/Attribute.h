@@ -1,22 +1,41 @@
 #pragma once
 
+#include <VelaMediaLib/document/ValueFormatter.h>
 #include <VelaMediaLib/time/ReadWriteMutex.h>
 #include <VelaMediaLib/time/Subject.h>
 
+#include <boost/shared_ptr.hpp>
 #include <string>
 
 namespace VelaMediaLib {
 
+/// The type-independent face of an attribute: its name and its value as document text.
+class AttributeInterface : public Subject {
+public:
+    using Subject::Subject;
+    virtual const std::string& name() const = 0;
+    virtual void writeValue(std::ostream& out) const = 0;
+    /// A new attribute with the same name and value, for another object.
+    virtual boost::shared_ptr<AttributeInterface>
+    cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const = 0;
+};
+
 /// A named value that tells its observers when it changes. Reads take the
 /// project's read lock and writes its write lock; setting the value it
 /// already has changes nothing and tells nobody.
-template <typename T> class Attribute : public Subject {
+template <typename T>
+class Attribute : public AttributeInterface {
 public:
     Attribute(std::string name, T value,
               const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())
-        : Subject(token), name_(std::move(name)), value_(std::move(value)) {}
+        : AttributeInterface(token), name_(std::move(name)), value_(std::move(value)) {}
 
-    const std::string& name() const { return name_; }
+    const std::string& name() const override { return name_; }
+    void writeValue(std::ostream& out) const override { ValueFormatter<T>::write(out, value()); }
+    boost::shared_ptr<AttributeInterface>
+    cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const override {
+        return boost::shared_ptr<AttributeInterface>(new Attribute(name_, value(), token));
+    }
 
     T value() const {
         ScopedReadLock lock(projectMutex());

@@ -12,7 +12,8 @@ namespace VelaMediaLib {
 /// source altogether. Its curve is the source's with the difference applied,
 /// and follows the source when the source changes. Any edit made through the
 /// parameter's operations is kept as a difference.
-template <typename T> class DiffParameter : public ParameterImpl<T> {
+template <typename T>
+class DiffParameter : public ParameterImpl<T> {
 public:
     typedef ParameterImpl<T> Base;
     typedef typename Base::KeyFrameMap KeyFrameMap;

@@ -6,7 +6,8 @@
 namespace VelaMediaLib {
 
 /// Ease in and ease out differ only in the exponent of u.
-template <typename T> class ExponentialEaseInterpolater : public TweenableInterpolater<T> {
+template <typename T>
+class ExponentialEaseInterpolater : public TweenableInterpolater<T> {
 public:
     double exponent() const { return exponent_; }
     double ease(double u) const override { return InterpolaterUtil::easeExponential(u, exponent_); }

@@ -15,7 +15,8 @@ namespace VelaMediaLib {
 /// earlier keyframe's time; with a lead-in it starts that long before the
 /// later keyframe (never before the earlier one) and the value holds at the
 /// earlier keyframe's value until then.
-template <typename T> class Interpolater {
+template <typename T>
+class Interpolater {
 public:
     virtual ~Interpolater() = default;
 
@@ -46,7 +47,8 @@ private:
 };
 
 /// The one shared instance of an interpolater kind.
-template <typename Kind> class SharedInterpolaterInstance {
+template <typename Kind>
+class SharedInterpolaterInstance {
 public:
     static boost::shared_ptr<Kind> getInstance() {
         static const boost::shared_ptr<Kind> instance(new Kind());

@@ -23,7 +23,8 @@ namespace VelaMediaLib {
 /// Which interpolater kinds a value type has: every type steps ("left");
 /// numeric and geometric types tween linearly and with the exponential
 /// eases; some of those also have the in-out, bounce and spring curves.
-template <typename T> struct InterpolaterKinds {
+template <typename T>
+struct InterpolaterKinds {
     static constexpr bool linear =
         std::is_same<T, int>::value || std::is_same<T, float>::value || std::is_same<T, double>::value ||
         std::is_same<T, long long>::value || std::is_same<T, Rect<float>>::value ||
@@ -37,7 +38,8 @@ template <typename T> struct InterpolaterKinds {
 
 /// The shared interpolater of a name for a value type. A name the type does
 /// not have throws ParserException "trying to read an unknown interpolater".
-template <typename T> class InterpolaterFactory {
+template <typename T>
+class InterpolaterFactory {
 public:
     typedef boost::shared_ptr<Interpolater<T>> Pointer;
 

@@ -7,7 +7,8 @@ namespace VelaMediaLib {
 
 /// An interpolater value is written as its name and read back through the
 /// shared instances; an empty reference is written as null.
-template <typename X> struct ValueFormatter<boost::shared_ptr<Interpolater<X>>> {
+template <typename X>
+struct ValueFormatter<boost::shared_ptr<Interpolater<X>>> {
     static void write(std::ostream& out, const boost::shared_ptr<Interpolater<X>>& value) {
         out << (value ? value->asJson() : std::string("null"));
     }

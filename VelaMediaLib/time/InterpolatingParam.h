@@ -7,7 +7,8 @@ namespace VelaMediaLib {
 /// A numeric parameter with an interpolater of its own that its keyframes
 /// follow unless they name one; the document carries it as the parameter's
 /// "interp".
-template <typename T> class InterpolatingParam : public ParameterImpl<T> {
+template <typename T>
+class InterpolatingParam : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
 

@@ -7,12 +7,14 @@
 
 namespace VelaMediaLib {
 
-template <typename T> class ParameterImpl;
+template <typename T>
+class ParameterImpl;
 
 /// One keyframe of a parameter of value type T. Its interpolater governs the
 /// transition that ends at this keyframe; an empty one means the parameter's
 /// own default.
-template <typename T> class KeyFrame : public KeyFrameInterface {
+template <typename T>
+class KeyFrame : public KeyFrameInterface {
 public:
     typedef boost::shared_ptr<Interpolater<T>> InterpolaterPtr;
 
@@ -71,7 +73,8 @@ protected:
     }
 
 private:
-    template <typename> friend class ParameterImpl;
+    template <typename>
+    friend class ParameterImpl;
 
     T value_;
     InterpolaterPtr interpolater_;

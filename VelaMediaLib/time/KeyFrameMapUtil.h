@@ -11,12 +11,14 @@ namespace VelaMediaLib {
 /// A parameter's keyframes: a map from end time to keyframe, kept as a
 /// vector sorted by time so that lookups are binary searches over memory
 /// that lies together.
-template <typename K> struct KeyFrameEntry {
+template <typename K>
+struct KeyFrameEntry {
     RationalTime time;
     boost::shared_ptr<K> keyframe;
 };
 
-template <typename K> class KeyFrameMapUtil {
+template <typename K>
+class KeyFrameMapUtil {
 public:
     typedef std::vector<KeyFrameEntry<K>> Map;
     typedef typename Map::iterator Iterator;

@@ -6,7 +6,8 @@ namespace VelaMediaLib {
 
 /// A parameter that only steps: every segment holds the earlier keyframe's
 /// value until the next keyframe, whatever interpolater a keyframe names.
-template <typename T> class LeftParameter : public ParameterImpl<T> {
+template <typename T>
+class LeftParameter : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
     using ParameterImpl<T>::ParameterImpl;

@@ -6,7 +6,8 @@
 namespace VelaMediaLib {
 
 /// The typed operations of a keyframed parameter of value type T.
-template <typename T> class Parameter : public ParameterInterface {
+template <typename T>
+class Parameter : public ParameterInterface {
 public:
     typedef T ValueType;
     typedef KeyFrame<T> KeyFrameType;

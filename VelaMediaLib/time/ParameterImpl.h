@@ -27,7 +27,10 @@
 namespace VelaMediaLib {
 
 /// The minimum, maximum and default a user interface offers for a parameter.
-template <typename T> struct ValueBounds { T minValue, maxValue, defaultValue; };
+template <typename T>
+struct ValueBounds {
+    T minValue, maxValue, defaultValue;
+};
 
 /// How a user interface presents a parameter: its control and its unit.
 struct UIHints {
@@ -35,7 +38,8 @@ struct UIHints {
     std::string unitType;
 };
 
-template <typename T> class ParameterImpl : public Parameter<T> {
+template <typename T>
+class ParameterImpl : public Parameter<T> {
 public:
     typedef Parameter<T> Base;
     typedef typename Base::KeyFramePtr KeyFramePtr;
@@ -188,7 +192,8 @@ protected:
         return out.str();
     }
     /// Runs a change under the write lock, then tells the observers.
-    template <typename Change> void edit(Change change) {
+    template <typename Change>
+    void edit(Change change) {
         {
             ScopedWriteLock lock(this->projectMutex());
             change();

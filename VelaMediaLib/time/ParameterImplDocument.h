@@ -69,7 +69,8 @@ void ParameterImpl<T>::toJSON(XMLOptions& options, int indent, const std::string
     if (extras_ && extras_->metadata) MetaDatable::toJSON(object, *extras_->metadata);
 }
 
-template <typename T> void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
+template <typename T>
+void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
     object.key("keyframes");
     JSONWriter array(object.options(), object.memberLevel(), JSONWriter::Array);
     for (const auto& entry : keyframes_) {
@@ -78,13 +79,15 @@ template <typename T> void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) 
     }
 }
 
-template <typename T> void ParameterImpl<T>::readFromJSON(const Json::Value& json) {
+template <typename T>
+void ParameterImpl<T>::readFromJSON(const Json::Value& json) {
     const boost::shared_ptr<ParameterImpl> scratch = cloneImpl();
     scratch->readInto(json);
     edit([&] { takeStateFrom(*scratch); });
 }
 
-template <typename T> void ParameterImpl<T>::readInto(const Json::Value& json) {
+template <typename T>
+void ParameterImpl<T>::readInto(const Json::Value& json) {
     if (!ParameterDocument::isParameterObject(json)) {
         setDefaultValue(ValueFormatter<T>::read(json)); // a bare value is the only keyframe, at time 0
         return;
@@ -108,7 +111,8 @@ template <typename T> void ParameterImpl<T>::readInto(const Json::Value& json) {
 
 // A "keyframes" array replaces the curve: reading starts from no keyframes,
 // and a later entry at the same end time replaces the value of an earlier one.
-template <typename T> void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
+template <typename T>
+void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
     const Json::Value& array = json["keyframes"];
     if (array.isNull()) return;
     if (!array.isArray()) throw ParserException("Invalid project json - \"keyframes\" is not an array");
@@ -118,7 +122,8 @@ template <typename T> void ParameterImpl<T>::readKeyFrames(const Json::Value& js
         throw ParserException("Invalid project json - parameter " + identifier_ + " has no keyframe");
 }
 
-template <typename T> void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
+template <typename T>
+void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
     if (!json.isObject() || !json.isMember("value"))
         throw ParserException("Invalid project json - a keyframe of " + identifier_ + " has no value");
     const RationalTime leadIn =
@@ -150,7 +155,8 @@ ParameterImpl<T>::placeReadKeyFrame(const RationalTime& end, const T& value, con
     return exactKeyFrame(end);
 }
 
-template <typename T> void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
+template <typename T>
+void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
     keyframes_.swap(read.keyframes_);
     for (auto& entry : keyframes_) entry.keyframe->setMetaDataToken(this->projectMutex());
     if (!read.extras_ && !extras_) return;

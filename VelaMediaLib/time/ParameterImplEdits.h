@@ -21,7 +21,8 @@ bool ParameterImpl<T>::canAddKeyFrame(const RationalTime& time, const RationalTi
     return true;
 }
 
-template <typename T> T ParameterImpl<T>::setDefaultValue(const T& value) {
+template <typename T>
+T ParameterImpl<T>::setDefaultValue(const T& value) {
     T previous = value;
     edit([&] {
         if (!keyframes_.empty()) previous = valueAtTimeLocked(RationalTime(0));
@@ -32,7 +33,8 @@ template <typename T> T ParameterImpl<T>::setDefaultValue(const T& value) {
     return previous;
 }
 
-template <typename T> T ParameterImpl<T>::setValueAtTime(const T& value, const RationalTime& time) {
+template <typename T>
+T ParameterImpl<T>::setValueAtTime(const T& value, const RationalTime& time) {
     T previous = value;
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrame(time);
@@ -58,7 +60,8 @@ void ParameterImpl<T>::addKeyFrame(const RationalTime& time, const T& value, con
     });
 }
 
-template <typename T> void ParameterImpl<T>::addKeyFrame(const KeyFramePtr& keyframe) {
+template <typename T>
+void ParameterImpl<T>::addKeyFrame(const KeyFramePtr& keyframe) {
     if (!keyframe) throw KeyFrameException("addKeyFrame: no keyframe given", RationalTime(0), identifier());
     edit([&] {
         const RationalTime time = keyframe->endTime_;
@@ -83,7 +86,8 @@ typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::removeKeyFrame(const Ra
     return removed;
 }
 
-template <typename T> T ParameterImpl<T>::changeKeyFrame(const RationalTime& time, const T& value) {
+template <typename T>
+T ParameterImpl<T>::changeKeyFrame(const RationalTime& time, const T& value) {
     T previous = value;
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrameOrThrow(time, "changeKeyFrame");
@@ -93,7 +97,8 @@ template <typename T> T ParameterImpl<T>::changeKeyFrame(const RationalTime& tim
     return previous;
 }
 
-template <typename T> T ParameterImpl<T>::changeKeyFrame(const ConstKeyFramePtr& keyframe, const T& value) {
+template <typename T>
+T ParameterImpl<T>::changeKeyFrame(const ConstKeyFramePtr& keyframe, const T& value) {
     T previous = value;
     edit([&] {
         const auto found =
@@ -136,7 +141,8 @@ RationalTime ParameterImpl<T>::changeKeyFrameLeadInLength(const RationalTime& ti
     return previous;
 }
 
-template <typename T> void ParameterImpl<T>::moveKeyFrame(const RationalTime& from, const RationalTime& to) {
+template <typename T>
+void ParameterImpl<T>::moveKeyFrame(const RationalTime& from, const RationalTime& to) {
     edit([&] {
         const KeyFramePtr keyframe = exactKeyFrameOrThrow(from, "moveKeyFrame");
         if (from == to) return;

@@ -23,35 +23,41 @@ ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
     for (const auto& entry : metadata) metaDataPtr()->addMetaData(entry.first, entry.second);
 }
 
-template <typename T> typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
+template <typename T>
+typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
     if (!extras_) extras_.reset(new Extras);
     return *extras_;
 }
 
-template <typename T> std::string ParameterImpl<T>::identifier() const {
+template <typename T>
+std::string ParameterImpl<T>::identifier() const {
     ScopedReadLock lock(this->projectMutex());
     if (extras_ && extras_->identAttribute) return extras_->identAttribute->value();
     return identifier_;
 }
 
-template <typename T> boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
+template <typename T>
+boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
     ScopedWriteLock lock(this->projectMutex());
     if (!extras().identAttribute)
         extras().identAttribute.reset(new Attribute<std::string>("ident", identifier_, this->projectMutex()));
     return extras().identAttribute;
 }
 
-template <typename T> bool ParameterImpl<T>::hasValueBounds() const {
+template <typename T>
+bool ParameterImpl<T>::hasValueBounds() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ && extras_->bounds;
 }
 
-template <typename T> bool ParameterImpl<T>::hasUIHints() const {
+template <typename T>
+bool ParameterImpl<T>::hasUIHints() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ && extras_->hints;
 }
 
-template <typename T> boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
+template <typename T>
+boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ ? extras_->bounds : boost::none;
 }
@@ -61,7 +67,8 @@ void ParameterImpl<T>::setValueBounds(const T& minValue, const T& maxValue, cons
     edit([&] { extras().bounds = ValueBounds<T>{minValue, maxValue, defaultValue}; });
 }
 
-template <typename T> boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
+template <typename T>
+boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
     ScopedReadLock lock(this->projectMutex());
     return extras_ ? extras_->hints : boost::none;
 }
@@ -71,26 +78,30 @@ void ParameterImpl<T>::setUIHints(const std::string& userInterfaceType, const st
     edit([&] { extras().hints = UIHints{userInterfaceType, unitType}; });
 }
 
-template <typename T> MetaDatable* ParameterImpl<T>::metaDataPtr() {
+template <typename T>
+MetaDatable* ParameterImpl<T>::metaDataPtr() {
     ScopedWriteLock lock(this->projectMutex());
     if (!extras().metadata) extras().metadata.reset(new MetaDatable(this->projectMutex()));
     return extras().metadata.get();
 }
 
-template <typename T> std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
+template <typename T>
+std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
     ScopedReadLock lock(this->projectMutex());
     if (!extras_ || !extras_->metadata) return std::map<std::string, std::string>();
     return extras_->metadata->metaDataCopy();
 }
 
-template <typename T> T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
+template <typename T>
+T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     return valueAtTimeLocked(time);
 }
 
 // No extrapolation: before the first and after the last keyframe the end
 // values hold; a time less than one tick before a keyframe is that keyframe.
-template <typename T> T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
+template <typename T>
+T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
     if (keyframes_.empty())
         throw KeyFrameException("parameter " + identifier_ + " has no keyframe", RationalTime(0),
                                 identifier_);
@@ -106,7 +117,8 @@ template <typename T> T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& 
                                                  next->time, time.asDouble(), end.leadIn_);
 }
 
-template <typename T> size_t ParameterImpl<T>::numKeyFrames() const {
+template <typename T>
+size_t ParameterImpl<T>::numKeyFrames() const {
     ScopedReadLock lock(this->projectMutex());
     return keyframes_.size();
 }
@@ -144,16 +156,19 @@ ParameterImpl<T>::keyFrameInterfaceAtTime(const RationalTime& time) const {
     return exactKeyFrame(time);
 }
 
-template <typename T> bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
+template <typename T>
+bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
     return bool(keyFrameInterfaceAtTime(time));
 }
 
-template <typename T> bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
+template <typename T>
+bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
     ScopedReadLock lock(this->projectMutex());
     return MapUtil::anyInRange(keyframes_, range.start(), range.start() + range.duration());
 }
 
-template <typename T> boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
+template <typename T>
+boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
     ScopedReadLock lock(this->projectMutex());
     boost::shared_ptr<std::vector<RationalTime>> times(new std::vector<RationalTime>);
     times->reserve(keyframes_.size());
@@ -161,25 +176,29 @@ template <typename T> boost::shared_ptr<std::vector<RationalTime>> ParameterImpl
     return times;
 }
 
-template <typename T> Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
+template <typename T>
+Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
     ScopedReadLock lock(this->projectMutex());
     if (keyframes_.empty()) return Range<RationalTime>();
     return Range<RationalTime>(keyframes_.front().time, keyframes_.back().time - keyframes_.front().time);
 }
 
-template <typename T> RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
+template <typename T>
+RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
     ScopedReadLock lock(this->projectMutex());
     if (keyframes_.empty()) refuse("firstKeyFrameTime: no keyframe", RationalTime(0));
     return keyframes_.front().time;
 }
 
-template <typename T> RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
+template <typename T>
+RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     const auto next = MapUtil::firstAfter(keyframes_, time);
     return next == keyframes_.end() ? time : next->time;
 }
 
-template <typename T> RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
+template <typename T>
+RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
     ScopedReadLock lock(this->projectMutex());
     const auto atOrAfter = MapUtil::firstAtOrAfter(keyframes_, time);
     return atOrAfter == keyframes_.begin() ? time : (atOrAfter - 1)->time;
@@ -198,7 +217,8 @@ ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) cons
     return keyframe ? segmentInterpolater(*keyframe) : defaultInterpolater();
 }
 
-template <typename T> bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
+template <typename T>
+bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
     if (this == &other) return true;
     if (parameterTypeString() != other.parameterTypeString() || numKeyFrames() != other.numKeyFrames())
         return false;

@@ -53,11 +53,17 @@ inline bool similar(const std::list<Rect<float>>& a, const std::list<Rect<float>
            std::equal(a.begin(), a.end(), b.begin(),
                       [](const Rect<float>& x, const Rect<float>& y) { return similar(x, y); });
 }
-template <typename T> bool similar(const T& a, const T& b) { return a == b; }
+template <typename T>
+bool similar(const T& a, const T& b) {
+    return a == b;
+}
 
 /// Exact equality of values; interpolaters are the same when their document
 /// forms are (a Bézier read back is a new instance of the same curve).
-template <typename T> bool same(const T& a, const T& b) { return a == b; }
+template <typename T>
+bool same(const T& a, const T& b) {
+    return a == b;
+}
 template <typename X>
 bool same(const boost::shared_ptr<Interpolater<X>>& a, const boost::shared_ptr<Interpolater<X>>& b) {
     if (!a || !b) return a == b;
@@ -70,10 +76,12 @@ bool similar(const boost::shared_ptr<Interpolater<X>>& a, const boost::shared_pt
 
 } // namespace Similarity
 
-template <typename T> struct ParameterTraits;
+template <typename T>
+struct ParameterTraits;
 
 #define VELA_PARAMETER_TYPE_NAME(Type, Name)                                                                 \
-    template <> struct ParameterTraits<Type> {                                                               \
+    template <>                                                                                              \
+    struct ParameterTraits<Type> {                                                                           \
         static const char* typeName() { return Name; }                                                       \
     }
 
@@ -97,7 +105,8 @@ VELA_PARAMETER_TYPE_NAME(std::vector<double>, "vector");
 #undef VELA_PARAMETER_TYPE_NAME
 
 /// Parameters whose value is itself an interpolater.
-template <typename X> struct ParameterTraits<boost::shared_ptr<Interpolater<X>>> {
+template <typename X>
+struct ParameterTraits<boost::shared_ptr<Interpolater<X>>> {
     static const char* typeName() { return "interpolater"; }
 };
 

@@ -5,7 +5,8 @@
 
 namespace VelaMediaLib {
 
-template <typename T> class Range {
+template <typename T>
+class Range {
 public:
     Range() : first_(), second_() {}
     Range(T first, T second) : first_(first), second_(second) {}
@@ -31,7 +32,8 @@ private:
     T second_;
 };
 
-template <typename T> std::ostream& operator<<(std::ostream& out, const Range<T>& range) {
+template <typename T>
+std::ostream& operator<<(std::ostream& out, const Range<T>& range) {
     return out << "[" << range.first() << ", " << range.second() << "]";
 }
 

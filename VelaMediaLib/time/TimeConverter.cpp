@@ -14,7 +14,8 @@ std::vector<const TimeConverter*> chainOf(const TimeConverter* converter) {
     return chain;
 }
 
-template <typename Step> SafeRational inward(const TimeConverter* converter, SafeRational time, Step step) {
+template <typename Step>
+SafeRational inward(const TimeConverter* converter, SafeRational time, Step step) {
     const std::vector<const TimeConverter*> chain = chainOf(converter);
     for (auto it = chain.rbegin(); it != chain.rend(); ++it) time = step(**it, time);
     return time;

@@ -25,7 +25,8 @@ private:
 };
 
 /// Carries the value that was refused alongside the message.
-template <typename T> class ValueException : public VelaMediaLibException {
+template <typename T>
+class ValueException : public VelaMediaLibException {
 public:
     ValueException(std::string message, T value)
         : VelaMediaLibException(std::move(message)), value_(std::move(value)) {}
@@ -35,10 +36,17 @@ private:
     T value_;
 };
 
-/// A trim that would leave the clip outside its limits; the value is the offset asked for.
+/// A trim that would leave the clip outside its limits: the offset asked for
+/// and the clip's track range (start, duration) at the time.
 class InvalidTrimRangeException : public ValueException<long long> {
 public:
-    using ValueException<long long>::ValueException;
+    InvalidTrimRangeException(std::string message, long long offset,
+                              Range<long long> trackRange = Range<long long>())
+        : ValueException<long long>(std::move(message), offset), trackRange_(trackRange) {}
+    const Range<long long>& trackRange() const { return trackRange_; }
+
+private:
+    Range<long long> trackRange_;
 };
 
 #define VELA_DECLARE_EXCEPTION(Name, Base)                                                                   \
@@ -92,7 +100,8 @@ private:
 };
 
 /// A weak back-reference (parent, project, source) that had expired when it was needed.
-template <typename T> class DanglingWeakPtrException : public VelaMediaLibException {
+template <typename T>
+class DanglingWeakPtrException : public VelaMediaLibException {
 public:
     DanglingWeakPtrException()
         : VelaMediaLibException(std::string("dangling weak pointer to ") + typeid(T).name()) {}

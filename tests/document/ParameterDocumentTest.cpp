@@ -153,7 +153,8 @@ void expectRoundTrip(const boost::shared_ptr<Kind>& parameter, const T& later) {
     EXPECT_TRUE(*copy == *parameter) << written(*parameter, "p");
 }
 
-template <typename T> void roundTrip(const T& first, const T& later) {
+template <typename T>
+void roundTrip(const T& first, const T& later) {
     expectRoundTrip(ParameterImpl<T>::create(project, "p", first), later);
 }
 

@@ -23,7 +23,8 @@ Json::Value parse(const std::string& text) {
     return value;
 }
 
-template <typename T> std::string text(const T& value) {
+template <typename T>
+std::string text(const T& value) {
     std::ostringstream out;
     ValueFormatter<T>::write(out, value);
     return out.str();

@@ -8,7 +8,8 @@ using namespace VelaMediaLib;
 namespace {
 
 // Value between 10 at time 0 and 20 at time 2, at time t.
-template <typename Kind> double tween(double t) {
+template <typename Kind>
+double tween(double t) {
     return Kind::getInstance()->interpolate(10.0, 20.0, RationalTime(0), RationalTime(2), t);
 }
 

@@ -1,0 +1,18 @@
+#pragma once
+
+#include <VelaMediaLib/model/VelaObject.h>
+
+#include <boost/shared_ptr.hpp>
+#include <string>
+
+namespace VelaMediaLib {
+
+/// An effect applied to a clip or a track. Effects are held and ordered by
+/// their owner (an Effectable); the kinds of effect build on this base.
+class Effect : public VelaObject {
+public:
+    virtual std::string effectName() const = 0;
+    virtual boost::shared_ptr<Effect> cloneEffect() const = 0;
+};
+
+} // namespace VelaMediaLib

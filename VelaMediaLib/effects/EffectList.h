@@ -1,0 +1,38 @@
+#pragma once
+
+#include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/time/ThreadSafe.h>
+
+namespace VelaMediaLib {
+
+/// The ordered effects of one owner, guarded by the project lock. Each
+/// change returns whether it changed anything, so the owner knows to notify.
+class EffectList {
+public:
+    typedef Effectable::EffectPtr EffectPtr;
+    typedef Effectable::Effects Effects;
+
+    explicit EffectList(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+
+    void add(const EffectPtr& effect);
+    void insert(const EffectPtr& effect, size_t index);
+    bool remove(const EffectPtr& effect);
+    void swap(size_t first, size_t second);
+    EffectPtr at(size_t index) const;
+    size_t size() const;
+    Effects all() const;
+    Effects withName(const std::string& name) const;
+    Effects::const_iterator begin() const { return effects_.begin(); }
+    Effects::const_iterator end() const { return effects_.end(); }
+    /// Clones of every effect, for a cloned owner.
+    Effects cloned() const;
+    void replaceAll(const Effects& effects);
+
+private:
+    void checkIndex(size_t index, size_t limit) const;
+
+    boost::weak_ptr<const ThreadSafe> token_;
+    Effects effects_;
+};
+
+} // namespace VelaMediaLib

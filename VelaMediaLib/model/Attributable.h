@@ -1,0 +1,65 @@
+#pragma once
+
+#include <VelaMediaLib/time/Attribute.h>
+#include <VelaMediaLib/time/VelaMediaLibException.h>
+
+#include <map>
+#include <memory>
+#include <vector>
+
+namespace VelaMediaLib {
+
+class JSONWriter;
+
+/// Named, typed, observable attributes of a model object ("width", "mixToMono",
+/// a track's "solo"). Each name holds one type; asking for it as another type
+/// answers null, adding it as another type throws TypeException.
+class Attributable {
+public:
+    typedef boost::shared_ptr<AttributeInterface> AttributePtr;
+
+    explicit Attributable(const boost::weak_ptr<const ThreadSafe>& token) : attributesToken_(token) {}
+    virtual ~Attributable() = default;
+
+    template <typename T>
+    boost::shared_ptr<Attribute<T>> attribute(const std::string& name) const {
+        return boost::dynamic_pointer_cast<Attribute<T>>(findAttribute(name));
+    }
+    /// Adds the attribute, or sets the value of the one the name already has.
+    template <typename T>
+    boost::shared_ptr<Attribute<T>> addAttribute(const std::string& name, const T& value) {
+        if (const AttributePtr existing = findAttribute(name)) {
+            const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(existing);
+            if (!typed) throw TypeException("attribute " + name + " holds another type");
+            typed->setValue(value);
+            return typed;
+        }
+        const boost::shared_ptr<Attribute<T>> made(new Attribute<T>(name, value, attributesToken_));
+        insertAttribute(made);
+        return made;
+    }
+    /// The value, or the fallback when the name has no attribute of that type.
+    template <typename T>
+    T attributeValue(const std::string& name, const T& fallback) const {
+        const auto typed = attribute<T>(name);
+        return typed ? typed->value() : fallback;
+    }
+
+    bool hasAttribute(const std::string& name) const { return bool(findAttribute(name)); }
+    std::vector<std::string> attributeNames() const;
+    /// Writes each attribute as a member of the object being written.
+    void writeAttributes(JSONWriter& writer) const;
+
+protected:
+    /// Copies every attribute's value into another object's attributes.
+    void copyAttributesTo(Attributable& other) const;
+
+private:
+    AttributePtr findAttribute(const std::string& name) const;
+    void insertAttribute(const AttributePtr& attribute);
+
+    boost::weak_ptr<const ThreadSafe> attributesToken_;
+    std::unique_ptr<std::map<std::string, AttributePtr>> attributes_;
+};
+
+} // namespace VelaMediaLib

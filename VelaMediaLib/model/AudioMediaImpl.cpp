@@ -1,0 +1,96 @@
+#include <VelaMediaLib/model/AudioMediaImpl.h>
+
+#include <VelaMediaLib/time/InterpolatingParam.h>
+
+namespace VelaMediaLib {
+
+AudioMediaImpl::AudioMediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
+                               const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial,
+                               EditorKind editor)
+    : Media(token), AudioMedia(token), MediaImpl(token, rate, initial, editor) {}
+
+boost::shared_ptr<ParameterInterface> AudioMediaImpl::createDefaultParameter(const std::string& name) const {
+    if (name != "volume") return MediaImpl::createDefaultParameter(name);
+    const auto made = InterpolatingParam<double>::create(parametersToken(), name, 1.0);
+    made->setTimeScalable(this);
+    return made;
+}
+
+boost::shared_ptr<Attribute<double>> AudioMediaImpl::gain() {
+    const auto existing = attribute<double>("gain");
+    return existing ? existing : addAttribute<double>("gain", 1.0);
+}
+
+boost::shared_ptr<Attribute<bool>> AudioMediaImpl::mixToMono() {
+    const auto existing = attribute<bool>("mixToMono");
+    return existing ? existing : addAttribute<bool>("mixToMono", false);
+}
+
+boost::shared_ptr<Attribute<bool>> AudioMediaImpl::shouldApplyLoudnessNormalizationAttribute() {
+    const auto existing = attribute<bool>("loudnessNormalization");
+    return existing ? existing : addAttribute<bool>("loudnessNormalization", false);
+}
+
+boost::shared_ptr<Attribute<long long>> AudioMediaImpl::sourceFileOffset() {
+    const auto existing = attribute<long long>("sourceFileOffset");
+    return existing ? existing : addAttribute<long long>("sourceFileOffset", 0);
+}
+
+boost::shared_ptr<SubTimeline> AudioMediaImpl::parentTrack() const {
+    ScopedReadLock lock(projectMutex());
+    return parentTrack_.lock();
+}
+
+void AudioMediaImpl::setParentTrack(const boost::weak_ptr<SubTimeline>& track) {
+    ScopedWriteLock lock(projectMutex());
+    parentTrack_ = track;
+}
+
+boost::shared_ptr<Media> AudioMediaImpl::parentUnifiedMedia() const {
+    ScopedReadLock lock(projectMutex());
+    return parentUnified_.lock();
+}
+
+void AudioMediaImpl::setParentUnifiedMedia(const boost::weak_ptr<Media>& unified) {
+    ScopedWriteLock lock(projectMutex());
+    parentUnified_ = unified;
+}
+
+// A fade is an edge modification towards silence (in) or from it (out).
+void AudioMediaImpl::addAudioFadeEdgeMods(VelaTime fadeIn, VelaTime fadeOut) {
+    const std::string group = audioFadeEdgeModGroupName();
+    for (const EdgeModificationPtr& modification : leftEdgeModifications())
+        if (modification->group() == group) removeLeftEdgeModification(modification);
+    for (const EdgeModificationPtr& modification : rightEdgeModifications())
+        if (modification->group() == group) removeRightEdgeModification(modification);
+    if (fadeIn > 0) addLeftEdgeModification(EdgeModificationPtr(new EdgeModification(fadeIn, group, 0.0)));
+    if (fadeOut > 0) addRightEdgeModification(EdgeModificationPtr(new EdgeModification(fadeOut, group, 0.0)));
+}
+
+std::vector<CaptionData> AudioMediaImpl::captions() const {
+    ScopedReadLock lock(projectMutex());
+    return captions_;
+}
+
+void AudioMediaImpl::setCaptions(const std::vector<CaptionData>& captions) {
+    {
+        ScopedWriteLock lock(projectMutex());
+        captions_ = captions;
+    }
+    notify();
+}
+
+std::string AudioMediaImpl::transcription() const {
+    ScopedReadLock lock(projectMutex());
+    return transcription_;
+}
+
+void AudioMediaImpl::setTranscription(const std::string& text) {
+    {
+        ScopedWriteLock lock(projectMutex());
+        transcription_ = text;
+    }
+    notify();
+}
+
+} // namespace VelaMediaLib

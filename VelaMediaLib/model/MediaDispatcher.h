@@ -1,0 +1,33 @@
+#pragma once
+
+namespace VelaMediaLib {
+
+class ColorMedia;
+class Media;
+class PlaceholderMedia;
+
+/// A visitor over the concrete clip kinds; each kind's dispatch calls the
+/// operation of its own kind. Kinds a visitor does not handle fall through
+/// to dispatchAnyMedia, which does nothing unless overridden.
+class MediaDispatcher {
+public:
+    virtual ~MediaDispatcher() = default;
+    virtual void dispatchPlaceholderMedia(PlaceholderMedia& media);
+    virtual void dispatchColorMedia(ColorMedia& media);
+
+protected:
+    virtual void dispatchAnyMedia(Media&) {}
+};
+
+/// The same over clips that are only read.
+class ConstMediaDispatcher {
+public:
+    virtual ~ConstMediaDispatcher() = default;
+    virtual void dispatchPlaceholderMedia(const PlaceholderMedia& media);
+    virtual void dispatchColorMedia(const ColorMedia& media);
+
+protected:
+    virtual void dispatchAnyMedia(const Media&) {}
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,163 @@
+#pragma once
+
+#include <VelaMediaLib/effects/EffectList.h>
+#include <VelaMediaLib/model/Media.h>
+#include <VelaMediaLib/model/RationalMediaEditor.h>
+#include <VelaMediaLib/time/Subject.h>
+
+#include <memory>
+
+namespace VelaMediaLib {
+
+/// The state every clip holds and the operations over it. A clip's parametric
+/// time counts ticks from its start on the track: its parameters' keyframes
+/// move with it and are cut, not shifted, when its start is trimmed.
+class MediaImpl : public virtual Media {
+public:
+    enum EditorKind { Temporal, Static };
+
+    MediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
+              const MediaState& initial, EditorKind editor);
+    ~MediaImpl() override;
+
+    // Observation
+    void attach(Observer* observer) override { subject_.attach(observer); }
+    void attachWithoutNotifyDelay(Observer* observer) override { subject_.attachWithoutNotifyDelay(observer); }
+    void detach(Observer* observer) override { subject_.detach(observer); }
+    void notify() override { subject_.notify(); }
+
+    // Name and placement
+    std::string identifier() const override;
+    void setIdentifier(const std::string& identifier) override;
+    VelaTime startTime() const override;
+    VelaTime endTime() const override;
+    VelaTime duration() const override;
+    Range<VelaTime> timeRange() const override { return trackRange(); }
+
+    // Timing
+    boost::weak_ptr<ProjectEditRate> projectEditRate() const override;
+    void setProjectEditRate(const boost::weak_ptr<ProjectEditRate>& rate) override;
+    Range<VelaTime> trackRangeWithMove(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithTrimStart(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithTrimEnd(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithStretch(double factor) const override;
+    Range<double> mediaRange() const override;
+    double minMediaStart() const override { return minRationalMediaStart().asDouble(); }
+    double maxMediaEnd() const override { return maxRationalMediaEnd().asDouble(); }
+    Range<VelaTime> trackRange() const override;
+    double scalar() const override { return state().scalar.asDouble(); }
+    double findScalar(VelaTime duration) const override { return findRationalScalar(duration).asDouble(); }
+    VelaTime trimEndLimit() const override;
+    VelaTime trimStartLimit() const override;
+    bool validTrimStart(VelaTime offset) const override;
+    bool validTrimEnd(VelaTime offset) const override;
+    Range<SafeRational> rationalMediaRange() const override { return state().mediaRange(); }
+    SafeRational minRationalMediaStart() const override { return state().minMediaStart; }
+    SafeRational maxRationalMediaEnd() const override { return state().maxMediaEnd; }
+    Range<VelaTime> trackRangeWithRationalStretch(const SafeRational& factor) const override;
+    SafeRational findRationalScalar(VelaTime duration) const override;
+    MediaState state() const override;
+    MediaState defaultState() const override;
+    void restoreState(const MediaState& saved, VelaTime tolerance) override;
+    void move(VelaTime offset) override;
+    void trimStart(VelaTime offset) override;
+    void trimEnd(VelaTime offset) override;
+    void setTrackStart(VelaTime start) override;
+    double stretch(double factor) override;
+    SafeRational rationalStretch(const SafeRational& factor) override;
+    long long editingUnit() const override;
+    MediaEditor& mediaEditor() override;
+    const RationalMediaEditor& rationalMediaEditor() const override { return *editor_; }
+
+    // Transitions
+    TransitionPtr leftTransition() override;
+    TransitionPtr leftTransition() const override;
+    TransitionPtr rightTransition() override;
+    TransitionPtr rightTransition() const override;
+    void setLeftTransition(const TransitionPtr& transition) override;
+    void setRightTransition(const TransitionPtr& transition) override;
+    Observable& transitionAddRemoveObservable() override { return transitionSubject_; }
+    TransitionPtr transitionAtTime(VelaTime time) const override;
+    TransitionAndNeighbour splitMergeTransitions() const override;
+
+    // Effects
+    void addEffect(const EffectPtr& effect) override;
+    void insertEffect(const EffectPtr& effect, size_t index) override;
+    bool removeEffect(const EffectPtr& effect) override;
+    void swapEffectOrder(size_t first, size_t second) override;
+    EffectPtr effectAtIndex(size_t index) const override { return effects_.at(index); }
+    size_t numEffects() const override { return effects_.size(); }
+    Effects allEffects() const override { return effects_.all(); }
+    Effects::const_iterator effectBegin() const override { return effects_.begin(); }
+    Effects::const_iterator effectEnd() const override { return effects_.end(); }
+    Effects effectsWithName(const std::string& name) override { return effects_.withName(name); }
+    Effects effectsWithName(const std::string& name) const override { return effects_.withName(name); }
+
+    // Edge modifications
+    void addLeftEdgeModification(const EdgeModificationPtr& modification) override;
+    void addRightEdgeModification(const EdgeModificationPtr& modification) override;
+    bool removeLeftEdgeModification(const EdgeModificationPtr& modification) override;
+    bool removeRightEdgeModification(const EdgeModificationPtr& modification) override;
+    EdgeModifications leftEdgeModifications() const override;
+    EdgeModifications rightEdgeModifications() const override;
+    VelaTime leftEdgeModificationLength() const override;
+    VelaTime rightEdgeModificationLength() const override;
+    void setLeftEdgeModificationLength(VelaTime length) override;
+    void setRightEdgeModificationLength(VelaTime length) override;
+    std::set<std::string> edgeModGroupNames() const override;
+
+    // Time conversion: the clip's parametric time counts from its start.
+    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override;
+    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override;
+    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override;
+    const TimeConverter* parentTimeConverter() const override { return timeConverterParent(); }
+    const TimeConverter* timeConverterParent() const override;
+    void setTimeConverterParent(const TimeConverter* parent) override;
+    RationalTime fromGlobalToParametricTime(const RationalTime& time) const override;
+    RationalTime fromParametricToGlobalTime(const RationalTime& time) const override;
+    RationalTime clippingFromGlobalToParametricTime(const RationalTime& time) const override;
+
+    // Parents, parameters, cloning, document
+    boost::weak_ptr<Timeline> parentTimeline() const override;
+    void setParentTimeline(const boost::weak_ptr<Timeline>& timeline) override;
+    void parentVisitor(const ParentVisitor& visitor) const override;
+    void setParent(const boost::weak_ptr<SubTimeline>& parent) override;
+    boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const override;
+    void setupSharedClone(const boost::shared_ptr<Media>& clone) const override;
+    void toJSONTemporalValues(JSONWriter& writer) const override;
+    void toJSON(XMLOptions& options, int indent) const override;
+
+protected:
+    /// Applies what the editor computes from the current state, then notifies.
+    template <typename Compute>
+    void commit(Compute compute) {
+        {
+            ScopedWriteLock lock(projectMutex());
+            state_ = compute(state_);
+        }
+        notify();
+    }
+    /// Gives a clone of this clip everything but its placement on a track:
+    /// name, parameters, attributes, metadata, effects and edge modifications.
+    void copyContentInto(MediaImpl& clone) const;
+    EdgeModifications& edges(bool left) { return left ? leftEdges_ : rightEdges_; }
+    const EdgeModifications& edges(bool left) const { return left ? leftEdges_ : rightEdges_; }
+    void setTransition(TransitionPtr& slot, const TransitionPtr& transition);
+
+private:
+    Subject subject_;
+    Subject transitionSubject_;
+    MediaState state_;
+    TransitionPtr left_, right_;
+    boost::weak_ptr<ProjectEditRate> editRate_;
+    std::unique_ptr<RationalMediaEditor> editor_;
+    std::unique_ptr<MediaEditor> oldEditor_;
+    EffectList effects_;
+    EdgeModifications leftEdges_, rightEdges_;
+    std::string identifier_;
+    boost::weak_ptr<SubTimeline> parent_;
+    boost::weak_ptr<Timeline> timeline_;
+    const TimeConverter* timeConverterParent_ = nullptr;
+};
+
+} // namespace VelaMediaLib

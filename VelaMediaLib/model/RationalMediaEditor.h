@@ -1,0 +1,44 @@
+#pragma once
+
+#include <VelaMediaLib/model/MediaState.h>
+#include <VelaMediaLib/model/VelaObject.h>
+
+namespace VelaMediaLib {
+
+class MediaImpl;
+
+/// The arithmetic of a clip's timing. An editor computes the state a clip
+/// would have after an edit, or throws; the clip takes the new state only
+/// when the editor returned one, so a refused edit changes nothing.
+class RationalMediaEditor : public VelaObject {
+public:
+    explicit RationalMediaEditor(const MediaImpl& clip) : clip_(clip) {}
+
+    virtual MediaState move(const MediaState& state, VelaTime offset) const;
+    /// Throws InvalidTrimRangeException "invalid media start trim offset".
+    virtual MediaState trimStart(const MediaState& state, VelaTime offset) const = 0;
+    virtual bool validTrimStart(const MediaState& state, VelaTime offset) const = 0;
+    /// Throws InvalidTrimRangeException "invalid media trim end offset".
+    virtual MediaState trimEnd(const MediaState& state, VelaTime offset) const = 0;
+    virtual bool validTrimEnd(const MediaState& state, VelaTime offset) const = 0;
+    /// The same for every editor: the scalar times the factor, the duration
+    /// scaled with it to the nearest tick and the start kept. Throws
+    /// ValueException<double> "invalid duration after media stretch (<=0)".
+    MediaState stretch(const MediaState& state, const SafeRational& factor) const;
+    virtual VelaTime trimEndLimit(const MediaState& state) const = 0;
+    virtual VelaTime trimStartLimit(const MediaState& state) const = 0;
+    /// Checks a saved state against its own limits; throws
+    /// ValueException<const SafeRational> naming the first inconsistency.
+    virtual MediaState restoreState(const MediaState& saved, VelaTime tolerance) const;
+
+    /// The shortest track duration the clip's transitions allow: the sum of
+    /// both lengths less one tick, never negative.
+    VelaTime minimumTrackDuration() const;
+    /// x, or b when x lies within 1/10000 of it.
+    static SafeRational snap(const SafeRational& x, const SafeRational& b);
+
+protected:
+    const MediaImpl& clip_;
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,49 @@
+#include <VelaMediaLib/model/RationalStaticEditor.h>
+
+#include <VelaMediaLib/model/MediaImpl.h>
+#include <VelaMediaLib/time/VelaMediaLibException.h>
+
+#include <limits>
+
+namespace VelaMediaLib {
+
+bool RationalStaticEditor::validTrimStart(const MediaState& state, VelaTime offset) const {
+    return state.duration - offset - minimumTrackDuration() > 0;
+}
+
+bool RationalStaticEditor::validTrimEnd(const MediaState& state, VelaTime offset) const {
+    return state.duration - offset - minimumTrackDuration() > 0;
+}
+
+MediaState RationalStaticEditor::trimStart(const MediaState& state, VelaTime offset) const {
+    if (offset == 0) return state;
+    if (!validTrimStart(state, offset))
+        throw InvalidTrimRangeException("invalid media start trim offset", offset, state.trackRange());
+    MediaState next = state;
+    next.start += offset;
+    next.duration -= offset;
+    if (next.hasStartOffset) {
+        const boost::shared_ptr<ProjectEditRate> rate = clip_.projectEditRate().lock();
+        if (!rate) throw DanglingWeakPtrException<ProjectEditRate>("the clip's edit rate has gone");
+        const boost::rational<unsigned long> ticks = rate->editRate();
+        next.startOffset = next.startOffset + RationalTime(SafeRational(offset) /
+                                                           SafeRational((long long)ticks.numerator(),
+                                                                        (long long)ticks.denominator()));
+    }
+    return next;
+}
+
+MediaState RationalStaticEditor::trimEnd(const MediaState& state, VelaTime offset) const {
+    if (offset == 0) return state;
+    if (!validTrimEnd(state, offset))
+        throw InvalidTrimRangeException("invalid media trim end offset", offset, state.trackRange());
+    MediaState next = state;
+    next.duration -= offset;
+    return next;
+}
+
+VelaTime RationalStaticEditor::trimEndLimit(const MediaState&) const { return std::numeric_limits<long long>::min(); }
+
+VelaTime RationalStaticEditor::trimStartLimit(const MediaState&) const { return std::numeric_limits<long long>::min(); }
+
+} // namespace VelaMediaLib

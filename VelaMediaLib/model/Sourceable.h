@@ -1,0 +1,16 @@
+#pragma once
+
+#include <boost/shared_ptr.hpp>
+
+namespace VelaMediaLib {
+
+class Source;
+
+/// Something that plays an imported source; clips without one answer null.
+class Sourceable {
+public:
+    virtual ~Sourceable() = default;
+    virtual boost::shared_ptr<const Source> source() const = 0;
+};
+
+} // namespace VelaMediaLib
