@@ -33,7 +33,8 @@ void makeClips(benchmark::State& state, bool allParameters) {
             if (allParameters)
                 for (const char* name : VisualMediaImpl::kParameterNames) clips.back()->parameter(name);
         }
-        bytesPerClip = double(AllocationCounter::bytes() - before - (long long)(kClips * sizeof(void*) * 2)) / kClips;
+        bytesPerClip =
+            double(AllocationCounter::bytes() - before - (long long)(kClips * sizeof(void*) * 2)) / kClips;
         state.PauseTiming();
         clips.clear();
         state.ResumeTiming();

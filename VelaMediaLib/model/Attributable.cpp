@@ -2,7 +2,6 @@
 
 #include <VelaMediaLib/document/JSONWriter.h>
 
-
 namespace VelaMediaLib {
 
 Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
@@ -34,7 +33,8 @@ void Attributable::copyAttributesTo(Attributable& other) const {
     ScopedReadLock lock(attributesToken_);
     if (!attributes_) return;
     if (!other.attributes_) other.attributes_.reset(new std::map<std::string, AttributePtr>);
-    for (const auto& entry : *attributes_) (*other.attributes_)[entry.first] = entry.second->cloneAttribute(other.attributesToken_);
+    for (const auto& entry : *attributes_)
+        (*other.attributes_)[entry.first] = entry.second->cloneAttribute(other.attributesToken_);
 }
 
 } // namespace VelaMediaLib

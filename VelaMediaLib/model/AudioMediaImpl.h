@@ -14,8 +14,9 @@ public:
     /// The part of the clip that holds the timing state.
     typedef MediaImpl ConcreteMediaImpl;
 
-    AudioMediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
-                   const MediaState& initial, EditorKind editor);
+    AudioMediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
+                   const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial,
+                   EditorKind editor);
 
     boost::shared_ptr<Parameter<double>> volume() const override { return typedParameter<double>("volume"); }
     boost::shared_ptr<Attribute<double>> gain() override;

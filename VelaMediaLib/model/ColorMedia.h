@@ -10,10 +10,10 @@ namespace VelaMediaLib {
 /// extended without limit.
 class ColorMedia : public VisualMediaImpl {
 public:
-    static boost::shared_ptr<ColorMedia> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
-                                                VelaTime duration,
-                                                const TemplatedColor<int>& color = TemplatedColor<int>(0, 0, 0, 255));
+    static boost::shared_ptr<ColorMedia>
+    create(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
+           VelaTime start, VelaTime duration,
+           const TemplatedColor<int>& color = TemplatedColor<int>(0, 0, 0, 255));
 
     TemplatedColor<int> color() const { return attributeValue("color", TemplatedColor<int>()); }
 

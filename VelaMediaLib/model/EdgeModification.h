@@ -17,7 +17,8 @@ public:
 
     EdgeModification(VelaTime duration, std::string group, double value,
                      std::string functionName = fadeToValueFunctionName())
-        : duration_(duration), group_(std::move(group)), functionName_(std::move(functionName)), value_(value) {}
+        : duration_(duration), group_(std::move(group)), functionName_(std::move(functionName)),
+          value_(value) {}
 
     VelaTime duration() const { return duration_; }
     void setDuration(VelaTime duration) { duration_ = duration; }

@@ -48,6 +48,9 @@ public:
     virtual double minMediaStart() const = 0;
     virtual double maxMediaEnd() const = 0;
     virtual Range<VelaTime> trackRange() const = 0;
+    /// The track range without taking the lock, for a container that already
+    /// holds the project's lock (a track answering a query).
+    virtual Range<VelaTime> lockedTrackRange() const = 0;
     virtual double scalar() const = 0;
     /// The scalar at which the clip's media would last the given track duration.
     virtual double findScalar(VelaTime duration) const = 0;
@@ -65,7 +68,8 @@ public:
     virtual MediaState defaultState() const = 0;
     /// Takes a saved state after checking it; tolerance in ticks.
     virtual void restoreState(const MediaState& saved, VelaTime tolerance) = 0;
-    virtual boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const = 0;
+    virtual boost::shared_ptr<ParameterInterface>
+    paramWithFullyQualifiedName(const std::string& name) const = 0;
     virtual TransitionPtr leftTransition() = 0;
     virtual TransitionPtr leftTransition() const = 0;
     virtual TransitionPtr rightTransition() = 0;

@@ -8,7 +8,9 @@ namespace VelaMediaLib {
 
 void MediaDispatcher::dispatchPlaceholderMedia(PlaceholderMedia& media) { dispatchAnyMedia(media); }
 void MediaDispatcher::dispatchColorMedia(ColorMedia& media) { dispatchAnyMedia(media); }
-void ConstMediaDispatcher::dispatchPlaceholderMedia(const PlaceholderMedia& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchPlaceholderMedia(const PlaceholderMedia& media) {
+    dispatchAnyMedia(media);
+}
 void ConstMediaDispatcher::dispatchColorMedia(const ColorMedia& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {

@@ -12,30 +12,22 @@
 
 namespace VelaMediaLib {
 
-MediaImpl::MediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
-                     const MediaState& initial, EditorKind editor)
-    : Media(token), subject_(token), transitionSubject_(token), state_(initial), editRate_(rate),
-      effects_(token) {
-    if (initial.duration <= 0) throw ValueException<long long>("a clip's duration must be greater than 0", initial.duration);
-    if (initial.scalar <= 0) throw ValueException<double>("a clip's scalar must be greater than 0", initial.scalar.asDouble());
-    if (editor == Temporal) editor_.reset(new RationalTemporalEditor(*this));
-    else editor_.reset(new RationalStaticEditor(*this));
+MediaImpl::MediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
+                     const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial,
+                     EditorKind editor)
+    : Media(token), SubTimelineParts<Media>(token), transitionSubject_(token), state_(initial),
+      editRate_(rate) {
+    if (initial.duration <= 0)
+        throw ValueException<long long>("a clip's duration must be greater than 0", initial.duration);
+    if (initial.scalar <= 0)
+        throw ValueException<double>("a clip's scalar must be greater than 0", initial.scalar.asDouble());
+    if (editor == Temporal)
+        editor_.reset(new RationalTemporalEditor(*this));
+    else
+        editor_.reset(new RationalStaticEditor(*this));
 }
 
 MediaImpl::~MediaImpl() = default;
-
-std::string MediaImpl::identifier() const {
-    ScopedReadLock lock(projectMutex());
-    return identifier_;
-}
-
-void MediaImpl::setIdentifier(const std::string& identifier) {
-    {
-        ScopedWriteLock lock(projectMutex());
-        identifier_ = identifier;
-    }
-    notify();
-}
 
 MediaState MediaImpl::state() const {
     ScopedReadLock lock(projectMutex());
@@ -148,8 +140,10 @@ SafeRational MediaImpl::rationalStretch(const SafeRational& factor) {
 MediaEditor& MediaImpl::mediaEditor() {
     ScopedWriteLock lock(projectMutex());
     if (!oldEditor_) {
-        if (dynamic_cast<RationalTemporalEditor*>(editor_.get())) oldEditor_.reset(new TemporalEditor(*this));
-        else oldEditor_.reset(new StaticEditor(*this));
+        if (dynamic_cast<RationalTemporalEditor*>(editor_.get()))
+            oldEditor_.reset(new TemporalEditor(*this));
+        else
+            oldEditor_.reset(new StaticEditor(*this));
     }
     return *oldEditor_;
 }
@@ -202,27 +196,6 @@ TransitionPtr MediaImpl::transitionAtTime(VelaTime time) const {
 Media::TransitionAndNeighbour MediaImpl::splitMergeTransitions() const {
     const TransitionPtr right = rightTransition();
     return TransitionAndNeighbour(right, right ? right->rightMedia() : MediaPtr());
-}
-
-void MediaImpl::addEffect(const EffectPtr& effect) {
-    effects_.add(effect);
-    notify();
-}
-
-void MediaImpl::insertEffect(const EffectPtr& effect, size_t index) {
-    effects_.insert(effect, index);
-    notify();
-}
-
-bool MediaImpl::removeEffect(const EffectPtr& effect) {
-    if (!effects_.remove(effect)) return false;
-    notify();
-    return true;
-}
-
-void MediaImpl::swapEffectOrder(size_t first, size_t second) {
-    effects_.swap(first, second);
-    notify();
 }
 
 const TimeConverter* MediaImpl::timeConverterParent() const {
@@ -298,10 +271,12 @@ void MediaImpl::copyContentInto(MediaImpl& clone) const {
     cloneParametersInto(clone);
     copyAttributesTo(clone);
     for (const auto& entry : metaDataCopy()) clone.addMetaData(entry.first, entry.second);
-    clone.effects_.replaceAll(effects_.cloned());
+    clone.effectList().replaceAll(effectList().cloned());
     ScopedReadLock lock(projectMutex());
-    for (const EdgeModificationPtr& edge : leftEdges_) clone.leftEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
-    for (const EdgeModificationPtr& edge : rightEdges_) clone.rightEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
+    for (const EdgeModificationPtr& edge : leftEdges_)
+        clone.leftEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
+    for (const EdgeModificationPtr& edge : rightEdges_)
+        clone.rightEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
 }
 
 void MediaImpl::setupSharedClone(const boost::shared_ptr<Media>& clone) const {
@@ -344,7 +319,8 @@ namespace {
 
 VelaTime longest(const EdgeModifiable::EdgeModifications& modifications) {
     VelaTime length = 0;
-    for (const EdgeModificationPtr& modification : modifications) length = std::max(length, modification->duration());
+    for (const EdgeModificationPtr& modification : modifications)
+        length = std::max(length, modification->duration());
     return length;
 }
 

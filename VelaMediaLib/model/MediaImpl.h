@@ -1,9 +1,8 @@
 #pragma once
 
-#include <VelaMediaLib/effects/EffectList.h>
 #include <VelaMediaLib/model/Media.h>
 #include <VelaMediaLib/model/RationalMediaEditor.h>
-#include <VelaMediaLib/time/Subject.h>
+#include <VelaMediaLib/model/SubTimelineParts.h>
 
 #include <memory>
 
@@ -12,7 +11,7 @@ namespace VelaMediaLib {
 /// The state every clip holds and the operations over it. A clip's parametric
 /// time counts ticks from its start on the track: its parameters' keyframes
 /// move with it and are cut, not shifted, when its start is trimmed.
-class MediaImpl : public virtual Media {
+class MediaImpl : public SubTimelineParts<Media> {
 public:
     enum EditorKind { Temporal, Static };
 
@@ -20,15 +19,7 @@ public:
               const MediaState& initial, EditorKind editor);
     ~MediaImpl() override;
 
-    // Observation
-    void attach(Observer* observer) override { subject_.attach(observer); }
-    void attachWithoutNotifyDelay(Observer* observer) override { subject_.attachWithoutNotifyDelay(observer); }
-    void detach(Observer* observer) override { subject_.detach(observer); }
-    void notify() override { subject_.notify(); }
-
-    // Name and placement
-    std::string identifier() const override;
-    void setIdentifier(const std::string& identifier) override;
+    // Placement
     VelaTime startTime() const override;
     VelaTime endTime() const override;
     VelaTime duration() const override;
@@ -45,6 +36,7 @@ public:
     double minMediaStart() const override { return minRationalMediaStart().asDouble(); }
     double maxMediaEnd() const override { return maxRationalMediaEnd().asDouble(); }
     Range<VelaTime> trackRange() const override;
+    Range<VelaTime> lockedTrackRange() const override { return state_.trackRange(); }
     double scalar() const override { return state().scalar.asDouble(); }
     double findScalar(VelaTime duration) const override { return findRationalScalar(duration).asDouble(); }
     VelaTime trimEndLimit() const override;
@@ -79,19 +71,6 @@ public:
     Observable& transitionAddRemoveObservable() override { return transitionSubject_; }
     TransitionPtr transitionAtTime(VelaTime time) const override;
     TransitionAndNeighbour splitMergeTransitions() const override;
-
-    // Effects
-    void addEffect(const EffectPtr& effect) override;
-    void insertEffect(const EffectPtr& effect, size_t index) override;
-    bool removeEffect(const EffectPtr& effect) override;
-    void swapEffectOrder(size_t first, size_t second) override;
-    EffectPtr effectAtIndex(size_t index) const override { return effects_.at(index); }
-    size_t numEffects() const override { return effects_.size(); }
-    Effects allEffects() const override { return effects_.all(); }
-    Effects::const_iterator effectBegin() const override { return effects_.begin(); }
-    Effects::const_iterator effectEnd() const override { return effects_.end(); }
-    Effects effectsWithName(const std::string& name) override { return effects_.withName(name); }
-    Effects effectsWithName(const std::string& name) const override { return effects_.withName(name); }
 
     // Edge modifications
     void addLeftEdgeModification(const EdgeModificationPtr& modification) override;
@@ -145,16 +124,13 @@ protected:
     void setTransition(TransitionPtr& slot, const TransitionPtr& transition);
 
 private:
-    Subject subject_;
     Subject transitionSubject_;
     MediaState state_;
     TransitionPtr left_, right_;
     boost::weak_ptr<ProjectEditRate> editRate_;
     std::unique_ptr<RationalMediaEditor> editor_;
     std::unique_ptr<MediaEditor> oldEditor_;
-    EffectList effects_;
     EdgeModifications leftEdges_, rightEdges_;
-    std::string identifier_;
     boost::weak_ptr<SubTimeline> parent_;
     boost::weak_ptr<Timeline> timeline_;
     const TimeConverter* timeConverterParent_ = nullptr;

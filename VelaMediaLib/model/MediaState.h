@@ -39,7 +39,8 @@ struct MediaState {
     bool operator==(const MediaState& o) const {
         return start == o.start && duration == o.duration && mediaStart == o.mediaStart &&
                mediaDuration == o.mediaDuration && scalar == o.scalar && minMediaStart == o.minMediaStart &&
-               maxMediaEnd == o.maxMediaEnd && hasStartOffset == o.hasStartOffset && startOffset == o.startOffset;
+               maxMediaEnd == o.maxMediaEnd && hasStartOffset == o.hasStartOffset &&
+               startOffset == o.startOffset;
     }
     bool operator!=(const MediaState& o) const { return !(*this == o); }
 };

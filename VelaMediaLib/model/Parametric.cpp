@@ -41,7 +41,8 @@ std::vector<std::string> Parametric::parameterNames() const {
     return names;
 }
 
-void Parametric::addParameter(const std::string& name, const boost::shared_ptr<ParameterInterface>& parameter) {
+void Parametric::addParameter(const std::string& name,
+                              const boost::shared_ptr<ParameterInterface>& parameter) {
     if (!parameter) throw AddRemoveException("no parameter to add as " + name);
     ScopedWriteLock lock(parametersToken_);
     if (!parameters_) parameters_.reset(new Map);

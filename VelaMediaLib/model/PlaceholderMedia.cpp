@@ -7,8 +7,8 @@ namespace VelaMediaLib {
 
 boost::shared_ptr<PlaceholderMedia> PlaceholderMedia::create(const boost::weak_ptr<const ThreadSafe>& token,
                                                              const boost::weak_ptr<ProjectEditRate>& rate,
-                                                             VelaTime start, VelaTime duration, int width, int height,
-                                                             const std::string& note) {
+                                                             VelaTime start, VelaTime duration, int width,
+                                                             int height, const std::string& note) {
     const auto media = createFromMediaRange(token, rate, start, SafeRational(0), SafeRational(duration));
     media->addAttribute<int>("width", width);
     media->addAttribute<int>("height", height);
@@ -16,9 +16,11 @@ boost::shared_ptr<PlaceholderMedia> PlaceholderMedia::create(const boost::weak_p
     return media;
 }
 
-boost::shared_ptr<PlaceholderMedia> PlaceholderMedia::createFromMediaRange(
-    const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
-    const SafeRational& mediaStart, const SafeRational& mediaDuration, const SafeRational& scalar) {
+boost::shared_ptr<PlaceholderMedia>
+PlaceholderMedia::createFromMediaRange(const boost::weak_ptr<const ThreadSafe>& token,
+                                       const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
+                                       const SafeRational& mediaStart, const SafeRational& mediaDuration,
+                                       const SafeRational& scalar) {
     MediaState state;
     state.start = start;
     state.duration = RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar));
@@ -31,12 +33,15 @@ boost::shared_ptr<PlaceholderMedia> PlaceholderMedia::createFromMediaRange(
 }
 
 boost::shared_ptr<Media> PlaceholderMedia::clone() const {
-    const boost::shared_ptr<PlaceholderMedia> copy(new PlaceholderMedia(projectMutex(), projectEditRate(), state()));
+    const boost::shared_ptr<PlaceholderMedia> copy(
+        new PlaceholderMedia(projectMutex(), projectEditRate(), state()));
     copyContentInto(*copy);
     return copy;
 }
 
 void PlaceholderMedia::dispatch(MediaDispatcher& dispatcher) { dispatcher.dispatchPlaceholderMedia(*this); }
-void PlaceholderMedia::dispatch(ConstMediaDispatcher& dispatcher) const { dispatcher.dispatchPlaceholderMedia(*this); }
+void PlaceholderMedia::dispatch(ConstMediaDispatcher& dispatcher) const {
+    dispatcher.dispatchPlaceholderMedia(*this);
+}
 
 } // namespace VelaMediaLib

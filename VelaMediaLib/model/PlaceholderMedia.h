@@ -11,15 +11,16 @@ class PlaceholderMedia : public VisualMediaImpl {
 public:
     /// A placeholder on the track from start for duration ticks, at scalar 1.
     static boost::shared_ptr<PlaceholderMedia> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                      const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
-                                                      VelaTime duration, int width = 1920, int height = 1080,
+                                                      const boost::weak_ptr<ProjectEditRate>& rate,
+                                                      VelaTime start, VelaTime duration, int width = 1920,
+                                                      int height = 1080,
                                                       const std::string& note = std::string());
     /// A placeholder playing the media slice at the scalar, from start (as documents hold it).
-    static boost::shared_ptr<PlaceholderMedia> createFromMediaRange(const boost::weak_ptr<const ThreadSafe>& token,
-                                                                    const boost::weak_ptr<ProjectEditRate>& rate,
-                                                                    VelaTime start, const SafeRational& mediaStart,
-                                                                    const SafeRational& mediaDuration,
-                                                                    const SafeRational& scalar = SafeRational(1));
+    static boost::shared_ptr<PlaceholderMedia>
+    createFromMediaRange(const boost::weak_ptr<const ThreadSafe>& token,
+                         const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
+                         const SafeRational& mediaStart, const SafeRational& mediaDuration,
+                         const SafeRational& scalar = SafeRational(1));
 
     int width() const { return attributeValue<int>("width", 0); }
     int height() const { return attributeValue<int>("height", 0); }
@@ -30,8 +31,8 @@ public:
     void dispatch(ConstMediaDispatcher& dispatcher) const override;
 
 private:
-    PlaceholderMedia(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
-                     const MediaState& initial)
+    PlaceholderMedia(const boost::weak_ptr<const ThreadSafe>& token,
+                     const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial)
         : Media(token), VisualMedia(token), VisualMediaImpl(token, rate, initial, Temporal) {}
 };
 

@@ -49,7 +49,8 @@ MediaState RationalMediaEditor::restoreState(const MediaState& saved, VelaTime t
         refuseRestore("restored mediaRange start is greater than maximum", saved.mediaStart);
     if (saved.mediaEnd().asDouble() - saved.maxMediaEnd.asDouble() > 0.001)
         refuseRestore("restored mediaRange end is greater than maximum", saved.mediaEnd());
-    const VelaTime implied = RationalUtil::toVelaTime(RationalUtil::Round(saved.mediaDuration * saved.scalar));
+    const VelaTime implied =
+        RationalUtil::toVelaTime(RationalUtil::Round(saved.mediaDuration * saved.scalar));
     if (std::llabs(implied - saved.duration) > 2 * tolerance)
         refuseRestore("restored scalar is inconsistent with restored ranges", saved.scalar);
     return saved;

@@ -26,9 +26,9 @@ MediaState RationalStaticEditor::trimStart(const MediaState& state, VelaTime off
         const boost::shared_ptr<ProjectEditRate> rate = clip_.projectEditRate().lock();
         if (!rate) throw DanglingWeakPtrException<ProjectEditRate>("the clip's edit rate has gone");
         const boost::rational<unsigned long> ticks = rate->editRate();
-        next.startOffset = next.startOffset + RationalTime(SafeRational(offset) /
-                                                           SafeRational((long long)ticks.numerator(),
-                                                                        (long long)ticks.denominator()));
+        next.startOffset = next.startOffset +
+                           RationalTime(SafeRational(offset) / SafeRational((long long)ticks.numerator(),
+                                                                            (long long)ticks.denominator()));
     }
     return next;
 }
@@ -42,8 +42,12 @@ MediaState RationalStaticEditor::trimEnd(const MediaState& state, VelaTime offse
     return next;
 }
 
-VelaTime RationalStaticEditor::trimEndLimit(const MediaState&) const { return std::numeric_limits<long long>::min(); }
+VelaTime RationalStaticEditor::trimEndLimit(const MediaState&) const {
+    return std::numeric_limits<long long>::min();
+}
 
-VelaTime RationalStaticEditor::trimStartLimit(const MediaState&) const { return std::numeric_limits<long long>::min(); }
+VelaTime RationalStaticEditor::trimStartLimit(const MediaState&) const {
+    return std::numeric_limits<long long>::min();
+}
 
 } // namespace VelaMediaLib

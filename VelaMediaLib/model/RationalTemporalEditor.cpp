@@ -16,7 +16,8 @@ MediaState RationalTemporalEditor::trimmedStart(const MediaState& state, VelaTim
     next.start += offset;
     next.duration -= offset;
     next.mediaDuration = mediaDurationFor(state, next.duration);
-    next.mediaStart = snap(state.mediaStart + (state.mediaDuration - next.mediaDuration), state.minMediaStart);
+    next.mediaStart =
+        snap(state.mediaStart + (state.mediaDuration - next.mediaDuration), state.minMediaStart);
     return next;
 }
 
@@ -24,8 +25,8 @@ MediaState RationalTemporalEditor::trimmedStart(const MediaState& state, VelaTim
 // implies (snapped to 0 and to the full length) must be some and no more than all.
 bool RationalTemporalEditor::leavesEnoughMedia(const MediaState& state, VelaTime offset) const {
     if (state.duration - minimumTrackDuration() - offset < 0) return false;
-    const SafeRational media = snap(snap(SafeRational(state.duration - offset) / state.scalar, SafeRational(0)),
-                                    state.fullMediaLength());
+    const SafeRational media = snap(
+        snap(SafeRational(state.duration - offset) / state.scalar, SafeRational(0)), state.fullMediaLength());
     return media > 0 && media <= state.fullMediaLength();
 }
 
@@ -59,12 +60,14 @@ MediaState RationalTemporalEditor::trimEnd(const MediaState& state, VelaTime off
 
 VelaTime RationalTemporalEditor::trimStartLimit(const MediaState& state) const {
     if (state.minUnbounded()) return std::numeric_limits<long long>::min();
-    return -RationalUtil::toVelaTime(RationalUtil::Floor(state.scalar * (state.mediaStart - state.minMediaStart)));
+    return -RationalUtil::toVelaTime(
+        RationalUtil::Floor(state.scalar * (state.mediaStart - state.minMediaStart)));
 }
 
 VelaTime RationalTemporalEditor::trimEndLimit(const MediaState& state) const {
     if (state.maxUnbounded()) return std::numeric_limits<long long>::min();
-    return -RationalUtil::toVelaTime(RationalUtil::Floor(state.scalar * (state.maxMediaEnd - state.mediaEnd())));
+    return -RationalUtil::toVelaTime(
+        RationalUtil::Floor(state.scalar * (state.maxMediaEnd - state.mediaEnd())));
 }
 
 } // namespace VelaMediaLib

@@ -11,6 +11,7 @@ class Sourceable {
 public:
     virtual ~Sourceable() = default;
     virtual boost::shared_ptr<const Source> source() const = 0;
+    virtual void setSource(const boost::shared_ptr<const Source>& source) = 0;
 };
 
 } // namespace VelaMediaLib

@@ -7,6 +7,7 @@
 #include <boost/shared_ptr.hpp>
 #include <boost/weak_ptr.hpp>
 #include <string>
+#include <utility>
 
 namespace VelaMediaLib {
 
@@ -25,6 +26,12 @@ public:
     boost::shared_ptr<Media> rightMedia() const { return rightMedia_.lock(); }
     void setLeftMedia(const boost::weak_ptr<Media>& media) { leftMedia_ = media; }
     void setRightMedia(const boost::weak_ptr<Media>& media) { rightMedia_ = media; }
+
+    /// Joins the transition that two touching clips share again: when the
+    /// earlier clip has a right transition (or else the later one a left one),
+    /// both clips take it. A pair that does not touch is left alone.
+    static void
+    mergeMediaPairTransitions(const std::pair<boost::shared_ptr<Media>, boost::shared_ptr<Media>>& pair);
 
     boost::shared_ptr<Transition> clone() const {
         return boost::shared_ptr<Transition>(new Transition(name_, duration_));

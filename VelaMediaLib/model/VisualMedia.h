@@ -25,18 +25,21 @@ public:
 
     /// translate * rotate (z, y, x) * shear * scale * translate(-anchor), at parametric time.
     virtual TransformMatrix calcTransformAtTime(const RationalTime& time) const = 0;
-    virtual TransformMatrix calcTransformAtTimeWithScale(const RationalTime& time, const Point3d& scale) const = 0;
+    virtual TransformMatrix calcTransformAtTimeWithScale(const RationalTime& time,
+                                                         const Point3d& scale) const = 0;
     virtual TransformMatrix calcTransformAtTimeWithTranslation(const RationalTime& time,
                                                                const Point3d& translation) const = 0;
     /// The clip's transform placed inside an outer one.
-    virtual TransformMatrix transformedTransformAtTime(const RationalTime& time, const TransformMatrix& outer) const = 0;
+    virtual TransformMatrix transformedTransformAtTime(const RationalTime& time,
+                                                       const TransformMatrix& outer) const = 0;
     /// What the clip's containers do to it at a global time (identity on a track).
     virtual TransformMatrix parentTransformAtGlobalTime(const RationalTime& time) const = 0;
     /// From the clip's media to the project's model space at a global time.
     virtual TransformMatrix mediaToModelTransformAtGlobalTime(const RationalTime& time) const = 0;
     /// The same, then onto a drawing surface through the given model-to-surface transform.
-    virtual TransformMatrix mediaToSurfaceTransformAtGlobalTime(const RationalTime& time,
-                                                                const TransformMatrix& modelToSurface) const = 0;
+    virtual TransformMatrix
+    mediaToSurfaceTransformAtGlobalTime(const RationalTime& time,
+                                        const TransformMatrix& modelToSurface) const = 0;
     /// The scale and rotation that reach the model at a global time.
     virtual std::pair<Point3d, Point3d> mediaToModelScaleAndRotation(const RationalTime& time) const = 0;
     virtual Rect<float> geometryCropRectAtTime(const RationalTime& time) const = 0;

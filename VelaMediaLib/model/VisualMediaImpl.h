@@ -16,8 +16,9 @@ public:
 
     static const char* const kParameterNames[8];
 
-    VisualMediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
-                    const MediaState& initial, EditorKind editor)
+    VisualMediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
+                    const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial,
+                    EditorKind editor)
         : Media(token), VisualMedia(token), MediaImpl(token, rate, initial, editor) {}
 
     boost::shared_ptr<Parameter<Point3d>> translation() const override;
@@ -29,12 +30,16 @@ public:
     boost::shared_ptr<Parameter<Rect<float>>> geometryCropParam() const override;
     boost::shared_ptr<Parameter<Rect<float>>> sourceCropParam() const override;
 
-    TransformMatrix transformAtTime(const RationalTime& time) const override { return calcTransformAtTime(time); }
+    TransformMatrix transformAtTime(const RationalTime& time) const override {
+        return calcTransformAtTime(time);
+    }
     TransformMatrix calcTransformAtTime(const RationalTime& time) const override;
-    TransformMatrix calcTransformAtTimeWithScale(const RationalTime& time, const Point3d& scale) const override;
+    TransformMatrix calcTransformAtTimeWithScale(const RationalTime& time,
+                                                 const Point3d& scale) const override;
     TransformMatrix calcTransformAtTimeWithTranslation(const RationalTime& time,
                                                        const Point3d& translation) const override;
-    TransformMatrix transformedTransformAtTime(const RationalTime& time, const TransformMatrix& outer) const override;
+    TransformMatrix transformedTransformAtTime(const RationalTime& time,
+                                               const TransformMatrix& outer) const override;
     TransformMatrix parentTransformAtGlobalTime(const RationalTime& time) const override;
     TransformMatrix mediaToModelTransformAtGlobalTime(const RationalTime& time) const override;
     TransformMatrix mediaToSurfaceTransformAtGlobalTime(const RationalTime& time,

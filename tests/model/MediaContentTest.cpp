@@ -27,8 +27,10 @@ struct NamedEffect : Effect {
 class MediaContent : public ::testing::Test {
 protected:
     boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    boost::shared_ptr<ProjectEditRate> rate = boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
-    boost::shared_ptr<PlaceholderMedia> media = PlaceholderMedia::create(project, rate, 100, 50, 640, 480, "intro");
+    boost::shared_ptr<ProjectEditRate> rate =
+        boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
+    boost::shared_ptr<PlaceholderMedia> media =
+        PlaceholderMedia::create(project, rate, 100, 50, 640, 480, "intro");
 };
 
 void expectPoint(const Point3d& actual, const Point3d& expected) {
@@ -61,12 +63,15 @@ TEST_F(MediaContent, TransformsComposeTheParametersAtParametricTime) {
     // The clip starts at tick 100: global 105 is parametric 5.
     EXPECT_EQ(media->fromGlobalToParametricTime(RationalTime(105)), RationalTime(5));
     EXPECT_EQ(media->clippingFromGlobalToParametricTime(RationalTime(500)), RationalTime(50));
-    expectPoint(media->mediaToModelTransformAtGlobalTime(RationalTime(105)).apply(Point3d(3, 1, 0)), Point3d(9, 0, 0));
+    expectPoint(media->mediaToModelTransformAtGlobalTime(RationalTime(105)).apply(Point3d(3, 1, 0)),
+                Point3d(9, 0, 0));
     media->rotation()->setDefaultValue(Point3d(0, 0, M_PI / 2));
-    expectPoint(media->calcTransformAtTimeWithScale(RationalTime(0), Point3d(1, 1, 1)).apply(Point3d(2, 1, 0)),
-                Point3d(0, 1, 0)); // (1,0) turned a quarter
-    expectPoint(media->calcTransformAtTimeWithTranslation(RationalTime(0), Point3d(0, 0, 7)).apply(Point3d(1, 1, 0)),
-                Point3d(0, 0, 7));
+    expectPoint(
+        media->calcTransformAtTimeWithScale(RationalTime(0), Point3d(1, 1, 1)).apply(Point3d(2, 1, 0)),
+        Point3d(0, 1, 0)); // (1,0) turned a quarter
+    expectPoint(
+        media->calcTransformAtTimeWithTranslation(RationalTime(0), Point3d(0, 0, 7)).apply(Point3d(1, 1, 0)),
+        Point3d(0, 0, 7));
     const auto scaleAndRotation = media->mediaToModelScaleAndRotation(RationalTime(100));
     EXPECT_EQ(scaleAndRotation.first, Point3d(2, 2, 1));
     media->geometryCropParam()->setDefaultValue(Rect<float>(1, 2, 3, 4));
@@ -189,7 +194,8 @@ TEST(MediaConcurrency, ReadersSeeWholeStatesWhileAWriterTrims) {
         readers.emplace_back([&] {
             while (!done.load()) {
                 const MediaState state = media->state();
-                if (state.start + state.duration != 1000 || state.mediaStart != SafeRational(state.start)) ++torn;
+                if (state.start + state.duration != 1000 || state.mediaStart != SafeRational(state.start))
+                    ++torn;
                 media->validTrimStart(1);
                 media->opacity()->valueAtTime(RationalTime(5));
             }

@@ -27,15 +27,19 @@ public:
 class TestAudioClip : public AudioMediaImpl {
 public:
     TestAudioClip(const boost::weak_ptr<const ThreadSafe>& token, const MediaState& state)
-        : Media(token), AudioMedia(token), AudioMediaImpl(token, boost::weak_ptr<ProjectEditRate>(), state, Temporal) {}
-    boost::shared_ptr<Media> clone() const override { return boost::make_shared<TestAudioClip>(projectMutex(), state()); }
+        : Media(token), AudioMedia(token),
+          AudioMediaImpl(token, boost::weak_ptr<ProjectEditRate>(), state, Temporal) {}
+    boost::shared_ptr<Media> clone() const override {
+        return boost::make_shared<TestAudioClip>(projectMutex(), state());
+    }
     void dispatch(MediaDispatcher&) override {}
     void dispatch(ConstMediaDispatcher&) const override {}
 };
 
 /// start, duration; media start, media duration; scalar; limits.
-inline MediaState timing(VelaTime start, VelaTime duration, SafeRational mediaStart, SafeRational mediaDuration,
-                         SafeRational scalar, SafeRational minStart, SafeRational maxEnd) {
+inline MediaState timing(VelaTime start, VelaTime duration, SafeRational mediaStart,
+                         SafeRational mediaDuration, SafeRational scalar, SafeRational minStart,
+                         SafeRational maxEnd) {
     MediaState state;
     state.start = start;
     state.duration = duration;

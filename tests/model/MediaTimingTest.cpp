@@ -18,12 +18,16 @@ const long long kMin = std::numeric_limits<long long>::min();
 class MediaTiming : public ::testing::Test {
 protected:
     boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    boost::shared_ptr<ProjectEditRate> rate = boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
+    boost::shared_ptr<ProjectEditRate> rate =
+        boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
 
-    boost::shared_ptr<PlaceholderMedia> placeholder(VelaTime start, SafeRational mediaDuration, SafeRational scalar) {
-        return PlaceholderMedia::createFromMediaRange(project, rate, start, SafeRational(0), mediaDuration, scalar);
+    boost::shared_ptr<PlaceholderMedia> placeholder(VelaTime start, SafeRational mediaDuration,
+                                                    SafeRational scalar) {
+        return PlaceholderMedia::createFromMediaRange(project, rate, start, SafeRational(0), mediaDuration,
+                                                      scalar);
     }
-    boost::shared_ptr<TestClip> clip(const MediaState& state, MediaImpl::EditorKind editor = MediaImpl::Temporal) {
+    boost::shared_ptr<TestClip> clip(const MediaState& state,
+                                     MediaImpl::EditorKind editor = MediaImpl::Temporal) {
         return boost::make_shared<TestClip>(project, rate, state, editor);
     }
 };
@@ -53,8 +57,10 @@ TEST_F(MediaTiming, ScalarOneTrimsAndMoves) {
     auto media = PlaceholderMedia::create(project, rate, 100, 100);
     EXPECT_EQ(media->trimStartLimit(), 0);
     EXPECT_EQ(media->trimEndLimit(), 0);
-    expectRefused<InvalidTrimRangeException>(*media, [&] { media->trimEnd(-1); }, "invalid media trim end offset");
-    expectRefused<InvalidTrimRangeException>(*media, [&] { media->trimStart(-1); }, "invalid media start trim offset");
+    expectRefused<InvalidTrimRangeException>(
+        *media, [&] { media->trimEnd(-1); }, "invalid media trim end offset");
+    expectRefused<InvalidTrimRangeException>(
+        *media, [&] { media->trimStart(-1); }, "invalid media start trim offset");
     media->trimStart(10);
     expectTiming(*media, 110, 90, 10, 90);
     EXPECT_EQ(media->trimStartLimit(), -10);
@@ -125,7 +131,8 @@ TEST_F(MediaTiming, UnboundedLimitsExtendWithoutLimit) {
 TEST_F(MediaTiming, TransitionsKeepOneTickLessOnTheTemporalEditor) {
     auto temporal = clip(timing(0, 100, 0, 100, 1, 0, 1000));
     auto fixed = ColorMedia::create(project, rate, 0, 100);
-    for (const boost::shared_ptr<Media>& media : {boost::shared_ptr<Media>(temporal), boost::shared_ptr<Media>(fixed)}) {
+    for (const boost::shared_ptr<Media>& media :
+         {boost::shared_ptr<Media>(temporal), boost::shared_ptr<Media>(fixed)}) {
         media->setLeftTransition(TransitionPtr(new Transition("fade", 20)));
         media->setRightTransition(TransitionPtr(new Transition("fade", 30)));
     }
@@ -133,7 +140,8 @@ TEST_F(MediaTiming, TransitionsKeepOneTickLessOnTheTemporalEditor) {
     EXPECT_FALSE(temporal->validTrimEnd(52));
     EXPECT_TRUE(fixed->validTrimEnd(50));
     EXPECT_FALSE(fixed->validTrimEnd(51));
-    expectRefused<InvalidTrimRangeException>(*fixed, [&] { fixed->trimStart(51); }, "invalid media start trim offset");
+    expectRefused<InvalidTrimRangeException>(
+        *fixed, [&] { fixed->trimStart(51); }, "invalid media start trim offset");
     temporal->trimEnd(51);
     fixed->trimEnd(50);
     EXPECT_EQ(temporal->duration(), 49);
@@ -145,8 +153,9 @@ TEST_F(MediaTiming, TransitionsKeepOneTickLessOnTheTemporalEditor) {
 
 TEST_F(MediaTiming, StretchAndTheOlderEditors) {
     auto media = PlaceholderMedia::create(project, rate, 0, 100);
-    expectRefused<ValueException<double>>(*media, [&] { media->rationalStretch(SafeRational(1, 1000)); },
-                                          "invalid duration after media stretch (<=0)");
+    expectRefused<ValueException<double>>(
+        *media, [&] { media->rationalStretch(SafeRational(1, 1000)); },
+        "invalid duration after media stretch (<=0)");
     EXPECT_EQ(media->trackRangeWithStretch(2.0), Range<VelaTime>(0, 200));
     EXPECT_EQ(media->trackRangeWithTrimStart(10), Range<VelaTime>(10, 90));
     EXPECT_EQ(media->trackRangeWithMove(7), Range<VelaTime>(7, 100));
@@ -154,8 +163,8 @@ TEST_F(MediaTiming, StretchAndTheOlderEditors) {
     EXPECT_DOUBLE_EQ(media->stretch(2.0), 2.0);
     expectTiming(*media, 0, 200, 0, 100);
     EXPECT_DOUBLE_EQ(media->findScalar(50), 0.5);
-    expectRefused<InvalidTrimRangeException>(*media, [&] { media->mediaEditor().trimEnd(-1); },
-                                             "invalid media duration trim offset");
+    expectRefused<InvalidTrimRangeException>(
+        *media, [&] { media->mediaEditor().trimEnd(-1); }, "invalid media duration trim offset");
     media->mediaEditor().trimEnd(100);
     EXPECT_EQ(media->duration(), 100);
     auto colour = ColorMedia::create(project, rate, 0, 10);
@@ -171,20 +180,28 @@ TEST_F(MediaTiming, RestoreChecksEachInconsistency) {
         change(state);
         return state;
     };
-    expectRefused<VelaMediaLibException>(*media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = -1; }), 2); },
-                                         "restored mediaRange start is less than minimum");
-    expectRefused<VelaMediaLibException>(*media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = 1001; }), 2); },
-                                         "restored mediaRange start is greater than maximum");
-    expectRefused<VelaMediaLibException>(*media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = 950; }), 2); },
-                                         "restored mediaRange end is greater than maximum");
-    expectRefused<VelaMediaLibException>(*media, [&] { media->restoreState(with([](MediaState& s) { s.duration = 110; }), 2); },
-                                         "restored scalar is inconsistent with restored ranges");
+    expectRefused<VelaMediaLibException>(
+        *media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = -1; }), 2); },
+        "restored mediaRange start is less than minimum");
+    expectRefused<VelaMediaLibException>(
+        *media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = 1001; }), 2); },
+        "restored mediaRange start is greater than maximum");
+    expectRefused<VelaMediaLibException>(
+        *media, [&] { media->restoreState(with([](MediaState& s) { s.mediaStart = 950; }), 2); },
+        "restored mediaRange end is greater than maximum");
+    expectRefused<VelaMediaLibException>(
+        *media, [&] { media->restoreState(with([](MediaState& s) { s.duration = 110; }), 2); },
+        "restored scalar is inconsistent with restored ranges");
     try {
         media->restoreState(with([](MediaState& s) { s.mediaStart = -3; }), 2);
     } catch (const ValueException<const SafeRational>& e) {
         EXPECT_EQ(e.value(), SafeRational(-3));
     }
-    media->restoreState(with([](MediaState& s) { s.duration = 104; s.start = 7; }), 2);
+    media->restoreState(with([](MediaState& s) {
+                            s.duration = 104;
+                            s.start = 7;
+                        }),
+                        2);
     EXPECT_EQ(media->trackRange(), Range<VelaTime>(7, 104));
 }
 

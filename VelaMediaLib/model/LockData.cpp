@@ -1,0 +1,57 @@
+#include <VelaMediaLib/model/LockData.h>
+
+namespace VelaMediaLib {
+
+TrackPtr LockData::trackOf(const Media& media) {
+    TrackPtr track;
+    media.parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
+        track = boost::dynamic_pointer_cast<Track>(parent);
+    });
+    return track;
+}
+
+bool LockData::IsMediaLocked(const Media& media) {
+    const TrackPtr track = trackOf(media);
+    return track && track->isLocked();
+}
+
+bool LockData::IsMediaHidden(const Media& media) {
+    const TrackPtr track = trackOf(media);
+    return track && IsTrackHidden(*track);
+}
+
+bool LockData::IsMediaInvisible(const Media& media) {
+    const TrackPtr track = trackOf(media);
+    return track && IsTrackInvisible(*track);
+}
+
+bool LockData::IsTransitionLocked(const Transition& transition) {
+    for (const MediaPtr& media : {transition.leftMedia(), transition.rightMedia()})
+        if (media && IsMediaLocked(*media)) return true;
+    return false;
+}
+
+bool LockData::IsTransitionHidden(const Transition& transition) {
+    for (const MediaPtr& media : {transition.leftMedia(), transition.rightMedia()})
+        if (media && IsMediaHidden(*media)) return true;
+    return false;
+}
+
+std::vector<TrackPtr> LockData::GetAllEditableTracks(const Timeline& timeline) {
+    std::vector<TrackPtr> editable;
+    for (const std::string& name : timeline.mixerNames())
+        for (const TrackPtr& track : timeline.mixer(name)->tracks())
+            if (IsTrackEditable(*track)) editable.push_back(track);
+    return editable;
+}
+
+void LockData::Attach(Track& track, Observer* observer) {
+    if (!track.metaDataAttribute(Track::isLockedMetaDataKey())) track.setIsLocked(false);
+    track.metaDataAttribute(Track::isLockedMetaDataKey())->attach(observer);
+}
+
+void LockData::Detach(Track& track, Observer* observer) {
+    if (const auto attribute = track.metaDataAttribute(Track::isLockedMetaDataKey())) attribute->detach(observer);
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,291 @@
+#include "MediaTestSupport.h"
+
+#include <VelaMediaLib/model/ColorMedia.h>
+#include <VelaMediaLib/model/LockData.h>
+#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/model/Timeline.h>
+
+#include <gtest/gtest.h>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+class TrackTest : public ::testing::Test {
+protected:
+    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    boost::shared_ptr<ProjectEditRate> rate =
+        boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
+    boost::shared_ptr<GenericTrack> track = GenericTrack::create(project);
+
+    MediaPtr clip(VelaTime duration) { return PlaceholderMedia::create(project, rate, 0, duration); }
+    MediaPtr placed(VelaTime start, VelaTime duration) {
+        const MediaPtr media = clip(duration);
+        track->addMedia(media, start);
+        return media;
+    }
+};
+
+template <typename Edit>
+void expectCollision(const MediaPtr& media, Edit edit) {
+    const MediaState before = media->state();
+    EXPECT_THROW(edit(), CollisionException);
+    EXPECT_TRUE(media->state() == before);
+}
+
+} // namespace
+
+TEST_F(TrackTest, TouchingClipsFitOverlappingOnesCollide) {
+    const MediaPtr first = placed(0, 10);
+    const MediaPtr second = clip(10);
+    try {
+        track->addMedia(second, 9);
+        FAIL();
+    } catch (const CollisionException& e) {
+        EXPECT_STREQ(e.what(), "Collision exception.");
+        EXPECT_EQ(e.range(), Range<long long>(9, 10));
+        EXPECT_EQ(e.clip(), second);
+        EXPECT_EQ(e.start(), 9);
+    }
+    EXPECT_EQ(track->numMedias(), 1u);
+    track->addMedia(second, 10);
+    EXPECT_EQ(track->medias(), (std::vector<MediaPtr>{first, second}));
+    EXPECT_EQ(second->startTime(), 10);
+    EXPECT_THROW(track->addMedia(second, 50), AddRemoveException);
+    EXPECT_THROW(track->addMedia(clip(30), -5), CollisionException); // covers both
+    EXPECT_TRUE(track->intersectionAtRange(Range<VelaTime>(19, 1)));
+    EXPECT_FALSE(track->intersectionAtRange(Range<VelaTime>(20, 5)));
+    EXPECT_EQ(track->endTime(), 20);
+}
+
+TEST_F(TrackTest, MediaAtTimeGivesTheClipOrBothTouchingClips) {
+    const MediaPtr first = placed(0, 10), second = placed(10, 10), third = placed(30, 5);
+    EXPECT_EQ(track->mediaAtTime(10), Track::Pair(first, second));
+    EXPECT_EQ(track->mediaAtTime(5), Track::Pair(first, MediaPtr()));
+    EXPECT_EQ(track->mediaAtTime(25), Track::Pair());
+    EXPECT_EQ(track->mediaAtTime(20), Track::Pair()); // the end of a clip is not in it
+    EXPECT_EQ(track->mediaAtTime(30), Track::Pair(third, MediaPtr()));
+    EXPECT_EQ(track->mediaAtTime(-1), Track::Pair());
+    EXPECT_EQ(Track::getLeftOfMedia(third), second);
+    EXPECT_EQ(Track::getTouchingMediaToLeftOfMedia(third), MediaPtr());
+    EXPECT_EQ(Track::getTouchingMediaToRightOfMedia(first), second);
+    EXPECT_EQ(Track::getRightOfMedia(third), MediaPtr());
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(5, 30), second), (std::vector<MediaPtr>{first, third}));
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::vector<MediaPtr>{first, third}),
+              std::vector<MediaPtr>{second});
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::set<MediaPtr>{second}).size(), 2u);
+    const auto parts = track->subSection(Range<VelaTime>(5, 27));
+    ASSERT_EQ(parts.size(), 3u);
+    EXPECT_EQ(parts[0].range, Range<VelaTime>(5, 5));
+    EXPECT_EQ(parts[2].range, Range<VelaTime>(30, 2));
+}
+
+TEST_F(TrackTest, EditsThatWouldCollideChangeNothing) {
+    const MediaPtr left = placed(0, 10);
+    const MediaPtr middle = PlaceholderMedia::createFromMediaRange(project, rate, 0, 0, 40);
+    track->addMedia(middle, 10);
+    middle->trimStart(5);
+    middle->trimEnd(5); // [15, 45) of media [5, 35) within [0, 40)
+    track->trimStart(middle, -5);
+    track->trimEnd(middle, -5);
+    const MediaPtr right = placed(50, 10);
+    expectCollision(middle, [&] { track->move(middle, -1); });
+    expectCollision(middle, [&] { track->trimStart(middle, -1); });
+    expectCollision(middle, [&] { track->trimEnd(middle, -1); });
+    expectCollision(middle, [&] { track->stretch(middle, SafeRational(2)); });
+    MediaState elsewhere = middle->state();
+    elsewhere.start = 45;
+    expectCollision(middle, [&] { track->restoreMediaState(middle, elsewhere, 0); });
+    EXPECT_EQ(track->mediaAtTime(10), Track::Pair(left, middle));
+
+    track->trimEnd(middle, 10);
+    track->move(middle, 5); // now [15, 45)
+    EXPECT_EQ(track->mediaMap().count(15), 1u); // keyed by the new start
+    EXPECT_EQ(track->mediaAtTime(16).first, middle);
+    track->removeMedia(right);
+    EXPECT_DOUBLE_EQ(track->stretch(middle, 2.0), 2.0);
+    EXPECT_EQ(middle->trackRange(), Range<VelaTime>(15, 60));
+    EXPECT_THROW(track->move(clip(5), 1), AddRemoveException);
+}
+
+TEST_F(TrackTest, SoloDecidesOverMuteAndHide) {
+    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
+    const auto mixer = timeline->newMixer("main");
+    std::vector<TrackPtr> tracks;
+    for (int i = 0; i < 3; ++i) {
+        tracks.push_back(timeline->newTrack());
+        timeline->addTrack(mixer, tracks.back());
+    }
+    tracks[0]->audioMutedAttribute()->setValue(true);
+    tracks[1]->videoHiddenAttribute()->setValue(true);
+    EXPECT_FALSE(tracks[0]->isAudible());
+    EXPECT_TRUE(tracks[0]->isVisible());
+    EXPECT_FALSE(tracks[1]->isVisible());
+    EXPECT_TRUE(tracks[2]->isRenderable());
+    tracks[0]->soloAttribute()->setValue(true);
+    EXPECT_TRUE(mixer->isInSoloMode());
+    EXPECT_TRUE(tracks[0]->isAudible()); // solo overrides its mute
+    EXPECT_TRUE(tracks[0]->isVisible());
+    EXPECT_FALSE(tracks[2]->isAudible());
+    EXPECT_FALSE(tracks[2]->isVisible());
+    EXPECT_FALSE(tracks[2]->isRenderable());
+    EXPECT_TRUE(tracks[2]->isDisabled());
+    EXPECT_TRUE(LockData::IsTrackInvisible(*tracks[1]));
+}
+
+TEST_F(TrackTest, MixerIndexRulesAndPuttingATrackBack) {
+    const auto mixer = GenericMixer::create(project);
+    const TrackPtr a = GenericTrack::create(project), b = GenericTrack::create(project), c = GenericTrack::create(project);
+    mixer->addTrack(a, -1);
+    mixer->addTrack(b, 1); // the number of tracks appends
+    for (const int bad : {-2, 3}) {
+        try {
+            mixer->addTrack(c, bad);
+            FAIL() << bad;
+        } catch (const ValueException<int>& e) {
+            EXPECT_STREQ(e.what(), "invalid index");
+            EXPECT_EQ(e.value(), bad);
+        }
+    }
+    mixer->addTrack(c, 0);
+    EXPECT_EQ(mixer->tracks(), (std::vector<TrackPtr>{c, a, b}));
+    EXPECT_TRUE(Mixer::sortTracksByIndex(c, b));
+    const RemoveTrackInfo info = mixer->removeTrackImpl(a);
+    EXPECT_EQ(info.index, 1);
+    EXPECT_FALSE(a->parentMixer());
+    EXPECT_EQ(mixer->tracks(), (std::vector<TrackPtr>{c, b}));
+    mixer->putBack(info);
+    EXPECT_EQ(mixer->tracks(), (std::vector<TrackPtr>{c, a, b}));
+    EXPECT_EQ(a->parentMixer(), mixer);
+    EXPECT_THROW(mixer->trackAtIndex(3), IndexException);
+    EXPECT_FALSE(mixer->removeTrack(GenericTrack::create(project)));
+}
+
+TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
+    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
+    EXPECT_FALSE(timeline->mixer());
+    const auto second = timeline->newMixer("b"), first = timeline->newMixer("a");
+    EXPECT_EQ(timeline->mixer(), first);
+    EXPECT_EQ(timeline->mixerNames(), (std::vector<std::string>{"a", "b"}));
+    struct Recorder : TimelineAddObserver {
+        std::vector<std::string> events;
+        void onTimelineAddTrack(Timeline&, Mixer&, const TrackPtr&) override { events.push_back("track+"); }
+        void onTimelineRemoveTrack(Timeline&, Mixer&, const TrackPtr&) override { events.push_back("track-"); }
+        void onTimelineAddMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip+"); }
+        void onTimelineRemoveMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip-"); }
+    } recorder;
+    timeline->attachAddObserver(&recorder);
+    const auto upper = timeline->newTrack(), lower = timeline->newTrack();
+    timeline->addTrack(first, upper);
+    timeline->addTrack(second, lower);
+    const MediaPtr a = clip(10), b = clip(10);
+    upper->addMedia(a, 0);
+    lower->addMedia(b, 5);
+    EXPECT_EQ(a->parentTimeline().lock(), timeline);
+    EXPECT_EQ(timeline->allMediasAtTime(7), (std::vector<MediaPtr>{a, b}));
+    EXPECT_EQ(timeline->endTime(), 15);
+    EXPECT_EQ(timeline->numTracks(), 2u);
+    EXPECT_EQ(timeline->instancesOf<PlaceholderMedia>().size(), 2u);
+    EXPECT_FALSE(timeline->hasInstanceOf<ColorMedia>());
+    upper->removeMedia(a);
+    try {
+        timeline->removeTrack(first, lower);
+        FAIL();
+    } catch (const VelaMediaLibException& e) {
+        EXPECT_STREQ(e.what(), "track doesn't belong to project");
+    }
+    const RemoveTrackInfo info = timeline->removeTrack(second, lower);
+    EXPECT_EQ(info.track, lower);
+    EXPECT_EQ(recorder.events, (std::vector<std::string>{"track+", "track+", "clip+", "clip+", "clip-", "track-"}));
+    try {
+        timeline->removeMixer(GenericMixer::create(project));
+        FAIL();
+    } catch (const VelaMediaLibException& e) {
+        EXPECT_STREQ(e.what(), "unable to find mixer");
+    }
+    timeline->removeMixer(second);
+    EXPECT_EQ(timeline->mixerNames(), std::vector<std::string>{"a"});
+    timeline->detachAddObserver(&recorder);
+}
+
+TEST_F(TrackTest, AMixerBelongsToATimelineOrAGroupNeverBoth) {
+    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
+    const auto owned = timeline->newMixer("main");
+    const MediaPtr group = clip(10);
+    try {
+        owned->setParentGroup(group);
+        FAIL();
+    } catch (const VelaMediaLibException& e) {
+        EXPECT_STREQ(e.what(), "Cannot set parent group on a mixer that has a parent timeline");
+    }
+    const auto grouped = GenericMixer::create(project);
+    grouped->setParentGroup(group);
+    try {
+        timeline->addMixer("other", grouped);
+        FAIL();
+    } catch (const VelaMediaLibException& e) {
+        EXPECT_STREQ(e.what(), "Cannot set parent timeline on a mixer that has a parent group");
+    }
+    EXPECT_EQ(timeline->mixerNames(), std::vector<std::string>{"main"});
+}
+
+TEST_F(TrackTest, CopiesAndLocks) {
+    const MediaPtr first = placed(0, 10), second = placed(10, 10);
+    track->setIsLocked(true);
+    track->magneticAttribute()->setValue(true);
+    std::map<MediaPtr, MediaPtr> copied;
+    const TrackPtr portion = track->copyPortion(Range<VelaTime>(5, 10), &copied);
+    ASSERT_EQ(portion->numMedias(), 2u);
+    EXPECT_EQ(copied[first]->trackRange(), Range<VelaTime>(0, 5));
+    EXPECT_EQ(copied[second]->trackRange(), Range<VelaTime>(5, 5));
+    EXPECT_EQ(copied[second]->rationalMediaRange().start(), SafeRational(0));
+    EXPECT_TRUE(portion->isLocked());
+    EXPECT_TRUE(portion->attributeValue("magnetic", false));
+    EXPECT_EQ(first->duration(), 10);
+    EXPECT_TRUE(LockData::IsMediaLocked(*first));
+    EXPECT_FALSE(LockData::IsMediaEditable(*second));
+    EXPECT_FALSE(LockData::IsMediaLocked(*clip(3)));
+    bool stoppedEarly = track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; });
+    EXPECT_TRUE(stoppedEarly);
+}
+
+TEST_F(TrackTest, TransitionsAreJoinedAgainWhenTouchingClipsMeet) {
+    const MediaPtr first = placed(0, 10);
+    const TransitionPtr shared(new Transition("dissolve", 4));
+    first->setRightTransition(shared);
+    const MediaPtr second = placed(10, 10);
+    EXPECT_EQ(second->leftTransition(), shared);
+    EXPECT_EQ(shared->leftMedia(), first);
+    EXPECT_EQ(shared->rightMedia(), second);
+    EXPECT_EQ(track->transitions().size(), 1u);
+    const Track::TransitionAndNeighbour separated = track->move(first, -5);
+    EXPECT_EQ(separated.first, shared);
+    EXPECT_EQ(separated.second, second);
+}
+
+TEST(TimelineCamera, RightAndLeftHandedTransforms) {
+    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    const auto timeline = Timeline::create(project, 1920, 1080);
+    timeline->eyePositionParam()->setDefaultValue(Point3d(0, 0, 10));
+    const Point3d origin = timeline->cameraTransformAtTime(RationalTime(0)).apply(Point3d(0, 0, 0));
+    EXPECT_NEAR(origin.z, -10.0, 1e-12);
+    const Point3d originLH = timeline->cameraTransformAtTimeLH(RationalTime(0)).apply(Point3d(0, 0, 0));
+    EXPECT_NEAR(originLH.z, 10.0, 1e-12);
+    EXPECT_NEAR(timeline->cameraTransformAtTime(RationalTime(0)).apply(Point3d(1, 0, 0)).x, 1.0, 1e-12);
+    EXPECT_NEAR(timeline->cameraTransformAtTimeLH(RationalTime(0)).apply(Point3d(1, 0, 0)).x, -1.0, 1e-12);
+    // The default camera shows the canvas exactly: its corners land on the screen's corners.
+    timeline->eyePositionParam()->setDefaultValue(Point3d(0, 0, 540.0 / std::tan(M_PI / 8)));
+    const TransformMatrix screen = timeline->calcScreenTransformAtTime(RationalTime(0));
+    auto project2d = [&](const Point3d& p) {
+        const TransformMatrix& m = screen;
+        const double w = m.at(3, 0) * p.x + m.at(3, 1) * p.y + m.at(3, 2) * p.z + m.at(3, 3);
+        const Point3d q = m.apply(p);
+        return Point3d(q.x / w, q.y / w, 0);
+    };
+    const Point3d topLeft = project2d(Point3d(-960, 540, 0));
+    EXPECT_NEAR(topLeft.x, 0.0, 1e-6);
+    EXPECT_NEAR(topLeft.y, 0.0, 1e-6);
+    const Point3d bottomRight = project2d(Point3d(960, -540, 0));
+    EXPECT_NEAR(bottomRight.x, 1920.0, 1e-6);
+    EXPECT_NEAR(bottomRight.y, 1080.0, 1e-6);
+}
