@@ -6,7 +6,7 @@ ifneq ($(CI),)
 CMAKE_FLAGS += -DVELA_WERROR=ON
 endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
-SOURCES = $(shell git ls-files '*.h' '*.cpp' 2>/dev/null)
+SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
 .PHONY: deps demo test bench sanitize tsan format format-check install-check
 

@@ -36,7 +36,8 @@ void BM_MediaAtTime_StdMapBaseline(benchmark::State& state) {
     size_t i = 0;
     for (auto _ : state) {
         const auto at = starts.upper_bound(ticks[i++ % ticks.size()]);
-        const boost::shared_ptr<int> found = at == starts.begin() ? boost::shared_ptr<int>() : std::prev(at)->second;
+        const boost::shared_ptr<int> found =
+            at == starts.begin() ? boost::shared_ptr<int>() : std::prev(at)->second;
         benchmark::DoNotOptimize(found); // the clip is handed out as a shared pointer, as the track does
     }
 }
@@ -57,7 +58,8 @@ void BM_PlaceClipsEndToEnd(benchmark::State& state) {
     for (auto _ : state) {
         state.PauseTiming();
         std::vector<MediaPtr> made;
-        for (int i = 0; i < clips; ++i) made.push_back(PlaceholderMedia::create(project.token, project.rate, 0, 30));
+        for (int i = 0; i < clips; ++i)
+            made.push_back(PlaceholderMedia::create(project.token, project.rate, 0, 30));
         const auto track = GenericTrack::create(project.token);
         state.ResumeTiming();
         for (int i = 0; i < clips; ++i) track->addMedia(made[size_t(i)], i * 30LL);
@@ -76,7 +78,8 @@ void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
         const auto track = timeline->newTrack();
         timeline->addTrack(mixer, track);
         for (int i = 0; i < 5000; ++i)
-            track->addMedia(PlaceholderMedia::create(project.token, project.rate, 0, kClipLength), i * kStep + t);
+            track->addMedia(PlaceholderMedia::create(project.token, project.rate, 0, kClipLength),
+                            i * kStep + t);
     }
     const std::vector<VelaTime> ticks = randomTicks(5000 * kStep);
     size_t i = 0;

@@ -17,7 +17,8 @@ public:
     MixerPtr cloneEmpty() const override;
 
 private:
-    explicit GenericMixer(const boost::weak_ptr<const ThreadSafe>& token) : SubTimeline(token), Mixer(token) {}
+    explicit GenericMixer(const boost::weak_ptr<const ThreadSafe>& token)
+        : SubTimeline(token), Mixer(token) {}
 };
 
 } // namespace VelaMediaLib

@@ -15,7 +15,8 @@ public:
     boost::shared_ptr<Track> cloneEmpty() const override;
 
 private:
-    explicit GenericTrack(const boost::weak_ptr<const ThreadSafe>& token) : SubTimeline(token), Track(token) {}
+    explicit GenericTrack(const boost::weak_ptr<const ThreadSafe>& token)
+        : SubTimeline(token), Track(token) {}
 };
 
 } // namespace VelaMediaLib

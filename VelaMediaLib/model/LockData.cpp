@@ -51,7 +51,8 @@ void LockData::Attach(Track& track, Observer* observer) {
 }
 
 void LockData::Detach(Track& track, Observer* observer) {
-    if (const auto attribute = track.metaDataAttribute(Track::isLockedMetaDataKey())) attribute->detach(observer);
+    if (const auto attribute = track.metaDataAttribute(Track::isLockedMetaDataKey()))
+        attribute->detach(observer);
 }
 
 } // namespace VelaMediaLib

@@ -57,7 +57,8 @@ void Mixer::removeTracks(const Tracks& tracks) {
 
 TrackPtr Mixer::trackAtIndex(unsigned index) const {
     ScopedReadLock lock(projectMutex());
-    if (index >= tracks_.size()) throw IndexException("track index " + std::to_string(index) + " out of range");
+    if (index >= tracks_.size())
+        throw IndexException("track index " + std::to_string(index) + " out of range");
     return tracks_[index];
 }
 
@@ -95,12 +96,14 @@ std::vector<MediaPtr> Mixer::allMedias() const {
 
 bool Mixer::hasAudio() const {
     const std::vector<MediaPtr> clips = allMedias();
-    return std::any_of(clips.begin(), clips.end(), [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<AudioMedia>(m)); });
+    return std::any_of(clips.begin(), clips.end(),
+                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<AudioMedia>(m)); });
 }
 
 bool Mixer::hasVisual() const {
     const std::vector<MediaPtr> clips = allMedias();
-    return std::any_of(clips.begin(), clips.end(), [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<VisualMedia>(m)); });
+    return std::any_of(clips.begin(), clips.end(),
+                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<VisualMedia>(m)); });
 }
 
 VelaTime Mixer::startTime() const {
@@ -130,7 +133,8 @@ VelaTime Mixer::endTimeNotIncludingHiddenAndMutedTracks() const {
 
 bool Mixer::isInSoloMode() const {
     const Tracks all = tracks();
-    return std::any_of(all.begin(), all.end(), [](const TrackPtr& t) { return t->attributeValue("solo", false); });
+    return std::any_of(all.begin(), all.end(),
+                       [](const TrackPtr& t) { return t->attributeValue("solo", false); });
 }
 
 boost::shared_ptr<Timeline> Mixer::parentTimeline() const {
@@ -165,7 +169,8 @@ void Mixer::attachAddObserver(MixerAddObserver* observer) {
 
 void Mixer::detachAddObserver(MixerAddObserver* observer) {
     ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer), addObservers_.end());
+    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
+                        addObservers_.end());
 }
 
 void Mixer::onTrackAddMedia(Track& track, const MediaPtr& media) {
@@ -178,7 +183,8 @@ void Mixer::onTrackRemoveMedia(Track& track, const MediaPtr& media) {
 
 MixerPtr Mixer::copyPortion(const Range<VelaTime>& range, std::map<MediaPtr, MediaPtr>* copied) const {
     const MixerPtr portion = cloneEmpty();
-    for (const TrackPtr& track : tracks()) portion->addTrackSansTypeCheck(track->copyPortion(range, copied), -1);
+    for (const TrackPtr& track : tracks())
+        portion->addTrackSansTypeCheck(track->copyPortion(range, copied), -1);
     return portion;
 }
 

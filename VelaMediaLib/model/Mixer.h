@@ -19,7 +19,8 @@ class Mixer : public SubTimelineParts<SubTimeline>,
 public:
     typedef std::vector<TrackPtr> Tracks;
 
-    explicit Mixer(const boost::weak_ptr<const ThreadSafe>& token) : SubTimeline(token), SubTimelineParts(token) {}
+    explicit Mixer(const boost::weak_ptr<const ThreadSafe>& token)
+        : SubTimeline(token), SubTimelineParts(token) {}
     ~Mixer() override;
 
     // Tracks
@@ -66,12 +67,19 @@ public:
     void onTrackRemoveMedia(Track& track, const MediaPtr& media) override;
 
     /// Copies of the tracks cut to the range (see Track::copyPortion), in order.
-    boost::shared_ptr<Mixer> copyPortion(const Range<VelaTime>& range, std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
+    boost::shared_ptr<Mixer> copyPortion(const Range<VelaTime>& range,
+                                         std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
     virtual boost::shared_ptr<Mixer> cloneEmpty() const = 0;
 
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override { return time; }
+    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
+        return time;
+    }
     /// The group holding the mixer, if any: a timeline's mixer has no further parent.
     const TimeConverter* parentTimeConverter() const override { return parentGroup().get(); }
 

@@ -20,7 +20,9 @@ public:
         : Interface(token), subject_(token), effects_(token) {}
 
     void attach(Observer* observer) override { subject_.attach(observer); }
-    void attachWithoutNotifyDelay(Observer* observer) override { subject_.attachWithoutNotifyDelay(observer); }
+    void attachWithoutNotifyDelay(Observer* observer) override {
+        subject_.attachWithoutNotifyDelay(observer);
+    }
     void detach(Observer* observer) override { subject_.detach(observer); }
     void notify() override { subject_.notify(); }
 

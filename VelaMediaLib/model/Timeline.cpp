@@ -24,8 +24,8 @@ Point3d normalized(const Point3d& v) {
 
 // Rows x, y, z of a view matrix with the eye moved to the origin.
 TransformMatrix view(const Point3d& x, const Point3d& y, const Point3d& z, const Point3d& eye) {
-    return TransformMatrix({x.x, x.y, x.z, -dot(x, eye), y.x, y.y, y.z, -dot(y, eye), z.x, z.y, z.z, -dot(z, eye),
-                            0, 0, 0, 1});
+    return TransformMatrix(
+        {x.x, x.y, x.z, -dot(x, eye), y.x, y.y, y.z, -dot(y, eye), z.x, z.y, z.z, -dot(z, eye), 0, 0, 0, 1});
 }
 
 } // namespace
@@ -37,7 +37,8 @@ Timeline::~Timeline() {
     for (const auto& entry : mixers_) entry.second->detachAddObserver(this);
 }
 
-boost::shared_ptr<Timeline> Timeline::create(const boost::weak_ptr<const ThreadSafe>& token, int width, int height) {
+boost::shared_ptr<Timeline> Timeline::create(const boost::weak_ptr<const ThreadSafe>& token, int width,
+                                             int height) {
     const boost::shared_ptr<Timeline> timeline(new Timeline(token));
     timeline->addAttribute<int>("width", width);
     timeline->addAttribute<int>("height", height);
@@ -48,7 +49,8 @@ boost::shared_ptr<Timeline> Timeline::create(const boost::weak_ptr<const ThreadS
 }
 
 std::vector<std::string> Timeline::defaultParameterNames() const {
-    return {"eyePosition", "eyeLookAtPosition", "eyeUpVector", "fov", "nearClipDistance", "farClipDistance", "markers"};
+    return {"eyePosition",      "eyeLookAtPosition", "eyeUpVector", "fov",
+            "nearClipDistance", "farClipDistance",   "markers"};
 }
 
 double Timeline::defaultEyeDistance() const {
@@ -57,8 +59,10 @@ double Timeline::defaultEyeDistance() const {
 
 boost::shared_ptr<ParameterInterface> Timeline::createDefaultParameter(const std::string& name) const {
     const boost::weak_ptr<const ThreadSafe> token = parametersToken();
-    if (name == "eyePosition") return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 0, defaultEyeDistance()));
-    if (name == "eyeLookAtPosition") return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 0, 0));
+    if (name == "eyePosition")
+        return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 0, defaultEyeDistance()));
+    if (name == "eyeLookAtPosition")
+        return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 0, 0));
     if (name == "eyeUpVector") return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 1, 0));
     if (name == "fov") return InterpolatingParam<double>::create(token, name, kDefaultFovDegrees);
     if (name == "nearClipDistance") return InterpolatingParam<double>::create(token, name, 1.0);
@@ -113,7 +117,8 @@ void Timeline::addMixer(const std::string& name, const MixerPtr& mixer) {
 void Timeline::removeMixer(const MixerPtr& mixer) {
     {
         ScopedWriteLock lock(projectMutex());
-        const auto found = std::find_if(mixers_.begin(), mixers_.end(), [&](const auto& e) { return e.second == mixer; });
+        const auto found =
+            std::find_if(mixers_.begin(), mixers_.end(), [&](const auto& e) { return e.second == mixer; });
         if (found == mixers_.end()) throw VelaMediaLibException("unable to find mixer");
         mixers_.erase(found);
         mixer->detachAddObserver(this);
@@ -186,7 +191,8 @@ VelaTime Timeline::endTime() const {
 
 VelaTime Timeline::endTimeNotIncludingHiddenAndMutedTracks() const {
     VelaTime end = 0;
-    for (const std::string& name : mixerNames()) end = std::max(end, mixer(name)->endTimeNotIncludingHiddenAndMutedTracks());
+    for (const std::string& name : mixerNames())
+        end = std::max(end, mixer(name)->endTimeNotIncludingHiddenAndMutedTracks());
     return end;
 }
 
@@ -233,19 +239,21 @@ TransformMatrix Timeline::cameraTransformAtTimeLH(const RationalTime& time) cons
 TransformMatrix Timeline::projectionTransformAtTime(const RationalTime& time) const {
     const Camera c = cameraAtTime(time);
     const double f = 1.0 / std::tan(c.fovDegrees * M_PI / 360.0), n = c.nearClip, far = c.farClip;
-    return TransformMatrix({f / c.aspect, 0, 0, 0, 0, f, 0, 0, 0, 0, (far + n) / (n - far), 2 * far * n / (n - far), 0,
-                            0, -1, 0});
+    return TransformMatrix({f / c.aspect, 0, 0, 0, 0, f, 0, 0, 0, 0, (far + n) / (n - far),
+                            2 * far * n / (n - far), 0, 0, -1, 0});
 }
 
 TransformMatrix Timeline::projectionTransformAtTimeLH(const RationalTime& time) const {
     const Camera c = cameraAtTime(time);
     const double f = 1.0 / std::tan(c.fovDegrees * M_PI / 360.0), n = c.nearClip, far = c.farClip;
-    return TransformMatrix({f / c.aspect, 0, 0, 0, 0, f, 0, 0, 0, 0, far / (far - n), -n * far / (far - n), 0, 0, 1, 0});
+    return TransformMatrix(
+        {f / c.aspect, 0, 0, 0, 0, f, 0, 0, 0, 0, far / (far - n), -n * far / (far - n), 0, 0, 1, 0});
 }
 
 TransformMatrix Timeline::calcScreenTransformAtTime(const RationalTime& time) const {
     const double width = attributeValue<int>("width", 1920), height = attributeValue<int>("height", 1080);
-    const TransformMatrix viewport({width / 2, 0, 0, width / 2, 0, -height / 2, 0, height / 2, 0, 0, 1, 0, 0, 0, 0, 1});
+    const TransformMatrix viewport(
+        {width / 2, 0, 0, width / 2, 0, -height / 2, 0, height / 2, 0, 0, 1, 0, 0, 0, 0, 1});
     return viewport * projectionTransformAtTime(time) * cameraTransformAtTime(time);
 }
 
@@ -257,7 +265,8 @@ void Timeline::attachAddObserver(TimelineAddObserver* observer) {
 
 void Timeline::detachAddObserver(TimelineAddObserver* observer) {
     ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer), addObservers_.end());
+    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
+                        addObservers_.end());
 }
 
 void Timeline::onMixerAddTrack(Mixer& mixer, const TrackPtr& track) {

@@ -31,8 +31,8 @@ class Timeline : public SubProject,
                  public Attributable,
                  public boost::enable_shared_from_this<Timeline> {
 public:
-    static boost::shared_ptr<Timeline> create(const boost::weak_ptr<const ThreadSafe>& token, int width = 1920,
-                                              int height = 1080);
+    static boost::shared_ptr<Timeline> create(const boost::weak_ptr<const ThreadSafe>& token,
+                                              int width = 1920, int height = 1080);
     ~Timeline() override;
     using SubProject::projectMutex;
 
@@ -81,9 +81,15 @@ public:
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
     VelaTime endTimeNotIncludingHiddenAndMutedTracks() const;
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override { return time; }
+    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
+        return time;
+    }
 
     // Canvas, camera, markers, sound
     boost::shared_ptr<Attribute<int>> attributeWidth() const { return attribute<int>("width"); }
@@ -97,14 +103,26 @@ public:
     }
     CaptionAttributes captionAttributes() const;
     void setCaptionAttributes(const CaptionAttributes& attributes);
-    boost::shared_ptr<Parameter<Point3d>> eyePositionParam() const { return typedParameter<Point3d>("eyePosition"); }
-    boost::shared_ptr<Parameter<Point3d>> eyeLookAtPositionParam() const { return typedParameter<Point3d>("eyeLookAtPosition"); }
-    boost::shared_ptr<Parameter<Point3d>> eyeUpVectorParam() const { return typedParameter<Point3d>("eyeUpVector"); }
+    boost::shared_ptr<Parameter<Point3d>> eyePositionParam() const {
+        return typedParameter<Point3d>("eyePosition");
+    }
+    boost::shared_ptr<Parameter<Point3d>> eyeLookAtPositionParam() const {
+        return typedParameter<Point3d>("eyeLookAtPosition");
+    }
+    boost::shared_ptr<Parameter<Point3d>> eyeUpVectorParam() const {
+        return typedParameter<Point3d>("eyeUpVector");
+    }
     boost::shared_ptr<Parameter<double>> fovParam() const { return typedParameter<double>("fov"); }
-    boost::shared_ptr<Parameter<double>> nearClipDistanceParam() const { return typedParameter<double>("nearClipDistance"); }
-    boost::shared_ptr<Parameter<double>> farClipDistanceParam() const { return typedParameter<double>("farClipDistance"); }
+    boost::shared_ptr<Parameter<double>> nearClipDistanceParam() const {
+        return typedParameter<double>("nearClipDistance");
+    }
+    boost::shared_ptr<Parameter<double>> farClipDistanceParam() const {
+        return typedParameter<double>("farClipDistance");
+    }
     /// Markers: keyframes whose values are the markers' names; an empty name marks nothing.
-    boost::shared_ptr<Parameter<std::string>> markerParam() const { return typedParameter<std::string>("markers"); }
+    boost::shared_ptr<Parameter<std::string>> markerParam() const {
+        return typedParameter<std::string>("markers");
+    }
     /// World to camera, right-handed (the camera looks down its -z axis).
     TransformMatrix cameraTransformAtTime(const RationalTime& time) const;
     /// Camera to clip space, right-handed (depth -1 near to 1 far).

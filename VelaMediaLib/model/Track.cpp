@@ -48,7 +48,8 @@ Track::MediaMap::const_iterator Track::findMedia(const MediaPtr& media) const {
     if (!media || trackOf(media).get() != this) return medias_.end();
     const auto keyed = medias_.find(media->startTime());
     if (keyed != medias_.end() && keyed->second == media) return keyed;
-    return std::find_if(medias_.begin(), medias_.end(), [&](const MediaMap::value_type& e) { return e.second == media; });
+    return std::find_if(medias_.begin(), medias_.end(),
+                        [&](const MediaMap::value_type& e) { return e.second == media; });
 }
 
 void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media) const {
@@ -58,8 +59,10 @@ void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media)
 void Track::tellObservers(bool added, const MediaPtr& media) {
     const std::vector<TrackAddObserver*> observers = addObservers_;
     for (TrackAddObserver* observer : observers) {
-        if (added) observer->onTrackAddMedia(*this, media);
-        else observer->onTrackRemoveMedia(*this, media);
+        if (added)
+            observer->onTrackAddMedia(*this, media);
+        else
+            observer->onTrackRemoveMedia(*this, media);
     }
 }
 
@@ -120,7 +123,8 @@ std::vector<TransitionPtr> Track::transitions() const {
     std::vector<TransitionPtr> found;
     for (const MediaPtr& media : medias())
         for (const TransitionPtr& transition : {media->leftTransition(), media->rightTransition()})
-            if (transition && std::find(found.begin(), found.end(), transition) == found.end()) found.push_back(transition);
+            if (transition && std::find(found.begin(), found.end(), transition) == found.end())
+                found.push_back(transition);
     return found;
 }
 
@@ -141,7 +145,8 @@ Track::Pair Track::mediaAtTime(VelaTime time) const {
 namespace {
 
 template <typename LeftOut>
-std::vector<MediaPtr> intersecting(const Track::MediaMap& medias, const Range<VelaTime>& range, LeftOut leftOut) {
+std::vector<MediaPtr> intersecting(const Track::MediaMap& medias, const Range<VelaTime>& range,
+                                   LeftOut leftOut) {
     std::vector<MediaPtr> found;
     if (range.duration() <= 0) return found;
     auto at = medias.upper_bound(range.start());
@@ -154,7 +159,8 @@ std::vector<MediaPtr> intersecting(const Track::MediaMap& medias, const Range<Ve
 
 } // namespace
 
-std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range, const MediaPtr& leftOut) const {
+std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range,
+                                                     const MediaPtr& leftOut) const {
     ScopedReadLock lock(projectMutex());
     return intersecting(medias_, range, [&](const MediaPtr& media) { return media == leftOut; });
 }
@@ -167,12 +173,15 @@ std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& rang
     });
 }
 
-std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range, const std::set<MediaPtr>& leftOut) const {
+std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range,
+                                                     const std::set<MediaPtr>& leftOut) const {
     ScopedReadLock lock(projectMutex());
     return intersecting(medias_, range, [&](const MediaPtr& media) { return leftOut.count(media) > 0; });
 }
 
-bool Track::intersectionAtRange(const Range<VelaTime>& range) const { return !mediasIntersectingRange(range).empty(); }
+bool Track::intersectionAtRange(const Range<VelaTime>& range) const {
+    return !mediasIntersectingRange(range).empty();
+}
 
 std::vector<Track::MediaRange> Track::subSection(const Range<VelaTime>& range) const {
     std::vector<MediaRange> parts;
@@ -213,7 +222,8 @@ MediaPtr Track::getTouchingMediaToRightOfMedia(const MediaPtr& media) {
 }
 
 template <typename Edit>
-Track::TransitionAndNeighbour Track::editPlaced(const MediaPtr& media, const Range<VelaTime>& preview, Edit edit) {
+Track::TransitionAndNeighbour Track::editPlaced(const MediaPtr& media, const Range<VelaTime>& preview,
+                                                Edit edit) {
     ScopedWriteLock lock(projectMutex());
     const auto at = findMedia(media);
     if (at == medias_.end()) throw AddRemoveException("the clip is not on this track");
@@ -240,7 +250,8 @@ Track::TransitionAndNeighbour Track::trimEnd(const MediaPtr& media, VelaTime off
 
 SafeRational Track::stretch(const MediaPtr& media, const SafeRational& factor) {
     SafeRational scalar;
-    editPlaced(media, media->trackRangeWithRationalStretch(factor), [&] { scalar = media->rationalStretch(factor); });
+    editPlaced(media, media->trackRangeWithRationalStretch(factor),
+               [&] { scalar = media->rationalStretch(factor); });
     return scalar;
 }
 
@@ -252,7 +263,8 @@ void Track::restoreMediaState(const MediaPtr& media, const MediaState& state, Ve
     editPlaced(media, state.trackRange(), [&] { media->restoreState(state, tolerance); });
 }
 
-boost::shared_ptr<Track> Track::copyPortion(const Range<VelaTime>& range, std::map<MediaPtr, MediaPtr>* copied) const {
+boost::shared_ptr<Track> Track::copyPortion(const Range<VelaTime>& range,
+                                            std::map<MediaPtr, MediaPtr>* copied) const {
     const boost::shared_ptr<Track> portion = cloneEmpty();
     for (const MediaPtr& media : mediasIntersectingRange(range)) {
         const MediaPtr copy = media->clone();
@@ -265,7 +277,8 @@ boost::shared_ptr<Track> Track::copyPortion(const Range<VelaTime>& range, std::m
     return portion;
 }
 
-boost::shared_ptr<Track> Track::copyPortion(const std::vector<MediaPtr>& clips, std::map<MediaPtr, MediaPtr>* copied) const {
+boost::shared_ptr<Track> Track::copyPortion(const std::vector<MediaPtr>& clips,
+                                            std::map<MediaPtr, MediaPtr>* copied) const {
     const boost::shared_ptr<Track> portion = cloneEmpty();
     if (clips.empty()) return portion;
     VelaTime earliest = clips.front()->startTime();
@@ -340,7 +353,8 @@ void Track::attachAddObserver(TrackAddObserver* observer) {
 
 void Track::detachAddObserver(TrackAddObserver* observer) {
     ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer), addObservers_.end());
+    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
+                        addObservers_.end());
 }
 
 VelaTime Track::startTime() const {

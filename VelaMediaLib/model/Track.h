@@ -63,9 +63,12 @@ public:
 
     // Queries by time
     Pair mediaAtTime(VelaTime time) const;
-    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range, const MediaPtr& leftOut = MediaPtr()) const;
-    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range, const std::vector<MediaPtr>& leftOut) const;
-    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range, const std::set<MediaPtr>& leftOut) const;
+    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,
+                                                  const MediaPtr& leftOut = MediaPtr()) const;
+    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,
+                                                  const std::vector<MediaPtr>& leftOut) const;
+    std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,
+                                                  const std::set<MediaPtr>& leftOut) const;
     bool intersectionAtRange(const Range<VelaTime>& range) const;
     std::vector<MediaRange> subSection(const Range<VelaTime>& range) const;
     static MediaPtr getLeftOfMedia(const MediaPtr& media);
@@ -84,9 +87,11 @@ public:
     // Copies and visits
     /// Clones of the clips inside the range, cut to it and counted from its start;
     /// `copied` (when given) maps each original to its copy.
-    boost::shared_ptr<Track> copyPortion(const Range<VelaTime>& range, std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
+    boost::shared_ptr<Track> copyPortion(const Range<VelaTime>& range,
+                                         std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
     /// Clones of the given clips of this track, counted from the earliest one's start.
-    boost::shared_ptr<Track> copyPortion(const std::vector<MediaPtr>& clips, std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
+    boost::shared_ptr<Track> copyPortion(const std::vector<MediaPtr>& clips,
+                                         std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
     void recursivelyVisitAllMedia(const MediaVisitor& visitor) const;
     /// Returns true when the visitor stopped the walk.
     bool recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit& visitor) const;
@@ -124,9 +129,15 @@ public:
     /// The end of the last clip: a track's time starts at 0.
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override { return time; }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override { return time; }
+    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
+        return time;
+    }
+    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
+        return time;
+    }
     /// The mixer, which passes time on to its group, if any.
     const TimeConverter* parentTimeConverter() const override;
 

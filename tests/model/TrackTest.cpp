@@ -70,7 +70,8 @@ TEST_F(TrackTest, MediaAtTimeGivesTheClipOrBothTouchingClips) {
     EXPECT_EQ(Track::getTouchingMediaToLeftOfMedia(third), MediaPtr());
     EXPECT_EQ(Track::getTouchingMediaToRightOfMedia(first), second);
     EXPECT_EQ(Track::getRightOfMedia(third), MediaPtr());
-    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(5, 30), second), (std::vector<MediaPtr>{first, third}));
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(5, 30), second),
+              (std::vector<MediaPtr>{first, third}));
     EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::vector<MediaPtr>{first, third}),
               std::vector<MediaPtr>{second});
     EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::set<MediaPtr>{second}).size(), 2u);
@@ -99,7 +100,7 @@ TEST_F(TrackTest, EditsThatWouldCollideChangeNothing) {
     EXPECT_EQ(track->mediaAtTime(10), Track::Pair(left, middle));
 
     track->trimEnd(middle, 10);
-    track->move(middle, 5); // now [15, 45)
+    track->move(middle, 5);                     // now [15, 45)
     EXPECT_EQ(track->mediaMap().count(15), 1u); // keyed by the new start
     EXPECT_EQ(track->mediaAtTime(16).first, middle);
     track->removeMedia(right);
@@ -135,7 +136,8 @@ TEST_F(TrackTest, SoloDecidesOverMuteAndHide) {
 
 TEST_F(TrackTest, MixerIndexRulesAndPuttingATrackBack) {
     const auto mixer = GenericMixer::create(project);
-    const TrackPtr a = GenericTrack::create(project), b = GenericTrack::create(project), c = GenericTrack::create(project);
+    const TrackPtr a = GenericTrack::create(project), b = GenericTrack::create(project),
+                   c = GenericTrack::create(project);
     mixer->addTrack(a, -1);
     mixer->addTrack(b, 1); // the number of tracks appends
     for (const int bad : {-2, 3}) {
@@ -170,7 +172,9 @@ TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
     struct Recorder : TimelineAddObserver {
         std::vector<std::string> events;
         void onTimelineAddTrack(Timeline&, Mixer&, const TrackPtr&) override { events.push_back("track+"); }
-        void onTimelineRemoveTrack(Timeline&, Mixer&, const TrackPtr&) override { events.push_back("track-"); }
+        void onTimelineRemoveTrack(Timeline&, Mixer&, const TrackPtr&) override {
+            events.push_back("track-");
+        }
         void onTimelineAddMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip+"); }
         void onTimelineRemoveMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip-"); }
     } recorder;
@@ -196,7 +200,8 @@ TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
     }
     const RemoveTrackInfo info = timeline->removeTrack(second, lower);
     EXPECT_EQ(info.track, lower);
-    EXPECT_EQ(recorder.events, (std::vector<std::string>{"track+", "track+", "clip+", "clip+", "clip-", "track-"}));
+    EXPECT_EQ(recorder.events,
+              (std::vector<std::string>{"track+", "track+", "clip+", "clip+", "clip-", "track-"}));
     try {
         timeline->removeMixer(GenericMixer::create(project));
         FAIL();
@@ -245,7 +250,8 @@ TEST_F(TrackTest, CopiesAndLocks) {
     EXPECT_TRUE(LockData::IsMediaLocked(*first));
     EXPECT_FALSE(LockData::IsMediaEditable(*second));
     EXPECT_FALSE(LockData::IsMediaLocked(*clip(3)));
-    bool stoppedEarly = track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; });
+    bool stoppedEarly =
+        track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; });
     EXPECT_TRUE(stoppedEarly);
 }
 
