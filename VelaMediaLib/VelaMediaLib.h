@@ -8,6 +8,7 @@
 #include <VelaMediaLib/effects/Effect.h>
 #include <VelaMediaLib/effects/EffectList.h>
 #include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/model/AddObserverList.h>
 #include <VelaMediaLib/model/Attributable.h>
 #include <VelaMediaLib/model/AudioMedia.h>
 #include <VelaMediaLib/model/AudioMediaImpl.h>
@@ -22,6 +23,7 @@
 #include <VelaMediaLib/model/GenericTrack.h>
 #include <VelaMediaLib/model/IdentManager.h>
 #include <VelaMediaLib/model/Identified.h>
+#include <VelaMediaLib/model/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/KeystrokeData.h>
 #include <VelaMediaLib/model/LockData.h>
 #include <VelaMediaLib/model/Media.h>

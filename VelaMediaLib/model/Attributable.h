@@ -38,6 +38,12 @@ public:
         insertAttribute(made);
         return made;
     }
+    /// The attribute of the name, made with the initial value if it has none.
+    template <typename T>
+    boost::shared_ptr<Attribute<T>> attributeOrAdd(const std::string& name, const T& initial) {
+        const auto existing = attribute<T>(name);
+        return existing ? existing : addAttribute<T>(name, initial);
+    }
     /// The value, or the fallback when the name has no attribute of that type.
     template <typename T>
     T attributeValue(const std::string& name, const T& fallback) const {

@@ -16,24 +16,18 @@ boost::shared_ptr<ParameterInterface> AudioMediaImpl::createDefaultParameter(con
     return made;
 }
 
-boost::shared_ptr<Attribute<double>> AudioMediaImpl::gain() {
-    const auto existing = attribute<double>("gain");
-    return existing ? existing : addAttribute<double>("gain", 1.0);
-}
+boost::shared_ptr<Attribute<double>> AudioMediaImpl::gain() { return attributeOrAdd<double>("gain", 1.0); }
 
 boost::shared_ptr<Attribute<bool>> AudioMediaImpl::mixToMono() {
-    const auto existing = attribute<bool>("mixToMono");
-    return existing ? existing : addAttribute<bool>("mixToMono", false);
+    return attributeOrAdd<bool>("mixToMono", false);
 }
 
 boost::shared_ptr<Attribute<bool>> AudioMediaImpl::shouldApplyLoudnessNormalizationAttribute() {
-    const auto existing = attribute<bool>("loudnessNormalization");
-    return existing ? existing : addAttribute<bool>("loudnessNormalization", false);
+    return attributeOrAdd<bool>("loudnessNormalization", false);
 }
 
 boost::shared_ptr<Attribute<long long>> AudioMediaImpl::sourceFileOffset() {
-    const auto existing = attribute<long long>("sourceFileOffset");
-    return existing ? existing : addAttribute<long long>("sourceFileOffset", 0);
+    return attributeOrAdd<long long>("sourceFileOffset", 0);
 }
 
 boost::shared_ptr<SubTimeline> AudioMediaImpl::parentTrack() const {

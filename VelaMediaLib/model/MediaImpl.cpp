@@ -326,44 +326,49 @@ VelaTime longest(const EdgeModifiable::EdgeModifications& modifications) {
 
 } // namespace
 
-void MediaImpl::addLeftEdgeModification(const EdgeModificationPtr& modification) {
+void MediaImpl::addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification) {
     if (!modification) throw AddRemoveException("no edge modification to add");
     {
         ScopedWriteLock lock(projectMutex());
-        leftEdges_.push_back(modification);
+        side.push_back(modification);
     }
     notify();
 }
 
-void MediaImpl::addRightEdgeModification(const EdgeModificationPtr& modification) {
-    if (!modification) throw AddRemoveException("no edge modification to add");
+bool MediaImpl::removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification) {
     {
         ScopedWriteLock lock(projectMutex());
-        rightEdges_.push_back(modification);
-    }
-    notify();
-}
-
-bool MediaImpl::removeLeftEdgeModification(const EdgeModificationPtr& modification) {
-    {
-        ScopedWriteLock lock(projectMutex());
-        const auto found = std::find(leftEdges_.begin(), leftEdges_.end(), modification);
-        if (found == leftEdges_.end()) return false;
-        leftEdges_.erase(found);
+        const auto found = std::find(side.begin(), side.end(), modification);
+        if (found == side.end()) return false;
+        side.erase(found);
     }
     notify();
     return true;
 }
 
-bool MediaImpl::removeRightEdgeModification(const EdgeModificationPtr& modification) {
+void MediaImpl::setEdgeModificationLength(EdgeModifications& side, VelaTime length) {
     {
         ScopedWriteLock lock(projectMutex());
-        const auto found = std::find(rightEdges_.begin(), rightEdges_.end(), modification);
-        if (found == rightEdges_.end()) return false;
-        rightEdges_.erase(found);
+        for (const EdgeModificationPtr& modification : side) modification->setDuration(length);
     }
     notify();
-    return true;
+}
+
+void MediaImpl::addLeftEdgeModification(const EdgeModificationPtr& m) { addEdgeModification(leftEdges_, m); }
+void MediaImpl::addRightEdgeModification(const EdgeModificationPtr& m) {
+    addEdgeModification(rightEdges_, m);
+}
+bool MediaImpl::removeLeftEdgeModification(const EdgeModificationPtr& m) {
+    return removeEdgeModification(leftEdges_, m);
+}
+bool MediaImpl::removeRightEdgeModification(const EdgeModificationPtr& m) {
+    return removeEdgeModification(rightEdges_, m);
+}
+void MediaImpl::setLeftEdgeModificationLength(VelaTime length) {
+    setEdgeModificationLength(leftEdges_, length);
+}
+void MediaImpl::setRightEdgeModificationLength(VelaTime length) {
+    setEdgeModificationLength(rightEdges_, length);
 }
 
 EdgeModifiable::EdgeModifications MediaImpl::leftEdgeModifications() const {
@@ -378,22 +383,6 @@ EdgeModifiable::EdgeModifications MediaImpl::rightEdgeModifications() const {
 
 VelaTime MediaImpl::leftEdgeModificationLength() const { return longest(leftEdgeModifications()); }
 VelaTime MediaImpl::rightEdgeModificationLength() const { return longest(rightEdgeModifications()); }
-
-void MediaImpl::setLeftEdgeModificationLength(VelaTime length) {
-    {
-        ScopedWriteLock lock(projectMutex());
-        for (const EdgeModificationPtr& modification : leftEdges_) modification->setDuration(length);
-    }
-    notify();
-}
-
-void MediaImpl::setRightEdgeModificationLength(VelaTime length) {
-    {
-        ScopedWriteLock lock(projectMutex());
-        for (const EdgeModificationPtr& modification : rightEdges_) modification->setDuration(length);
-    }
-    notify();
-}
 
 std::set<std::string> MediaImpl::edgeModGroupNames() const {
     ScopedReadLock lock(projectMutex());

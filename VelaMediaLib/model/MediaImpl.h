@@ -119,8 +119,9 @@ protected:
     /// Gives a clone of this clip everything but its placement on a track:
     /// name, parameters, attributes, metadata, effects and edge modifications.
     void copyContentInto(MediaImpl& clone) const;
-    EdgeModifications& edges(bool left) { return left ? leftEdges_ : rightEdges_; }
-    const EdgeModifications& edges(bool left) const { return left ? leftEdges_ : rightEdges_; }
+    void addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
+    bool removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
+    void setEdgeModificationLength(EdgeModifications& side, VelaTime length);
     void setTransition(TransitionPtr& slot, const TransitionPtr& transition);
 
 private:

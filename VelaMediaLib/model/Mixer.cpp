@@ -12,12 +12,6 @@ Mixer::~Mixer() {
     for (const TrackPtr& track : tracks_) track->detachAddObserver(this);
 }
 
-template <typename Tell>
-void Mixer::tellObservers(Tell tell) {
-    const std::vector<MixerAddObserver*> observers = addObservers_;
-    for (MixerAddObserver* observer : observers) tell(*observer);
-}
-
 void Mixer::addTrackSansTypeCheck(const TrackPtr& track, int index) {
     if (!track) throw AddRemoveException("no track to add");
     ScopedWriteLock lock(projectMutex());
@@ -27,7 +21,7 @@ void Mixer::addTrackSansTypeCheck(const TrackPtr& track, int index) {
     tracks_.insert(index == -1 ? tracks_.end() : tracks_.begin() + index, track);
     track->setParentMixer(shared_from_this());
     track->attachAddObserver(this);
-    tellObservers([&](MixerAddObserver& o) { o.onMixerAddTrack(*this, track); });
+    addObservers_.tell([&](MixerAddObserver& o) { o.onMixerAddTrack(*this, track); });
 }
 
 RemoveTrackInfo Mixer::removeTrackImpl(const TrackPtr& track) {
@@ -41,7 +35,7 @@ RemoveTrackInfo Mixer::removeTrackImpl(const TrackPtr& track) {
     tracks_.erase(found);
     track->detachAddObserver(this);
     track->setParentMixer(boost::weak_ptr<Mixer>());
-    tellObservers([&](MixerAddObserver& o) { o.onMixerRemoveTrack(*this, track); });
+    addObservers_.tell([&](MixerAddObserver& o) { o.onMixerRemoveTrack(*this, track); });
     return info;
 }
 
@@ -94,17 +88,19 @@ std::vector<MediaPtr> Mixer::allMedias() const {
     return clips;
 }
 
-bool Mixer::hasAudio() const {
-    const std::vector<MediaPtr> clips = allMedias();
+namespace {
+
+template <typename Kind>
+bool anyOf(const std::vector<MediaPtr>& clips) {
     return std::any_of(clips.begin(), clips.end(),
-                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<AudioMedia>(m)); });
+                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<Kind>(m)); });
 }
 
-bool Mixer::hasVisual() const {
-    const std::vector<MediaPtr> clips = allMedias();
-    return std::any_of(clips.begin(), clips.end(),
-                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<VisualMedia>(m)); });
-}
+} // namespace
+
+bool Mixer::hasAudio() const { return anyOf<AudioMedia>(allMedias()); }
+
+bool Mixer::hasVisual() const { return anyOf<VisualMedia>(allMedias()); }
 
 VelaTime Mixer::startTime() const {
     bool any = false;
@@ -161,24 +157,16 @@ void Mixer::setParentGroup(const boost::weak_ptr<Media>& group) {
     group_ = group;
 }
 
-void Mixer::attachAddObserver(MixerAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    if (std::find(addObservers_.begin(), addObservers_.end(), observer) == addObservers_.end())
-        addObservers_.push_back(observer);
-}
+void Mixer::attachAddObserver(MixerAddObserver* observer) { addObservers_.attach(observer); }
 
-void Mixer::detachAddObserver(MixerAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
-                        addObservers_.end());
-}
+void Mixer::detachAddObserver(MixerAddObserver* observer) { addObservers_.detach(observer); }
 
 void Mixer::onTrackAddMedia(Track& track, const MediaPtr& media) {
-    tellObservers([&](MixerAddObserver& o) { o.onMixerAddMedia(*this, track, media); });
+    addObservers_.tell([&](MixerAddObserver& o) { o.onMixerAddMedia(*this, track, media); });
 }
 
 void Mixer::onTrackRemoveMedia(Track& track, const MediaPtr& media) {
-    tellObservers([&](MixerAddObserver& o) { o.onMixerRemoveMedia(*this, track, media); });
+    addObservers_.tell([&](MixerAddObserver& o) { o.onMixerRemoveMedia(*this, track, media); });
 }
 
 MixerPtr Mixer::copyPortion(const Range<VelaTime>& range, std::map<MediaPtr, MediaPtr>* copied) const {

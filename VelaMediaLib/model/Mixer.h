@@ -13,14 +13,14 @@ class Timeline;
 /// its tracks and passes their clip additions and removals on.
 class Mixer : public SubTimelineParts<SubTimeline>,
               public Cloneable,
-              public TimeConverter,
+              public IdentityTimeConverter,
               public TrackAddObserver,
               public boost::enable_shared_from_this<Mixer> {
 public:
     typedef std::vector<TrackPtr> Tracks;
 
     explicit Mixer(const boost::weak_ptr<const ThreadSafe>& token)
-        : SubTimeline(token), SubTimelineParts(token) {}
+        : SubTimeline(token), SubTimelineParts(token), addObservers_(token) {}
     ~Mixer() override;
 
     // Tracks
@@ -89,13 +89,10 @@ protected:
     void addTrackSansTypeCheck(const TrackPtr& track, int index);
 
 private:
-    template <typename Tell>
-    void tellObservers(Tell tell);
-
     Tracks tracks_;
     boost::weak_ptr<Timeline> timeline_;
     boost::weak_ptr<Media> group_;
-    std::vector<MixerAddObserver*> addObservers_;
+    AddObserverList<MixerAddObserver> addObservers_;
 };
 
 typedef boost::shared_ptr<Mixer> MixerPtr;

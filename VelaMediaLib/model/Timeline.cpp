@@ -31,7 +31,7 @@ TransformMatrix view(const Point3d& x, const Point3d& y, const Point3d& z, const
 } // namespace
 
 Timeline::Timeline(const boost::weak_ptr<const ThreadSafe>& token)
-    : SubProject(token), Subject(token), Parametric(token), Attributable(token) {}
+    : SubProject(token), Subject(token), Parametric(token), Attributable(token), addObservers_(token) {}
 
 Timeline::~Timeline() {
     for (const auto& entry : mixers_) entry.second->detachAddObserver(this);
@@ -89,12 +89,6 @@ std::vector<std::string> Timeline::mixerNames() const {
     return names;
 }
 
-template <typename Tell>
-void Timeline::tellObservers(Tell tell) {
-    const std::vector<TimelineAddObserver*> observers = addObservers_;
-    for (TimelineAddObserver* observer : observers) tell(*observer);
-}
-
 boost::shared_ptr<GenericMixer> Timeline::newMixer(const std::string& name) {
     const boost::shared_ptr<GenericMixer> made = GenericMixer::create(projectMutex());
     made->setIdentifier(name);
@@ -111,7 +105,7 @@ void Timeline::addMixer(const std::string& name, const MixerPtr& mixer) {
         mixers_[name] = mixer;
         mixer->attachAddObserver(this);
     }
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineAddMixer(*this, mixer); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineAddMixer(*this, mixer); });
 }
 
 void Timeline::removeMixer(const MixerPtr& mixer) {
@@ -124,7 +118,7 @@ void Timeline::removeMixer(const MixerPtr& mixer) {
         mixer->detachAddObserver(this);
         mixer->setParentTimeline(boost::weak_ptr<Timeline>());
     }
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineRemoveMixer(*this, mixer); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineRemoveMixer(*this, mixer); });
 }
 
 boost::shared_ptr<GenericTrack> Timeline::newTrack() const { return GenericTrack::create(projectMutex()); }
@@ -257,34 +251,26 @@ TransformMatrix Timeline::calcScreenTransformAtTime(const RationalTime& time) co
     return viewport * projectionTransformAtTime(time) * cameraTransformAtTime(time);
 }
 
-void Timeline::attachAddObserver(TimelineAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    if (std::find(addObservers_.begin(), addObservers_.end(), observer) == addObservers_.end())
-        addObservers_.push_back(observer);
-}
+void Timeline::attachAddObserver(TimelineAddObserver* observer) { addObservers_.attach(observer); }
 
-void Timeline::detachAddObserver(TimelineAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
-                        addObservers_.end());
-}
+void Timeline::detachAddObserver(TimelineAddObserver* observer) { addObservers_.detach(observer); }
 
 void Timeline::onMixerAddTrack(Mixer& mixer, const TrackPtr& track) {
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineAddTrack(*this, mixer, track); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineAddTrack(*this, mixer, track); });
 }
 
 void Timeline::onMixerRemoveTrack(Mixer& mixer, const TrackPtr& track) {
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineRemoveTrack(*this, mixer, track); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineRemoveTrack(*this, mixer, track); });
 }
 
 void Timeline::onMixerAddMedia(Mixer&, Track& track, const MediaPtr& media) {
     media->setParentTimeline(shared_from_this());
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineAddMedia(*this, track, media); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineAddMedia(*this, track, media); });
 }
 
 void Timeline::onMixerRemoveMedia(Mixer&, Track& track, const MediaPtr& media) {
     media->setParentTimeline(boost::weak_ptr<Timeline>());
-    tellObservers([&](TimelineAddObserver& o) { o.onTimelineRemoveMedia(*this, track, media); });
+    addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineRemoveMedia(*this, track, media); });
 }
 
 } // namespace VelaMediaLib

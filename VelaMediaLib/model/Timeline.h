@@ -1,6 +1,8 @@
 #pragma once
 
+#include <VelaMediaLib/model/AddObserverList.h>
 #include <VelaMediaLib/model/Attributable.h>
+#include <VelaMediaLib/model/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/CaptionAttributes.h>
 #include <VelaMediaLib/model/GenericMixer.h>
 #include <VelaMediaLib/model/GenericTrack.h>
@@ -26,7 +28,7 @@ class Timeline : public SubProject,
                  public Temporal,
                  public Parametric,
                  public Transformer,
-                 public TimeConverter,
+                 public IdentityTimeConverter,
                  public MixerAddObserver,
                  public Attributable,
                  public boost::enable_shared_from_this<Timeline> {
@@ -149,8 +151,6 @@ protected:
 
 private:
     explicit Timeline(const boost::weak_ptr<const ThreadSafe>& token);
-    template <typename Tell>
-    void tellObservers(Tell tell);
     /// The camera's values at a time, as the projections need them.
     struct Camera {
         Point3d eye, lookAt, up;
@@ -160,7 +160,7 @@ private:
     double defaultEyeDistance() const;
 
     std::map<std::string, MixerPtr> mixers_;
-    std::vector<TimelineAddObserver*> addObservers_;
+    AddObserverList<TimelineAddObserver> addObservers_;
     CaptionAttributes captions_;
 };
 

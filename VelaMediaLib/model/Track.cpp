@@ -29,7 +29,8 @@ boost::shared_ptr<Track> trackOf(const MediaPtr& media) {
 
 Track::Track(const boost::weak_ptr<const ThreadSafe>& token)
     : SubTimeline(token), SubTimelineParts<SubTimeline>(token),
-      nodePool_(new std::pmr::unsynchronized_pool_resource()), medias_(nodePool_.get()) {
+      nodePool_(new std::pmr::unsynchronized_pool_resource()), medias_(nodePool_.get()),
+      addObservers_(token) {
     for (const char* key : kFlags) addAttribute<bool>(key, false);
 }
 
@@ -56,16 +57,6 @@ void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media)
     if (!mediasIntersectingRange(range, media).empty()) throw CollisionException(range, media, range.start());
 }
 
-void Track::tellObservers(bool added, const MediaPtr& media) {
-    const std::vector<TrackAddObserver*> observers = addObservers_;
-    for (TrackAddObserver* observer : observers) {
-        if (added)
-            observer->onTrackAddMedia(*this, media);
-        else
-            observer->onTrackRemoveMedia(*this, media);
-    }
-}
-
 void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
     if (!media) throw AddRemoveException("no clip to add");
     ScopedWriteLock lock(projectMutex());
@@ -77,7 +68,7 @@ void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
     media->setTimeConverterParent(this);
     Transition::mergeMediaPairTransitions(mediaAtTime(start));
     Transition::mergeMediaPairTransitions(mediaAtTime(media->endTime()));
-    tellObservers(true, media);
+    addObservers_.tell([&](TrackAddObserver& o) { o.onTrackAddMedia(*this, media); });
 }
 
 void Track::removeMedia(const MediaPtr& media) {
@@ -87,7 +78,7 @@ void Track::removeMedia(const MediaPtr& media) {
     medias_.erase(found);
     media->setParent(boost::weak_ptr<SubTimeline>());
     media->setTimeConverterParent(nullptr);
-    tellObservers(false, media);
+    addObservers_.tell([&](TrackAddObserver& o) { o.onTrackRemoveMedia(*this, media); });
 }
 
 bool Track::hasMedia(const MediaPtr& media) const {
@@ -345,17 +336,9 @@ void Track::setParentStitchedMedia(const boost::weak_ptr<Media>& media) {
     parentStitched_ = media;
 }
 
-void Track::attachAddObserver(TrackAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    if (std::find(addObservers_.begin(), addObservers_.end(), observer) == addObservers_.end())
-        addObservers_.push_back(observer);
-}
+void Track::attachAddObserver(TrackAddObserver* observer) { addObservers_.attach(observer); }
 
-void Track::detachAddObserver(TrackAddObserver* observer) {
-    ScopedWriteLock lock(projectMutex());
-    addObservers_.erase(std::remove(addObservers_.begin(), addObservers_.end(), observer),
-                        addObservers_.end());
-}
+void Track::detachAddObserver(TrackAddObserver* observer) { addObservers_.detach(observer); }
 
 VelaTime Track::startTime() const {
     ScopedReadLock lock(projectMutex());

@@ -1,6 +1,8 @@
 #pragma once
 
+#include <VelaMediaLib/model/AddObserverList.h>
 #include <VelaMediaLib/model/Cloneable.h>
+#include <VelaMediaLib/model/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/Media.h>
 #include <VelaMediaLib/model/SubTimelineParts.h>
 #include <VelaMediaLib/model/TrackAddObserver.h>
@@ -24,7 +26,7 @@ class Mixer;
 /// false on a new track); the locked flag is metadata ("isLocked").
 class Track : public SubTimelineParts<SubTimeline>,
               public Cloneable,
-              public TimeConverter,
+              public IdentityTimeConverter,
               public boost::enable_shared_from_this<Track> {
 public:
     /// Clips by start. The nodes come from a pool of the track's own, so a
@@ -160,13 +162,12 @@ private:
     /// preview, the edit, then the clip re-keyed under its new start.
     template <typename Edit>
     TransitionAndNeighbour editPlaced(const MediaPtr& media, const Range<VelaTime>& preview, Edit edit);
-    void tellObservers(bool added, const MediaPtr& media);
 
     std::unique_ptr<std::pmr::unsynchronized_pool_resource> nodePool_; // before the map that uses it
     MediaMap medias_;
     boost::weak_ptr<Mixer> parentMixer_;
     boost::weak_ptr<Media> parentStitched_;
-    std::vector<TrackAddObserver*> addObservers_;
+    AddObserverList<TrackAddObserver> addObservers_;
 };
 
 typedef boost::shared_ptr<Track> TrackPtr;

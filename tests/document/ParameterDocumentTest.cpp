@@ -5,6 +5,8 @@
 #include <VelaMediaLib/time/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
+#include "../JsonTestSupport.h"
+
 #include <gtest/gtest.h>
 #include <json/reader.h>
 #include <sstream>
@@ -12,15 +14,6 @@
 using namespace VelaMediaLib;
 
 namespace {
-
-Json::Value parse(const std::string& text) {
-    Json::Value value;
-    Json::CharReaderBuilder builder;
-    std::string errors;
-    std::istringstream in(text);
-    if (!Json::parseFromStream(builder, in, &value, &errors)) ADD_FAILURE() << errors << "\n" << text;
-    return value;
-}
 
 std::string written(const ParameterInterface& parameter, const std::string& name, int indent = 0) {
     std::ostringstream out;
@@ -31,7 +24,7 @@ std::string written(const ParameterInterface& parameter, const std::string& name
 
 // Writes the parameter inside an object, as documents hold parameters, and parses that back.
 Json::Value member(const ParameterInterface& parameter) {
-    return parse("{" + written(parameter, "p", 1) + "}")["p"];
+    return VelaMediaLib::testing::parseJson("{" + written(parameter, "p", 1) + "}")["p"];
 }
 
 const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
@@ -94,7 +87,7 @@ TEST(ParameterDocument, AnObjectParameterIsWrittenMemberByMemberInItsOrder) {
 
 TEST(ParameterDocument, ReadingKeyFramesFollowsItsSteps) {
     auto parameter = ParameterImpl<double>::create(project, "x", 0.0);
-    parameter->readFromJSON(parse(R"({"keyframes": [
+    parameter->readFromJSON(VelaMediaLib::testing::parseJson(R"({"keyframes": [
         {"time": 1, "duration": 2, "value": 4.0},
         {"endTime": "7/2", "value": 8.0, "interp": "esIn", "metadata": {"k": "v"}},
         {"endTime": 3, "duration": 2, "value": 5.0}]})"));
@@ -105,7 +98,7 @@ TEST(ParameterDocument, ReadingKeyFramesFollowsItsSteps) {
     EXPECT_EQ(parameter->keyframeAtTime(RationalTime(7, 2))->metaDataValue("k"), "v");
     EXPECT_EQ(parameter->keyframeAtTime(RationalTime(3))->interpolaterName(), ""); // follows the parameter
 
-    parameter->readFromJSON(parse("2.5"));
+    parameter->readFromJSON(VelaMediaLib::testing::parseJson("2.5"));
     EXPECT_EQ(*parameter->keyframeTimes(), std::vector<RationalTime>{RationalTime(0)});
     EXPECT_EQ(parameter->valueAtTime(RationalTime(9)), 2.5);
 }
@@ -114,23 +107,26 @@ TEST(ParameterDocument, AFailedReadChangesNothing) {
     auto parameter = ParameterImpl<double>::create(project, "x", 1.0);
     const auto before = parameter->clone();
     try {
-        parameter->readFromJSON(parse(
+        parameter->readFromJSON(VelaMediaLib::testing::parseJson(
             R"({"keyframes": [{"time": 0, "value": 3.0}, {"time": 5, "value": 1, "interp": "zzzz"}]})"));
         FAIL();
     } catch (const ParserException& e) {
         EXPECT_STREQ(e.what(), "trying to read an unknown interpolater");
     }
-    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0, "value": "text"}]})")),
+    EXPECT_THROW(parameter->readFromJSON(
+                     VelaMediaLib::testing::parseJson(R"({"keyframes": [{"time": 0, "value": "text"}]})")),
                  ParserException);
-    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 0}]})")), ParserException);
-    EXPECT_THROW(parameter->readFromJSON(parse(R"({"keyframes": [{"time": 1.5, "value": 1}]})")),
+    EXPECT_THROW(parameter->readFromJSON(VelaMediaLib::testing::parseJson(R"({"keyframes": [{"time": 0}]})")),
+                 ParserException);
+    EXPECT_THROW(parameter->readFromJSON(
+                     VelaMediaLib::testing::parseJson(R"({"keyframes": [{"time": 1.5, "value": 1}]})")),
                  ParserException);
     EXPECT_TRUE(*parameter == *before);
 }
 
 TEST(ParameterDocument, AnAnimationTakesLeadInlessValuesWithoutNewKeyFrames) {
     auto parameter = AnimationParam<double>::create(project, "scale", 1.0);
-    parameter->readFromJSON(parse(R"({"keyframes": [
+    parameter->readFromJSON(VelaMediaLib::testing::parseJson(R"({"keyframes": [
         {"endTime": 0, "value": 1.0},
         {"endTime": 30, "duration": 10, "value": 2.0},
         {"endTime": 40, "value": 3.0}]})"));

@@ -4,6 +4,8 @@
 #include <VelaMediaLib/time/VelaMediaLibException.h>
 
 #include <cmath>
+#include "../JsonTestSupport.h"
+
 #include <gtest/gtest.h>
 #include <json/reader.h>
 #include <limits>
@@ -13,15 +15,6 @@
 using namespace VelaMediaLib;
 
 namespace {
-
-Json::Value parse(const std::string& text) {
-    Json::Value value;
-    Json::CharReaderBuilder builder;
-    std::string errors;
-    std::istringstream in(text);
-    EXPECT_TRUE(Json::parseFromStream(builder, in, &value, &errors)) << errors;
-    return value;
-}
 
 template <typename T>
 std::string text(const T& value) {
@@ -37,44 +30,53 @@ TEST(ValueFormatter, DoublesReadBackAsTheSameDouble) {
     std::uniform_real_distribution<double> spread(-1e6, 1e6);
     for (int i = 0; i < 2000; ++i) {
         const double value = spread(random) * std::pow(10.0, double(i % 40) - 20.0);
-        EXPECT_EQ(ValueFormatter<double>::read(parse(text(value))), value) << text(value);
+        EXPECT_EQ(ValueFormatter<double>::read(VelaMediaLib::testing::parseJson(text(value))), value)
+            << text(value);
     }
     EXPECT_EQ(text(1.0), "1.0");
     EXPECT_EQ(text(0.1), "0.1");
     EXPECT_EQ(text(std::numeric_limits<double>::infinity()), "null");
-    EXPECT_TRUE(std::isnan(ValueFormatter<double>::read(parse("null"))));
+    EXPECT_TRUE(std::isnan(ValueFormatter<double>::read(VelaMediaLib::testing::parseJson("null"))));
 }
 
 TEST(ValueFormatter, StringsAreEscapedAsJSONRequires) {
     const std::string awkward = std::string("a\"b\\c\n\t\x01 \xe2\x82\xac", 12);
     EXPECT_EQ(text(awkward), "\"a\\\"b\\\\c\\n\\t\\u0001 \xe2\x82\xac\"");
-    EXPECT_EQ(ValueFormatter<std::string>::read(parse(text(awkward))), awkward);
+    EXPECT_EQ(ValueFormatter<std::string>::read(VelaMediaLib::testing::parseJson(text(awkward))), awkward);
 }
 
 TEST(ValueFormatter, RationalsAndTicks) {
     EXPECT_EQ(text(SafeRational(60000, 1001)), "\"60000/1001\"");
     EXPECT_EQ(text(SafeRational(30)), "30");
-    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(parse("\"60000/1001\"")), SafeRational(60000, 1001));
-    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(parse("30")), SafeRational(30));
+    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"60000/1001\"")),
+              SafeRational(60000, 1001));
+    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("30")), SafeRational(30));
     try {
-        JSONReader::jsonValueAsVelaRational(parse("1.5"));
+        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("1.5"));
         FAIL();
     } catch (const ParserException& e) {
         EXPECT_STREQ(e.what(), "Invalid project json - unsupported json type for VelaRational: 1.5");
     }
-    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(parse("\"1/x\"")), std::invalid_argument);
-    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(parse("\"99999999999999999999/1\"")), std::out_of_range);
-    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(parse("\"1/0\"")), boost::bad_rational);
+    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/x\"")),
+                 std::invalid_argument);
+    EXPECT_THROW(
+        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"99999999999999999999/1\"")),
+        std::out_of_range);
+    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/0\"")),
+                 boost::bad_rational);
     EXPECT_EQ(text(Range<long long>(10, 25)), "[10, 25]");
-    EXPECT_EQ(ValueFormatter<Range<long long>>::read(parse("[10, 25]")), Range<long long>(10, 25));
+    EXPECT_EQ(ValueFormatter<Range<long long>>::read(VelaMediaLib::testing::parseJson("[10, 25]")),
+              Range<long long>(10, 25));
 }
 
 TEST(ValueFormatter, WrongShapesAreRefusedWithTheValue) {
-    EXPECT_THROW(ValueFormatter<Point3d>::read(parse("[1, 2]")), ParserException);
-    EXPECT_THROW(ValueFormatter<TemplatedColor<int>>::read(parse("[1, 2, 3, 4.5]")), ParserException);
-    EXPECT_THROW(ValueFormatter<int>::read(parse("\"3\"")), ParserException);
-    EXPECT_THROW(ValueFormatter<TextAttributeList>::read(
-                     parse(R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
+    EXPECT_THROW(ValueFormatter<Point3d>::read(VelaMediaLib::testing::parseJson("[1, 2]")), ParserException);
+    EXPECT_THROW(
+        ValueFormatter<TemplatedColor<int>>::read(VelaMediaLib::testing::parseJson("[1, 2, 3, 4.5]")),
+        ParserException);
+    EXPECT_THROW(ValueFormatter<int>::read(VelaMediaLib::testing::parseJson("\"3\"")), ParserException);
+    EXPECT_THROW(ValueFormatter<TextAttributeList>::read(VelaMediaLib::testing::parseJson(
+                     R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
                  ParserException);
 }
 

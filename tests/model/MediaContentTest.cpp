@@ -1,3 +1,4 @@
+#include "../JsonTestSupport.h"
 #include "MediaTestSupport.h"
 
 #include <VelaMediaLib/document/XMLOptions.h>
@@ -170,11 +171,7 @@ TEST_F(MediaContent, WrittenAsAMediaObject) {
     std::ostringstream out;
     XMLOptions options(out);
     media->toJSON(options, 0);
-    Json::Value json;
-    std::istringstream in(out.str());
-    Json::CharReaderBuilder builder;
-    std::string errors;
-    ASSERT_TRUE(Json::parseFromStream(builder, in, &json, &errors)) << errors << out.str();
+    const Json::Value json = parseJson(out.str());
     EXPECT_EQ(json["id"].asInt(), 1);
     EXPECT_EQ(json["_type"].asString(), "PlaceholderMedia");
     EXPECT_EQ(json["attributes"]["note"].asString(), "intro");
