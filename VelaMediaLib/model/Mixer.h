@@ -71,15 +71,6 @@ public:
                                          std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
     virtual boost::shared_ptr<Mixer> cloneEmpty() const = 0;
 
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
-        return time;
-    }
     /// The group holding the mixer, if any: a timeline's mixer has no further parent.
     const TimeConverter* parentTimeConverter() const override { return parentGroup().get(); }
 

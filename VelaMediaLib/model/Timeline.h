@@ -83,15 +83,6 @@ public:
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
     VelaTime endTimeNotIncludingHiddenAndMutedTracks() const;
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
-        return time;
-    }
 
     // Canvas, camera, markers, sound
     boost::shared_ptr<Attribute<int>> attributeWidth() const { return attribute<int>("width"); }

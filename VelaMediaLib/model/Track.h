@@ -131,15 +131,6 @@ public:
     /// The end of the last clip: a track's time starts at 0.
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override {
-        return time;
-    }
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override {
-        return time;
-    }
     /// The mixer, which passes time on to its group, if any.
     const TimeConverter* parentTimeConverter() const override;
 
