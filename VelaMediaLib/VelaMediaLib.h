@@ -1,9 +1,22 @@
 #pragma once
 // The whole public interface of VelaMediaLib.
 
+#include <VelaMediaLib/commands/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/BatchCmd.h>
+#include <VelaMediaLib/commands/ChangeTrackFlagCmd.h>
+#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
+#include <VelaMediaLib/commands/Command.h>
+#include <VelaMediaLib/commands/CommandExecutor.h>
+#include <VelaMediaLib/commands/CommandHandler.h>
+#include <VelaMediaLib/commands/CommandHistory.h>
+#include <VelaMediaLib/commands/CommandPair.h>
+#include <VelaMediaLib/commands/LambdaMultiCommand.h>
+#include <VelaMediaLib/commands/MultiCommand.h>
+#include <VelaMediaLib/commands/NullCmd.h>
 #include <VelaMediaLib/document/JSONReader.h>
 #include <VelaMediaLib/document/JSONWriter.h>
 #include <VelaMediaLib/document/ValueFormatter.h>
+#include <VelaMediaLib/document/VersionInfo.h>
 #include <VelaMediaLib/document/XMLOptions.h>
 #include <VelaMediaLib/effects/Effect.h>
 #include <VelaMediaLib/effects/EffectList.h>
@@ -15,6 +28,7 @@
 #include <VelaMediaLib/model/AudioPosition.h>
 #include <VelaMediaLib/model/CaptionAttributes.h>
 #include <VelaMediaLib/model/CaptionData.h>
+#include <VelaMediaLib/model/ClipBoard.h>
 #include <VelaMediaLib/model/Cloneable.h>
 #include <VelaMediaLib/model/ColorMedia.h>
 #include <VelaMediaLib/model/EdgeModifiable.h>
@@ -24,6 +38,7 @@
 #include <VelaMediaLib/model/IdentManager.h>
 #include <VelaMediaLib/model/Identified.h>
 #include <VelaMediaLib/model/IdentityTimeConverter.h>
+#include <VelaMediaLib/model/InternalProject.h>
 #include <VelaMediaLib/model/KeystrokeData.h>
 #include <VelaMediaLib/model/LockData.h>
 #include <VelaMediaLib/model/Media.h>
@@ -37,15 +52,18 @@
 #include <VelaMediaLib/model/Parametric.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
 #include <VelaMediaLib/model/Point3d.h>
+#include <VelaMediaLib/model/Project.h>
 #include <VelaMediaLib/model/RationalMediaEditor.h>
 #include <VelaMediaLib/model/RationalStaticEditor.h>
 #include <VelaMediaLib/model/RationalTemporalEditor.h>
 #include <VelaMediaLib/model/Rect.h>
 #include <VelaMediaLib/model/RemoveTrackInfo.h>
+#include <VelaMediaLib/model/SourceBin.h>
 #include <VelaMediaLib/model/Sourceable.h>
 #include <VelaMediaLib/model/SubProject.h>
 #include <VelaMediaLib/model/SubTimeline.h>
 #include <VelaMediaLib/model/SubTimelineParts.h>
+#include <VelaMediaLib/model/SymbolTable.h>
 #include <VelaMediaLib/model/TemplatedColor.h>
 #include <VelaMediaLib/model/Temporal.h>
 #include <VelaMediaLib/model/TextAttributeList.h>
@@ -53,6 +71,8 @@
 #include <VelaMediaLib/model/TimelineAddObserver.h>
 #include <VelaMediaLib/model/Track.h>
 #include <VelaMediaLib/model/TrackAddObserver.h>
+#include <VelaMediaLib/model/TrackMagnetizer.h>
+#include <VelaMediaLib/model/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/model/TransformMatrix.h>
 #include <VelaMediaLib/model/Transformer.h>
 #include <VelaMediaLib/model/Transition.h>

@@ -18,7 +18,9 @@ class Attributable {
 public:
     typedef boost::shared_ptr<AttributeInterface> AttributePtr;
 
-    explicit Attributable(const boost::weak_ptr<const ThreadSafe>& token) : attributesToken_(token) {}
+    explicit Attributable(
+        const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())
+        : attributesToken_(token) {}
     virtual ~Attributable() = default;
 
     template <typename T>
@@ -57,6 +59,8 @@ public:
     void writeAttributes(JSONWriter& writer) const;
 
 protected:
+    /// For an owner that learns its project's token after construction (the project itself).
+    void setAttributesToken(const boost::weak_ptr<const ThreadSafe>& token) { attributesToken_ = token; }
     /// Copies every attribute's value into another object's attributes.
     void copyAttributesTo(Attributable& other) const;
 

@@ -1,5 +1,7 @@
 #include <VelaMediaLib/model/LockData.h>
 
+#include <VelaMediaLib/commands/ChangeTrackFlagCmd.h>
+
 namespace VelaMediaLib {
 
 TrackPtr LockData::trackOf(const Media& media) {
@@ -43,6 +45,18 @@ std::vector<TrackPtr> LockData::GetAllEditableTracks(const Timeline& timeline) {
         for (const TrackPtr& track : timeline.mixer(name)->tracks())
             if (IsTrackEditable(*track)) editable.push_back(track);
     return editable;
+}
+
+boost::shared_ptr<Command> LockData::GetChangeIsLockedCommand(const TrackPtr& track, bool locked) {
+    return ChangeTrackFlagCmd::create(track, ChangeTrackFlagCmd::Locked, locked);
+}
+
+boost::shared_ptr<Command> LockData::GetChangeIsHiddenCommand(const TrackPtr& track, bool hidden) {
+    return ChangeTrackFlagCmd::create(track, ChangeTrackFlagCmd::Hidden, hidden);
+}
+
+boost::shared_ptr<Command> LockData::GetChangeIsSoloCommand(const TrackPtr& track, bool solo) {
+    return ChangeTrackFlagCmd::create(track, ChangeTrackFlagCmd::Solo, solo);
 }
 
 void LockData::Attach(Track& track, Observer* observer) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/commands/Command.h>
 #include <VelaMediaLib/model/Timeline.h>
 
 namespace VelaMediaLib {
@@ -28,6 +29,10 @@ public:
 
     static std::vector<TrackPtr> GetAllEditableTracks(const Timeline& timeline);
     static void SetIsLocked(Track& track, bool locked) { track.setIsLocked(locked); }
+    /// Undoable commands that set a track's locked, hidden or solo flag.
+    static boost::shared_ptr<Command> GetChangeIsLockedCommand(const TrackPtr& track, bool locked);
+    static boost::shared_ptr<Command> GetChangeIsHiddenCommand(const TrackPtr& track, bool hidden);
+    static boost::shared_ptr<Command> GetChangeIsSoloCommand(const TrackPtr& track, bool solo);
     /// Observes a track's locked flag (the observer hears each change of it).
     static void Attach(Track& track, Observer* observer);
     static void Detach(Track& track, Observer* observer);

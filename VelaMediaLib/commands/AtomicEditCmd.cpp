@@ -1,0 +1,64 @@
+#include <VelaMediaLib/commands/AtomicEditCmd.h>
+
+namespace VelaMediaLib {
+
+bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
+    if (!result.second) return false;
+    resultTrack_ = result.first;
+    resultMedia_ = result.second;
+    return true;
+}
+
+boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
+    const boost::shared_ptr<MoveCmd> command(new MoveCmd(track, media, delta));
+    command->setName("Move");
+    return command;
+}
+
+bool MoveCmd::execute(CommandHandler* handler) { return keep(handler->moveMedia(track_, media_, amount_)); }
+
+bool MoveCmd::unexecute(CommandHandler* handler) {
+    return bool(handler->moveMedia(resultTrack_, resultMedia_, -amount_).second);
+}
+
+CommandPtr MoveCmd::combine(const CommandPtr& later) {
+    const boost::shared_ptr<MoveCmd> move = boost::dynamic_pointer_cast<MoveCmd>(later);
+    if (!move || move->media_ != resultMedia_ || move->track_ != resultTrack_) return Command::combine(later);
+    const boost::shared_ptr<MoveCmd> both = create(track_, media_, amount_ + move->amount_);
+    both->resultTrack_ = move->resultTrack_;
+    both->resultMedia_ = move->resultMedia_;
+    return both;
+}
+
+boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const MediaPtr& media,
+                                                   VelaTime start) {
+    const boost::shared_ptr<AddMediaCmd> command(new AddMediaCmd(track, media, start));
+    command->setName("Add Media");
+    return command;
+}
+
+bool AddMediaCmd::execute(CommandHandler* handler) {
+    return keep(handler->addMedia(track_, media_, amount_));
+}
+
+bool AddMediaCmd::unexecute(CommandHandler* handler) {
+    return bool(handler->removeMedia(resultTrack_, resultMedia_).second);
+}
+
+boost::shared_ptr<RemoveMediaCmd> RemoveMediaCmd::create(const TrackPtr& track, const MediaPtr& media) {
+    const boost::shared_ptr<RemoveMediaCmd> command(new RemoveMediaCmd(track, media));
+    command->setName("Remove Media");
+    return command;
+}
+
+bool RemoveMediaCmd::execute(CommandHandler* handler) {
+    if (!media_) return false;
+    amount_ = media_->startTime(); // where it goes back on undo
+    return keep(handler->removeMedia(track_, media_));
+}
+
+bool RemoveMediaCmd::unexecute(CommandHandler* handler) {
+    return bool(handler->addMedia(resultTrack_, resultMedia_, amount_).second);
+}
+
+} // namespace VelaMediaLib

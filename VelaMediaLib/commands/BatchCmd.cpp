@@ -1,0 +1,74 @@
+#include <VelaMediaLib/commands/BatchCmd.h>
+
+#include <VelaMediaLib/time/VelaMediaLibException.h>
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace VelaMediaLib {
+
+boost::shared_ptr<BatchCmd> BatchCmd::create() { return boost::shared_ptr<BatchCmd>(new BatchCmd); }
+
+boost::shared_ptr<BatchCmd> BatchCmd::create(const CommandPtr& command) {
+    const boost::shared_ptr<BatchCmd> batch = create();
+    batch->addCommand(command);
+    return batch;
+}
+
+boost::shared_ptr<BatchCmd> BatchCmd::create(const std::vector<CommandPtr>& commands) {
+    const boost::shared_ptr<BatchCmd> batch = create();
+    for (const CommandPtr& command : commands) batch->addCommand(command);
+    return batch;
+}
+
+void BatchCmd::addCommand(const CommandPtr& command) {
+    if (!command) throw VelaMediaLibException("no command to add to a batch");
+    if (commands_.size() >= commands_.max_size()) throw std::length_error("list too long");
+    commands_.push_back(command);
+}
+
+bool BatchCmd::removeCommand(const CommandPtr& command) {
+    const auto found = std::find(commands_.begin(), commands_.end(), command);
+    if (found == commands_.end()) return false;
+    commands_.erase(found);
+    return true;
+}
+
+void BatchCmd::reverseOrder() { std::reverse(commands_.begin(), commands_.end()); }
+
+void BatchCmd::addProgressCallbackForExecuteCommands(const boost::weak_ptr<ProgressCallback>& callback) {
+    progress_.push_back(callback);
+}
+
+std::string BatchCmd::name() const {
+    const std::string own = Command::name();
+    if (!own.empty() || commands_.empty()) return own;
+    return commands_.front()->name();
+}
+
+void BatchCmd::reportProgress(double fraction) {
+    for (const boost::weak_ptr<ProgressCallback>& held : progress_)
+        if (const boost::shared_ptr<ProgressCallback> callback = held.lock())
+            if (*callback) (*callback)(fraction);
+}
+
+void BatchCmd::executeCommands(const CommandHandler*) {
+    const double count = double(commands_.size());
+    for (size_t i = 0; i < commands_.size(); ++i) {
+        execute(commands_[i]);
+        reportProgress(double(i + 1) / count);
+    }
+    reportProgress(1.0);
+}
+
+CommandPtr BatchCmd::combineCommands(const CommandPtr& a, const CommandPtr& b) {
+    if (const boost::shared_ptr<BatchCmd> batch = boost::dynamic_pointer_cast<BatchCmd>(a)) {
+        batch->addCommand(b);
+        return batch;
+    }
+    const boost::shared_ptr<BatchCmd> batch = create(a);
+    batch->addCommand(b);
+    return batch;
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <VelaMediaLib/commands/Command.h>
+#include <VelaMediaLib/model/Track.h>
+
+namespace VelaMediaLib {
+
+/// Sets one of a track's flags (locked, hidden or solo) and puts back the
+/// value it had on undo.
+class ChangeTrackFlagCmd : public Command {
+public:
+    enum Flag { Locked, Hidden, Solo };
+
+    static boost::shared_ptr<ChangeTrackFlagCmd> create(const TrackPtr& track, Flag flag, bool value);
+
+    bool execute(CommandHandler*) override;
+    bool unexecute(CommandHandler*) override;
+
+private:
+    ChangeTrackFlagCmd(const TrackPtr& track, Flag flag, bool value)
+        : track_(track), flag_(flag), value_(value) {}
+    bool current() const;
+    void set(bool value);
+
+    TrackPtr track_;
+    Flag flag_;
+    bool value_;
+    bool previous_ = false;
+};
+
+} // namespace VelaMediaLib

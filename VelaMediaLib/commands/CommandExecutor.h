@@ -1,0 +1,19 @@
+#pragma once
+
+#include <VelaMediaLib/commands/Command.h>
+
+namespace VelaMediaLib {
+
+/// Anything that executes commands: the project's history, or a composite
+/// recording its sub-commands. Edit code is written against an executor so
+/// that it works at the top level and inside a composite alike.
+class CommandExecutor {
+public:
+    virtual ~CommandExecutor() = default;
+    virtual bool execute(const CommandPtr& command) = 0;
+    /// Whether the executor is undoing or redoing: what changes then is a
+    /// replay of recorded edits, which observers must not answer with new ones.
+    virtual bool isReplaying() const { return false; }
+};
+
+} // namespace VelaMediaLib

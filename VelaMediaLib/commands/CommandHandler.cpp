@@ -1,0 +1,54 @@
+#include <VelaMediaLib/commands/CommandHandler.h>
+
+#include <VelaMediaLib/model/GenericTrack.h>
+
+namespace VelaMediaLib {
+namespace {
+
+// Runs a track edit; the model's refusals become an empty answer.
+template <typename Edit>
+CommandHandler::TrackAndMedia attempt(const TrackPtr& track, const MediaPtr& media, Edit edit) {
+    if (!track || !media) return CommandHandler::TrackAndMedia();
+    try {
+        edit();
+    } catch (const CollisionException&) {
+        return CommandHandler::TrackAndMedia();
+    } catch (const InvalidTrimRangeException&) {
+        return CommandHandler::TrackAndMedia();
+    } catch (const AddRemoveException&) {
+        return CommandHandler::TrackAndMedia();
+    }
+    return CommandHandler::TrackAndMedia(track, media);
+}
+
+} // namespace
+
+CommandHandler::TrackAndMedia
+ProjectIndependentCommandHandler::moveMedia(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
+    return attempt(track, media, [&] { track->move(media, delta); });
+}
+
+CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::trimMediaStart(const TrackPtr& track,
+                                                                               const MediaPtr& media,
+                                                                               VelaTime delta) {
+    return attempt(track, media, [&] { track->trimStart(media, delta); });
+}
+
+CommandHandler::TrackAndMedia
+ProjectIndependentCommandHandler::trimMediaEnd(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
+    return attempt(track, media, [&] { track->trimEnd(media, delta); });
+}
+
+CommandHandler::TrackAndMedia
+ProjectIndependentCommandHandler::addMedia(const TrackPtr& track, const MediaPtr& media, VelaTime start) {
+    const boost::shared_ptr<GenericTrack> generic = boost::dynamic_pointer_cast<GenericTrack>(track);
+    if (!generic) return TrackAndMedia();
+    return attempt(track, media, [&] { generic->addMedia(media, start); });
+}
+
+CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::removeMedia(const TrackPtr& track,
+                                                                            const MediaPtr& media) {
+    return attempt(track, media, [&] { track->removeMedia(media); });
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <VelaMediaLib/commands/Command.h>
+
+namespace VelaMediaLib {
+
+/// Two commands executed as one: the second only when the first took effect,
+/// and undone in reverse order. If the second refuses, the first is undone.
+class CommandPair : public Command {
+public:
+    static boost::shared_ptr<CommandPair> create(const CommandPtr& first, const CommandPtr& second);
+
+    const CommandPtr& command1() const { return first_; }
+    const CommandPtr& command2() const { return second_; }
+
+    bool execute(CommandHandler* handler) override;
+    bool unexecute(CommandHandler* handler) override;
+    bool reexecute(CommandHandler* handler) override;
+
+private:
+    CommandPair(const CommandPtr& first, const CommandPtr& second) : first_(first), second_(second) {}
+    CommandPtr first_, second_;
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,15 @@
+#pragma once
+
+#include <string>
+
+namespace VelaMediaLib {
+
+/// Who wrote a document, and in which version of its format.
+struct VersionInfo {
+    std::string version;
+    std::string clientName;
+    std::string clientVersion;
+    std::string platform;
+};
+
+} // namespace VelaMediaLib
