@@ -138,6 +138,62 @@ void clips() {
     printClip("unchanged", *clip);
 }
 
+std::string activeAt(const Timeline& timeline, VelaTime tick) {
+    std::string names;
+    for (const MediaPtr& media : timeline.allMediasAtTime(tick))
+        names += (names.empty() ? "" : "+") + media->identifier();
+    return names.empty() ? "-" : names;
+}
+
+void printTracks(const char* step, const Project& project, const std::vector<TrackPtr>& tracks) {
+    std::cout << "  " << std::left << std::setw(34) << step << std::right;
+    for (const TrackPtr& track : tracks) {
+        std::cout << " " << track->identifier() << ":";
+        for (const MediaPtr& media : track->medias())
+            std::cout << " " << media->identifier() << "[" << media->startTime() << "," << media->endTime()
+                      << ")";
+    }
+    std::cout << "\n  " << std::setw(34) << ""
+              << " active at";
+    for (VelaTime tick : {0, 15, 25, 45})
+        std::cout << "  " << tick << ":" << activeAt(*project.timeline(), tick);
+    std::cout << "   (undo steps " << project.commandHistory()->undoStack().size() << ")\n";
+}
+
+void project() {
+    std::cout << "\nA project: clips on a magnetic and a plain track, edited through the history\n";
+    const ProjectPtr project = Project::create(30, 1);
+    const auto mixer = project->newMixer("main");
+    std::vector<TrackPtr> tracks;
+    for (const char* name : {"magnetic", "plain"}) {
+        const auto track = project->timeline()->newTrack();
+        track->setIdentifier(name);
+        project->timeline()->addTrack(mixer, track);
+        tracks.push_back(track);
+    }
+    tracks[0]->magneticAttribute()->setValue(true);
+    std::vector<MediaPtr> clips;
+    for (int i = 0; i < 6; ++i) {
+        clips.push_back(PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10));
+        clips.back()->setIdentifier(std::string(1, char('A' + i)));
+        project->execute(AddMediaCmd::create(tracks[size_t(i / 3)], clips.back(), (i % 3) * 20));
+    }
+    printTracks("placed at 0, 20, 40 (magnet closes up)", *project, tracks);
+    project->execute(RemoveMediaCmd::create(tracks[0], clips[1]));
+    printTracks("removed B (the gap closes)", *project, tracks);
+    project->execute(RemoveMediaCmd::create(tracks[1], clips[4]));
+    printTracks("removed E (the gap stays)", *project, tracks);
+    project->undo();
+    printTracks("undo: E back", *project, tracks);
+    project->undo();
+    printTracks("undo: the gap opens again", *project, tracks);
+    project->undo();
+    printTracks("undo: B back", *project, tracks);
+    project->redo();
+    project->redo();
+    printTracks("redo twice: B gone, gaps closed", *project, tracks);
+}
+
 } // namespace
 
 int main() {
@@ -148,5 +204,6 @@ int main() {
     rounding();
     parameters();
     clips();
+    project();
     return 0;
 }

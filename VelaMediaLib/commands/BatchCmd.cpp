@@ -61,13 +61,22 @@ void BatchCmd::executeCommands(const CommandHandler*) {
     reportProgress(1.0);
 }
 
+// Combining folds commands that have run: they go on the batch's inner
+// history as done, so that undoing the batch undoes them.
+void BatchCmd::appendExecuted(const CommandPtr& command) {
+    addCommand(command);
+    CommandHistoryState state = commandHistory().state();
+    state.undoStack.push_back(command);
+    commandHistory().restoreState(state);
+}
+
 CommandPtr BatchCmd::combineCommands(const CommandPtr& a, const CommandPtr& b) {
-    if (const boost::shared_ptr<BatchCmd> batch = boost::dynamic_pointer_cast<BatchCmd>(a)) {
-        batch->addCommand(b);
-        return batch;
+    boost::shared_ptr<BatchCmd> batch = boost::dynamic_pointer_cast<BatchCmd>(a);
+    if (!batch) {
+        batch = create();
+        batch->appendExecuted(a);
     }
-    const boost::shared_ptr<BatchCmd> batch = create(a);
-    batch->addCommand(b);
+    batch->appendExecuted(b);
     return batch;
 }
 

@@ -24,7 +24,8 @@ public:
     void addProgressCallbackForExecuteCommands(const boost::weak_ptr<ProgressCallback>& callback);
     std::string name() const override;
 
-    /// a with b appended when a is a batch already, otherwise a new batch of both.
+    /// Folds two commands that have run into one undo step: b appended to a when
+    /// a is a batch already, otherwise a new batch of both.
     static CommandPtr combineCommands(const CommandPtr& a, const CommandPtr& b);
 
 protected:
@@ -33,6 +34,7 @@ protected:
 private:
     BatchCmd() = default;
     void reportProgress(double fraction);
+    void appendExecuted(const CommandPtr& command);
 
     std::vector<CommandPtr> commands_;
     std::vector<boost::weak_ptr<ProgressCallback>> progress_;

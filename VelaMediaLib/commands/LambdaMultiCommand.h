@@ -17,10 +17,11 @@ public:
     template <typename F>
     static boost::shared_ptr<LambdaMultiCommand> create(F function, const std::string& name = std::string()) {
         boost::shared_ptr<LambdaMultiCommand> command(new LambdaMultiCommand);
-        if constexpr (std::is_invocable<F, MultiCommand*>::value) {
-            command->function_ = function;
-        } else {
+        // Asked in this order because boost::function converts from anything.
+        if constexpr (std::is_invocable<F, MultiCommand::ExecuteFunc>::value) {
             command->function_ = [function](MultiCommand* composite) { function(composite->executeFunc()); };
+        } else {
+            command->function_ = function;
         }
         command->setName(name);
         return command;

@@ -1,0 +1,56 @@
+#include <VelaMediaLib/commands/AtomicEditCmd.h>
+#include <VelaMediaLib/model/InternalProject.h>
+#include <VelaMediaLib/model/PlaceholderMedia.h>
+
+#include <atomic>
+#include <gtest/gtest.h>
+#include <thread>
+
+using namespace VelaMediaLib;
+
+// Readers ask which clips are active and what parameters are worth while
+// one thread executes, undoes and redoes moves. A reader never sees two
+// clips over one tick, nor a clip outside the places the edits allow.
+TEST(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
+    const ProjectPtr project = Project::create(30, 1);
+    const auto mixer = project->newMixer("main");
+    const auto track = project->timeline()->newTrack();
+    project->timeline()->addTrack(mixer, track);
+    track->magneticAttribute()->setValue(true);
+    std::vector<boost::shared_ptr<PlaceholderMedia>> clips;
+    for (int i = 0; i < 20; ++i) {
+        clips.push_back(PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10));
+        clips.back()->opacity()->addKeyFrame(RationalTime(10), 0.0, RationalTime(0));
+        project->execute(AddMediaCmd::create(track, clips.back(), i * 10));
+    }
+    std::atomic<bool> done{false};
+    std::atomic<int> wrong{0};
+    std::vector<std::thread> readers;
+    for (int r = 0; r < 2; ++r)
+        readers.emplace_back([&, r] {
+            for (long long tick = r; !done.load(); tick = (tick + 7) % 260) {
+                const Track::Pair pair = track->mediaAtTime(tick);
+                if (pair.second && pair.first->endTime() != pair.second->startTime()) ++wrong;
+                if (pair.first) {
+                    const double opacity =
+                        boost::dynamic_pointer_cast<PlaceholderMedia>(pair.first)
+                            ->opacity()
+                            ->valueAtTime(pair.first->fromGlobalToParametricTime(RationalTime(tick)));
+                    if (opacity < 0.0 || opacity > 1.0) ++wrong;
+                }
+                project->timeline()->allMediasAtTime(tick);
+            }
+        });
+    for (int i = 0; i < 300; ++i) {
+        const auto last = clips.back();
+        project->execute(MoveCmd::create(track, last, 30)); // the magnetizer pulls it back
+        project->undo();
+        project->redo();
+        project->undo();
+        project->undo();
+    }
+    done = true;
+    for (std::thread& reader : readers) reader.join();
+    EXPECT_EQ(wrong.load(), 0);
+    EXPECT_EQ(clips.back()->startTime(), 190);
+}

@@ -1,0 +1,202 @@
+#include <VelaMediaLib/commands/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/BatchCmd.h>
+#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
+#include <VelaMediaLib/commands/LambdaMultiCommand.h>
+#include <VelaMediaLib/model/InternalProject.h>
+#include <VelaMediaLib/model/LockData.h>
+#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/model/SymbolTable.h>
+
+#include <gtest/gtest.h>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+class ProjectTest : public ::testing::Test {
+protected:
+    ProjectPtr project = Project::create(30, 1);
+    boost::shared_ptr<GenericMixer> mixer = project->newMixer("main");
+    boost::shared_ptr<GenericTrack> track = newTrack();
+
+    boost::shared_ptr<GenericTrack> newTrack() {
+        const auto made = project->timeline()->newTrack();
+        project->timeline()->addTrack(mixer, made);
+        return made;
+    }
+    MediaPtr clip(VelaTime duration) {
+        return PlaceholderMedia::create(project->token(), project->editRateToken(), 0, duration);
+    }
+    MediaPtr place(VelaTime start, VelaTime duration) {
+        const MediaPtr media = clip(duration);
+        EXPECT_TRUE(project->execute(AddMediaCmd::create(track, media, start)));
+        return media;
+    }
+    std::vector<VelaTime> starts() const {
+        std::vector<VelaTime> result;
+        for (const MediaPtr& media : track->medias()) result.push_back(media->startTime());
+        return result;
+    }
+};
+
+} // namespace
+
+TEST(ProjectCreation, RatesAndDefaults) {
+    struct Case {
+        unsigned long numerator, denominator;
+        int frameRate, sampleRate;
+    };
+    for (const Case& c : {Case{30, 1, 30, 44100}, Case{25, 1, 25, 44100}, Case{24, 1, 30, 44100},
+                          Case{48000, 1, 30, 48000}, Case{30000, 1001, 30, 44100}}) {
+        const ProjectPtr project = Project::create(c.numerator, c.denominator);
+        EXPECT_EQ(project->videoFormatFrameRateAttribute()->value(), c.frameRate) << c.numerator;
+        EXPECT_EQ(project->audioFormatSampleRateAttribute()->value(), c.sampleRate) << c.numerator;
+    }
+    EXPECT_EQ(Project::create(60, 2)->editRate(), boost::rational<unsigned long>(30, 1));
+    EXPECT_THROW(Project::create(30, 0), boost::bad_rational);
+    const ProjectPtr project = Project::create(30, 1);
+    EXPECT_EQ(project->targetLoudnessAttribute()->value(), -18.0);
+    EXPECT_FALSE(project->shouldApplyLoudnessNormalizationAttribute()->value());
+    EXPECT_TRUE(project->allowSubFrameEditingAttribute()->value());
+    EXPECT_EQ(project->authorAttribute()->value(), "");
+    EXPECT_EQ(project->sourceBin()->size(), 0u);
+    EXPECT_EQ(project->commandHistory()->undoLimit(), -1);
+    project->setUndoLimit(5);
+    EXPECT_EQ(project->commandHistory()->undoLimit(), 5);
+    project->setAuthorVersionInfo(VersionInfo{"6.0", "Pelorus", "2.1", "linux"});
+    EXPECT_EQ(project->metaDataValue("authoringClientName:name"), "Pelorus");
+    EXPECT_EQ(project->metaDataValue("authoringClientName:platform"), "linux");
+    EXPECT_EQ(project->metaDataValue("authoringClientName:version"), "2.1");
+}
+
+TEST(ProjectCreation, ObjectsFindTheProjectLockAndOutliveIt) {
+    boost::weak_ptr<const ThreadSafe> token;
+    MediaPtr survivor;
+    {
+        const ProjectPtr project = Project::create(30, 1);
+        token = project->token();
+        survivor = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
+        EXPECT_FALSE(token.expired());
+    }
+    EXPECT_TRUE(token.expired());
+    survivor->trimEnd(5); // no project: no lock, still works
+    EXPECT_EQ(survivor->duration(), 5);
+}
+
+TEST(SymbolTable, AnIdentifierAnswersOnlyForKindsItIs) {
+    const ProjectPtr project = Project::create(30, 1);
+    SymbolTable symbols;
+    const MediaPtr media = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
+    symbols.addSymbol(7, project->timeline());
+    symbols.addSymbol(8, media);
+    EXPECT_FALSE(symbols.symbolForIdent<Media>(7));
+    EXPECT_EQ(symbols.symbolForIdent<Timeline>(7), project->timeline());
+    EXPECT_EQ(symbols.symbolForIdent<Media>(8), media);
+    EXPECT_TRUE(symbols.symbolForIdent<Parametric>(8));
+    EXPECT_TRUE(symbols.symbolForIdent<PlaceholderMedia>(8));
+    EXPECT_FALSE(symbols.symbolForIdent<Media>(9));
+    EXPECT_FALSE(symbols.hasSymbolForIdent(9));
+}
+
+TEST_F(ProjectTest, AtomicCommandsAndTheirUndo) {
+    const MediaPtr a = place(0, 10), b = place(20, 10);
+    EXPECT_FALSE(
+        project->execute(AddMediaCmd::create(track, clip(10), 5))); // collides: refused, not recorded
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 2u);
+    EXPECT_TRUE(project->execute(MoveCmd::create(track, b, 5)));
+    EXPECT_FALSE(project->execute(MoveCmd::create(track, b, -20))); // onto a
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 25}));
+    EXPECT_TRUE(project->execute(RemoveMediaCmd::create(track, a)));
+    EXPECT_EQ(track->numMedias(), 1u);
+    project->undo();
+    project->undo();
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 20}));
+    project->redo();
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 25}));
+    project->execute(MoveCmd::create(track, b, 5));
+    project->combineLastCommands();
+    project->undo();
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 20})); // both moves undone as one
+}
+
+TEST_F(ProjectTest, ACompositeWhoseThirdStepThrowsLeavesTheProjectAsItWas) {
+    const MediaPtr a = place(0, 10), b = place(20, 10);
+    const CommandHistoryState before = project->commandState();
+    const auto composite = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->execute(MoveCmd::create(track, a, 100));
+        self->execute(MoveCmd::create(track, b, 100));
+        self->execute(CloseGapsOnTrackCmd::create(TrackPtr())); // throws
+    });
+    EXPECT_THROW(project->execute(composite), VelaMediaLibException);
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 20}));
+    EXPECT_EQ(project->commandState().undoStack, before.undoStack);
+}
+
+TEST_F(ProjectTest, AMagneticTrackClosesItsGapsAsAnUndoStepOfItsOwn) {
+    track->magneticAttribute()->setValue(true);
+    const MediaPtr media = place(5, 10);
+    EXPECT_EQ(media->startTime(), 0);
+    ASSERT_EQ(project->commandHistory()->undoStack().size(), 2u);
+    EXPECT_EQ(project->commandHistory()->undoStack().back()->name(), "Close Gaps");
+    project->undo();
+    EXPECT_EQ(media->startTime(), 5);
+    project->redo();
+    EXPECT_EQ(media->startTime(), 0);
+
+    const MediaPtr second = place(10, 10), third = place(20, 10);
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10, 20}));
+    project->execute(RemoveMediaCmd::create(track, second));
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10})); // the gap closed
+    EXPECT_EQ(third->startTime(), 10);
+    project->undo(); // the closing
+    EXPECT_EQ(third->startTime(), 20);
+    project->undo(); // the removal
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10, 20}));
+
+    const auto plain = newTrack();
+    const MediaPtr loose = clip(10);
+    project->execute(AddMediaCmd::create(plain, loose, 50));
+    EXPECT_EQ(loose->startTime(), 50); // not magnetic: stays
+}
+
+TEST_F(ProjectTest, OneCommandNotifiesEachChangedObjectOnce) {
+    const MediaPtr media = place(0, 10);
+    struct Counter : Observer {
+        int count = 0;
+        void update(Observable*) override { ++count; }
+    } counter;
+    media->attach(&counter);
+    project->execute(BatchCmd::create(
+        std::vector<CommandPtr>{MoveCmd::create(track, media, 5), MoveCmd::create(track, media, 5)}));
+    EXPECT_EQ(media->startTime(), 10);
+    EXPECT_EQ(counter.count, 1);
+    project->undo();
+    EXPECT_EQ(counter.count, 2);
+    media->detach(&counter);
+}
+
+TEST_F(ProjectTest, LockHideAndSoloAreUndoable) {
+    project->execute(LockData::GetChangeIsLockedCommand(track, true));
+    project->execute(LockData::GetChangeIsHiddenCommand(track, true));
+    project->execute(LockData::GetChangeIsSoloCommand(track, true));
+    EXPECT_TRUE(LockData::IsTrackLocked(*track));
+    EXPECT_TRUE(LockData::IsTrackHidden(*track));
+    EXPECT_TRUE(track->attributeValue("solo", false));
+    project->commandHistory()->undoAll();
+    EXPECT_FALSE(LockData::IsTrackLocked(*track));
+    EXPECT_FALSE(LockData::IsTrackHidden(*track));
+    EXPECT_FALSE(track->attributeValue("solo", false));
+}
+
+TEST_F(ProjectTest, AutoCombiningFoldsEverythingAfterTheFirst) {
+    const MediaPtr media = place(0, 10);
+    project->beginAutoCommandCombining();
+    for (int i = 0; i < 3; ++i) project->execute(MoveCmd::create(track, media, 10));
+    project->endAutoCommandCombining();
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 2u);
+    project->undo();
+    EXPECT_EQ(media->startTime(), 0);
+    project->combineNextCommand();
+    project->execute(MoveCmd::create(track, media, 1));
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 1u);
+}
