@@ -41,38 +41,36 @@ bool CommandHistory::execute(const CommandPtr& command) {
     return done;
 }
 
-void CommandHistory::undo() {
-    if (state_.undoStack.empty()) throw VelaMediaLibException("no commands to undo");
+// Undo and redo: the newest command of one stack replays (counted as
+// replaying, under the notify delay) and moves to the other stack; a command
+// whose replay throws stays where it was.
+template <typename Replay>
+void CommandHistory::replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
+                            Replay step) {
+    if (from.empty()) throw VelaMediaLibException(emptyMessage);
     ++transactionNumber_;
-    const CommandPtr command = state_.undoStack.back();
+    const CommandPtr command = from.back();
     ++replaying_;
     try {
-        delayedNotifications([&] { command->unexecute(handler_); });
+        delayedNotifications([&] { step(*command); });
     } catch (...) {
         --replaying_;
         throw;
     }
     --replaying_;
-    state_.undoStack.pop_back();
-    state_.redoStack.push_back(command);
+    from.pop_back();
+    to.push_back(command);
     notify();
 }
 
+void CommandHistory::undo() {
+    replay(state_.undoStack, state_.redoStack, "no commands to undo",
+           [&](Command& c) { c.unexecute(handler_); });
+}
+
 void CommandHistory::redo() {
-    if (state_.redoStack.empty()) throw VelaMediaLibException("no commands to redo");
-    ++transactionNumber_;
-    const CommandPtr command = state_.redoStack.back();
-    ++replaying_;
-    try {
-        delayedNotifications([&] { command->reexecute(handler_); });
-    } catch (...) {
-        --replaying_;
-        throw;
-    }
-    --replaying_;
-    state_.redoStack.pop_back();
-    state_.undoStack.push_back(command);
-    notify();
+    replay(state_.redoStack, state_.undoStack, "no commands to redo",
+           [&](Command& c) { c.reexecute(handler_); });
 }
 
 void CommandHistory::undoAll() {

@@ -62,6 +62,9 @@ private:
     template <typename Step>
     void delayedNotifications(Step step);
     void trimToLimit();
+    template <typename Replay>
+    void replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
+                Replay step);
 
     CommandHandler* handler_;
     boost::weak_ptr<const ThreadSafe> token_;
