@@ -200,3 +200,33 @@ TEST_F(ProjectTest, AutoCombiningFoldsEverythingAfterTheFirst) {
     project->execute(MoveCmd::create(track, media, 1));
     EXPECT_EQ(project->commandHistory()->undoStack().size(), 1u);
 }
+
+TEST(TrackMagnetizerAutoAttacher, FollowsTracksAndMixersAsTheyComeAndGo) {
+    const ProjectPtr project = Project::create(30, 1);
+    const TimelinePtr timeline = Timeline::create(project->token());
+    CommandHistory history(dynamic_cast<CommandHandler*>(project.get()), project->token());
+    const auto first = timeline->newMixer("a");
+    const auto early = timeline->newTrack();
+    timeline->addTrack(first, early);
+    TrackMagnetizerAutoAttacher attacher(timeline, history);
+    EXPECT_TRUE(attacher.hasMagnetizer(early)); // tracks already there
+    const auto late = timeline->newTrack();
+    timeline->addTrack(first, late);
+    EXPECT_TRUE(attacher.hasMagnetizer(late));
+    timeline->removeTrack(first, late);
+    EXPECT_FALSE(attacher.hasMagnetizer(late));
+    const auto second = GenericMixer::create(project->token());
+    const auto inSecond = timeline->newTrack();
+    second->addTrack(inSecond);
+    timeline->addMixer("b", second);
+    EXPECT_TRUE(attacher.hasMagnetizer(inSecond));
+    timeline->removeMixer(second);
+    EXPECT_FALSE(attacher.hasMagnetizer(inSecond));
+
+    // The magnetizer of a track made magnetic closes its gap through the history.
+    const MediaPtr clip = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
+    early->addMedia(clip, 7);
+    early->magneticAttribute()->setValue(true);
+    EXPECT_EQ(clip->startTime(), 0);
+    EXPECT_EQ(history.undoStack().size(), 1u);
+}
