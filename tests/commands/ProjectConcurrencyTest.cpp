@@ -9,8 +9,9 @@
 using namespace VelaMediaLib;
 
 // Readers ask which clips are active and what parameters are worth while
-// one thread executes, undoes and redoes moves. A reader never sees two
-// clips over one tick, nor a clip outside the places the edits allow.
+// one thread executes, undoes and redoes moves. Under one read lock, a
+// reader's answers agree: two clips at a tick touch there, and values stay
+// within their curves.
 TEST(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
     const ProjectPtr project = Project::create(30, 1);
     const auto mixer = project->newMixer("main");
@@ -29,6 +30,8 @@ TEST(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
     for (int r = 0; r < 2; ++r)
         readers.emplace_back([&, r] {
             for (long long tick = r; !done.load(); tick = (tick + 7) % 260) {
+                // Several queries that must agree are read under one read lock.
+                ScopedReadLock snapshot(project->token());
                 const Track::Pair pair = track->mediaAtTime(tick);
                 if (pair.second && pair.first->endTime() != pair.second->startTime()) ++wrong;
                 if (pair.first) {
