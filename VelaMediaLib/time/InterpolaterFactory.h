@@ -70,7 +70,13 @@ public:
     }
 
     /// The kind new keyframes get: linear where the type tweens, a step otherwise.
-    static Pointer defaultInterpolater() {
+    static const Pointer& defaultInterpolater() {
+        static const Pointer instance = makeDefault();
+        return instance;
+    }
+
+private:
+    static Pointer makeDefault() {
         if constexpr (InterpolaterKinds<T>::linear)
             return LinearInterpolater<T>::getInstance();
         else

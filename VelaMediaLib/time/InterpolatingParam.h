@@ -40,7 +40,7 @@ protected:
     boost::shared_ptr<ParameterImpl<T>> cloneImpl() const override {
         return boost::shared_ptr<ParameterImpl<T>>(new InterpolatingParam(*this));
     }
-    InterpolaterPtr defaultInterpolater() const override { return interpolater_; }
+    const InterpolaterPtr& defaultInterpolater() const override { return interpolater_; }
     std::string parameterInterpolaterName() const override { return interpolater_->name(); }
     void readParameterInterpolater(const std::string& name) override {
         interpolater_ = InterpolaterFactory<T>::byName(name);

@@ -24,8 +24,13 @@ protected:
     boost::shared_ptr<ParameterImpl<T>> cloneImpl() const override {
         return boost::shared_ptr<ParameterImpl<T>>(new LeftParameter(*this));
     }
-    InterpolaterPtr defaultInterpolater() const override { return LeftInterpolater<T>::getInstance(); }
-    InterpolaterPtr segmentInterpolater(const KeyFrame<T>&) const override { return defaultInterpolater(); }
+    const InterpolaterPtr& defaultInterpolater() const override {
+        static const InterpolaterPtr step = LeftInterpolater<T>::getInstance();
+        return step;
+    }
+    const InterpolaterPtr& segmentInterpolater(const KeyFrame<T>&) const override {
+        return defaultInterpolater();
+    }
 };
 
 } // namespace VelaMediaLib

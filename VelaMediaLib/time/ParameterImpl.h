@@ -140,11 +140,13 @@ protected:
         return boost::shared_ptr<ParameterImpl>(new ParameterImpl(*this));
     }
     /// The interpolater of keyframes that have none of their own.
-    virtual InterpolaterPtr defaultInterpolater() const {
+    virtual const InterpolaterPtr& defaultInterpolater() const {
         return InterpolaterFactory<T>::defaultInterpolater();
     }
-    /// The interpolater of the segment that ends at the keyframe.
-    virtual InterpolaterPtr segmentInterpolater(const KeyFrame<T>& end) const {
+    /// The interpolater of the segment that ends at the keyframe. Both answer
+    /// references: queries on many threads must not count the shared
+    /// interpolaters' owners up and down.
+    virtual const InterpolaterPtr& segmentInterpolater(const KeyFrame<T>& end) const {
         return end.interpolater_ ? end.interpolater_ : defaultInterpolater();
     }
     /// The parameter's own "interp" in its document object, or empty.
