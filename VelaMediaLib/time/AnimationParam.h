@@ -27,9 +27,7 @@ public:
     static boost::shared_ptr<AnimationParam> create(const boost::weak_ptr<const ThreadSafe>& token,
                                                     const std::string& identifier, const T& value,
                                                     const TimeScalable* scalable = nullptr) {
-        boost::shared_ptr<AnimationParam> parameter(new AnimationParam(token, identifier, scalable));
-        parameter->setDefaultValue(value);
-        return parameter;
+        return ParameterImpl<T>::template createHolding<AnimationParam>(value, token, identifier, scalable);
     }
 
     std::vector<Animation> animations() const {

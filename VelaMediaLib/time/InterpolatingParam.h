@@ -21,10 +21,8 @@ public:
     create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
            const InterpolaterPtr& interpolater = InterpolaterFactory<T>::defaultInterpolater(),
            const TimeScalable* scalable = nullptr) {
-        boost::shared_ptr<InterpolatingParam> parameter(
-            new InterpolatingParam(token, identifier, scalable, interpolater));
-        parameter->setDefaultValue(value);
-        return parameter;
+        return ParameterImpl<T>::template createHolding<InterpolatingParam>(value, token, identifier,
+                                                                            scalable, interpolater);
     }
 
     InterpolaterPtr parameterInterpolater() const {

@@ -15,9 +15,7 @@ public:
     static boost::shared_ptr<LeftParameter> create(const boost::weak_ptr<const ThreadSafe>& token,
                                                    const std::string& identifier, const T& value,
                                                    const TimeScalable* scalable = nullptr) {
-        boost::shared_ptr<LeftParameter> parameter(new LeftParameter(token, identifier, scalable));
-        parameter->setDefaultValue(value);
-        return parameter;
+        return ParameterImpl<T>::template createHolding<LeftParameter>(value, token, identifier, scalable);
     }
 
 protected:

@@ -58,9 +58,7 @@ public:
     static boost::shared_ptr<ParameterImpl> create(const boost::weak_ptr<const ThreadSafe>& token,
                                                    const std::string& identifier, const T& value,
                                                    const TimeScalable* scalable = nullptr) {
-        boost::shared_ptr<ParameterImpl> parameter(new ParameterImpl(token, identifier, scalable));
-        parameter->setDefaultValue(value);
-        return parameter;
+        return createHolding<ParameterImpl>(value, token, identifier, scalable);
     }
 
     // Identification and description
@@ -135,6 +133,14 @@ public:
     }
 
 protected:
+    /// A new parameter of a kind, holding the value as its only keyframe at time 0.
+    template <typename Kind, typename... Args>
+    static boost::shared_ptr<Kind> createHolding(const T& value, Args&&... args) {
+        boost::shared_ptr<Kind> parameter(new Kind(std::forward<Args>(args)...));
+        parameter->setDefaultValue(value);
+        return parameter;
+    }
+
     /// A copy of the same kind; kinds with state of their own override it.
     virtual boost::shared_ptr<ParameterImpl> cloneImpl() const {
         return boost::shared_ptr<ParameterImpl>(new ParameterImpl(*this));

@@ -15,9 +15,7 @@ public:
     static boost::shared_ptr<VectorParam> create(const boost::weak_ptr<const ThreadSafe>& token,
                                                  const std::string& identifier,
                                                  const std::vector<double>& value) {
-        boost::shared_ptr<VectorParam> parameter(new VectorParam(token, identifier));
-        parameter->setDefaultValue(value);
-        return parameter;
+        return createHolding<VectorParam>(value, token, identifier);
     }
 
 protected:
