@@ -49,7 +49,8 @@ int InternalProject::defaultAudioSampleRate(const boost::rational<unsigned long>
 void InternalProject::init() {
     const boost::weak_ptr<const ThreadSafe> projectToken = token();
     subject_.setProjectMutex(projectToken);
-    setMetaDataToken(projectToken);
+    subject_.setOwner(this);
+    setMetaDataProjectMutex(projectToken);
     setAttributesToken(projectToken);
     sourceBin_.reset(new SourceBin(projectToken));
     timeline_ = Timeline::create(projectToken);

@@ -8,6 +8,20 @@
 
 namespace VelaMediaLib {
 
+namespace {
+
+class UnitTimeScale : public TimeScalable {
+public:
+    SafeRational timeScale() const override { return SafeRational(1); }
+};
+
+} // namespace
+
+boost::shared_ptr<const TimeScalable> Parametric::sharedTimeScale() const {
+    static const boost::shared_ptr<const TimeScalable> unit(new UnitTimeScale);
+    return unit;
+}
+
 boost::shared_ptr<ParameterInterface> Parametric::createDefaultParameter(const std::string&) const {
     return boost::shared_ptr<ParameterInterface>();
 }
@@ -78,7 +92,7 @@ void Parametric::cloneParametersInto(Parametric& other) const {
     other.parameters_.reset(new Map);
     for (const auto& entry : *parameters_) {
         const boost::shared_ptr<ParameterInterface> copy = entry.second->cloneParameter();
-        copy->setTimeScalable(&other);
+        copy->setTimeScalable(other.sharedTimeScale());
         (*other.parameters_)[entry.first] = copy;
     }
 }

@@ -48,6 +48,10 @@ public:
     void readParameterList(const Json::Value& parameters);
 
     SafeRational timeScale() const override { return SafeRational(1); }
+    /// The time scale this object's parameters hold: a shared object of its
+    /// own, never the owner itself, so a parameter kept past its owner still
+    /// answers. One tick per unit unless a kind says otherwise.
+    virtual boost::shared_ptr<const TimeScalable> sharedTimeScale() const;
 
 protected:
     /// A new parameter of the name with its default, or null for unknown names.

@@ -17,7 +17,9 @@ public:
     typedef Effectable::Effects Effects;
 
     explicit SubTimelineParts(const boost::weak_ptr<const ThreadSafe>& token)
-        : Interface(token), subject_(token), effects_(token) {}
+        : Interface(token), subject_(token), effects_(token) {
+        subject_.setOwner(this);
+    }
 
     void attach(Observer* observer) override { subject_.attach(observer); }
     void attachWithoutNotifyDelay(Observer* observer) override {

@@ -39,7 +39,7 @@ Track::~Track() = default;
 boost::shared_ptr<ParameterInterface> Track::createDefaultParameter(const std::string& name) const {
     if (name != "volume") return SubTimelineParts<SubTimeline>::createDefaultParameter(name);
     const auto made = InterpolatingParam<double>::create(parametersToken(), name, 1.0);
-    made->setTimeScalable(this);
+    made->setTimeScalable(sharedTimeScale());
     return made;
 }
 

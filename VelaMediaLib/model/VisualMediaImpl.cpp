@@ -31,7 +31,7 @@ boost::shared_ptr<ParameterInterface> VisualMediaImpl::createDefaultParameter(co
         made = InterpolatingParam<Rect<float>>::create(token, name, kNoCrop);
     else
         return MediaImpl::createDefaultParameter(name);
-    made->setTimeScalable(this);
+    made->setTimeScalable(sharedTimeScale());
     return made;
 }
 

@@ -24,9 +24,9 @@ public:
     typedef typename ParameterImpl<T>::KeyFramePtr KeyFramePtr;
     using InterpolatingParam<T>::InterpolatingParam;
 
-    static boost::shared_ptr<AnimationParam> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                    const std::string& identifier, const T& value,
-                                                    const TimeScalable* scalable = nullptr) {
+    static boost::shared_ptr<AnimationParam>
+    create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
+           const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>()) {
         return ParameterImpl<T>::template createHolding<AnimationParam>(value, token, identifier, scalable);
     }
 

@@ -19,8 +19,10 @@ public:
     typedef typename Base::KeyFrameMap KeyFrameMap;
     typedef typename Base::MapUtil MapUtil;
 
-    DiffParameter(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
-                  const boost::shared_ptr<Parameter<T>>& source, const TimeScalable* scalable = nullptr)
+    DiffParameter(
+        const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
+        const boost::shared_ptr<Parameter<T>>& source,
+        const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>())
         : Base(token, identifier, scalable), source_(source), sourceObserver_(*this) {
         if (source_) source_->attach(&sourceObserver_);
         rebuild();

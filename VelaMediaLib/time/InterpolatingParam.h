@@ -12,15 +12,16 @@ class InterpolatingParam : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
 
-    InterpolatingParam(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
-                       const TimeScalable* scalable = nullptr,
-                       const InterpolaterPtr& interpolater = InterpolaterFactory<T>::defaultInterpolater())
+    InterpolatingParam(
+        const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
+        const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>(),
+        const InterpolaterPtr& interpolater = InterpolaterFactory<T>::defaultInterpolater())
         : ParameterImpl<T>(token, identifier, scalable), interpolater_(interpolater) {}
 
     static boost::shared_ptr<InterpolatingParam>
     create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
            const InterpolaterPtr& interpolater = InterpolaterFactory<T>::defaultInterpolater(),
-           const TimeScalable* scalable = nullptr) {
+           const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>()) {
         return ParameterImpl<T>::template createHolding<InterpolatingParam>(value, token, identifier,
                                                                             scalable, interpolater);
     }

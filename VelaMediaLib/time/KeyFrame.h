@@ -24,15 +24,15 @@ public:
         : KeyFrameInterface(token, endTime, leadIn), value_(value), interpolater_(interpolater) {}
 
     T value() const {
-        ScopedReadLock lock(metaDataToken());
+        ScopedReadLock lock(metaDataProjectMutex());
         return value_;
     }
     InterpolaterPtr interpolater() const {
-        ScopedReadLock lock(metaDataToken());
+        ScopedReadLock lock(metaDataProjectMutex());
         return interpolater_;
     }
     void setInterpolater(const InterpolaterPtr& interpolater) {
-        ScopedWriteLock lock(metaDataToken());
+        ScopedWriteLock lock(metaDataProjectMutex());
         interpolater_ = interpolater;
     }
 
@@ -50,20 +50,20 @@ public:
         boost::shared_ptr<KeyFrame> copy;
         std::map<std::string, std::string> metadata;
         {
-            ScopedReadLock lock(metaDataToken());
+            ScopedReadLock lock(metaDataProjectMutex());
             copy.reset(
                 new KeyFrame(boost::weak_ptr<const ThreadSafe>(), endTime_, value_, leadIn_, interpolater_));
             metadata = metaDataCopy();
         }
         for (const auto& entry : metadata) copy->addMetaData(entry.first, entry.second);
-        copy->setMetaDataToken(metaDataToken());
+        copy->setMetaDataProjectMutex(metaDataProjectMutex());
         return copy;
     }
 
 protected:
     /// Whether the value equals the given one within the type's tolerance.
     bool similarToValue(const T& value) const {
-        ScopedReadLock lock(metaDataToken());
+        ScopedReadLock lock(metaDataProjectMutex());
         return Similarity::similar(value_, value);
     }
 

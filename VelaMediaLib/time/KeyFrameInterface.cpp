@@ -10,22 +10,22 @@ KeyFrameInterface::KeyFrameInterface(const boost::weak_ptr<const ThreadSafe>& to
     : MetaDatable(token), endTime_(endTime), leadIn_(leadIn) {}
 
 RationalTime KeyFrameInterface::endTime() const {
-    ScopedReadLock lock(metaDataToken());
+    ScopedReadLock lock(metaDataProjectMutex());
     return endTime_;
 }
 
 RationalTime KeyFrameInterface::duration() const {
-    ScopedReadLock lock(metaDataToken());
+    ScopedReadLock lock(metaDataProjectMutex());
     return leadIn_;
 }
 
 RationalTime KeyFrameInterface::time() const {
-    ScopedReadLock lock(metaDataToken());
+    ScopedReadLock lock(metaDataProjectMutex());
     return RationalTime(endTime_.asRational() - leadIn_.asRational());
 }
 
 void KeyFrameInterface::toJSON(XMLOptions& options, int level) const {
-    ScopedReadLock lock(metaDataToken());
+    ScopedReadLock lock(metaDataProjectMutex());
     JSONWriter object(options, level);
     ValueFormatter<RationalTime>::write(object.key("time"), time());
     ValueFormatter<RationalTime>::write(object.key("endTime"), endTime_);

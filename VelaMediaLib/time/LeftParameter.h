@@ -12,9 +12,9 @@ public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
     using ParameterImpl<T>::ParameterImpl;
 
-    static boost::shared_ptr<LeftParameter> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                   const std::string& identifier, const T& value,
-                                                   const TimeScalable* scalable = nullptr) {
+    static boost::shared_ptr<LeftParameter>
+    create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
+           const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>()) {
         return ParameterImpl<T>::template createHolding<LeftParameter>(value, token, identifier, scalable);
     }
 

@@ -1,6 +1,7 @@
 #include <VelaMediaLib/time/MetaDatable.h>
 
 #include <VelaMediaLib/document/JSONWriter.h>
+#include <VelaMediaLib/time/ThreadSafe.h>
 
 namespace VelaMediaLib {
 
@@ -49,7 +50,12 @@ std::vector<std::string> MetaDatable::metaDataKeys() const {
     return keys;
 }
 
-void MetaDatable::setMetaDataToken(const boost::weak_ptr<const ThreadSafe>& token) {
+ReadWriteMutex* MetaDatable::metaDataMutex() const {
+    const boost::shared_ptr<const ThreadSafe> project = token_.lock();
+    return project ? &project->mutex() : nullptr;
+}
+
+void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
     ScopedWriteLock lock(token_);
     token_ = token;
     if (metaData_)

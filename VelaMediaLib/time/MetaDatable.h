@@ -33,8 +33,11 @@ public:
     bool removeMetaData(const std::string& key);
     std::vector<std::string> metaDataKeys() const;
 
-    const boost::weak_ptr<const ThreadSafe>& metaDataToken() const { return token_; }
-    void setMetaDataToken(const boost::weak_ptr<const ThreadSafe>& token);
+    /// The project's token that guards the metadata, and the lock it leads to
+    /// (null once the project has gone).
+    const boost::weak_ptr<const ThreadSafe>& metaDataProjectMutex() const { return token_; }
+    ReadWriteMutex* metaDataMutex() const;
+    void setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
 
     /// Writes the keys as the "metadata" member of the object being written,
     /// when there are any.

@@ -48,16 +48,17 @@ public:
     typedef KeyFrameMapUtil<KeyFrame<T>> MapUtil;
     typedef typename MapUtil::Map KeyFrameMap;
 
-    ParameterImpl(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
-                  const TimeScalable* scalable = nullptr)
+    ParameterImpl(
+        const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
+        const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>())
         : Base(token), identifier_(identifier), scalable_(scalable) {}
     /// A deep copy: keyframes are cloned, observers are not carried over.
     ParameterImpl(const ParameterImpl& other);
 
     /// A parameter holding the value as its only keyframe, at time 0.
-    static boost::shared_ptr<ParameterImpl> create(const boost::weak_ptr<const ThreadSafe>& token,
-                                                   const std::string& identifier, const T& value,
-                                                   const TimeScalable* scalable = nullptr) {
+    static boost::shared_ptr<ParameterImpl>
+    create(const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier, const T& value,
+           const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>()) {
         return createHolding<ParameterImpl>(value, token, identifier, scalable);
     }
 
@@ -75,8 +76,10 @@ public:
     void setValueBounds(const T& minValue, const T& maxValue, const T& defaultValue);
     boost::optional<UIHints> uiHints() const;
     void setUIHints(const std::string& userInterfaceType, const std::string& unitType);
-    const TimeScalable* timeScalable() const override { return scalable_; }
-    void setTimeScalable(const TimeScalable* scalable) override { scalable_ = scalable; }
+    const boost::shared_ptr<const TimeScalable>& timeScalable() const override { return scalable_; }
+    void setTimeScalable(const boost::shared_ptr<const TimeScalable>& scalable) override {
+        scalable_ = scalable;
+    }
     MetaDatable* metaDataPtr() override;
     std::map<std::string, std::string> generateMetaDataMap() const override;
 
@@ -223,7 +226,7 @@ private:
     Extras& extras() const;
 
     std::string identifier_;
-    const TimeScalable* scalable_;
+    boost::shared_ptr<const TimeScalable> scalable_;
     mutable std::unique_ptr<Extras> extras_;
 };
 

@@ -158,7 +158,7 @@ ParameterImpl<T>::placeReadKeyFrame(const RationalTime& end, const T& value, con
 template <typename T>
 void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
     keyframes_.swap(read.keyframes_);
-    for (auto& entry : keyframes_) entry.keyframe->setMetaDataToken(this->projectMutex());
+    for (auto& entry : keyframes_) entry.keyframe->setMetaDataProjectMutex(this->projectMutex());
     if (!read.extras_ && !extras_) return;
     Extras& mine = extras();
     mine.bounds = read.extras_ ? read.extras_->bounds : boost::none;

@@ -50,8 +50,9 @@ public:
     virtual bool shouldSerialize() const = 0;
     virtual bool hasValueBounds() const = 0;
     virtual bool hasUIHints() const = 0;
-    virtual const TimeScalable* timeScalable() const = 0;
-    virtual void setTimeScalable(const TimeScalable* scalable) = 0;
+    /// The owner's time scale, shared: a parameter may outlive its owner.
+    virtual const boost::shared_ptr<const TimeScalable>& timeScalable() const = 0;
+    virtual void setTimeScalable(const boost::shared_ptr<const TimeScalable>& scalable) = 0;
 
     /// Throws KeyFrameException when there is no keyframe at `from` or another stands at `to`.
     virtual void moveKeyFrame(const RationalTime& from, const RationalTime& to) = 0;

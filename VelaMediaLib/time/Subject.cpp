@@ -57,7 +57,7 @@ void Subject::tell(const std::vector<Observer*>& list, std::vector<Observer*>& t
     for (Observer* observer : snapshot) {
         if (!contains(list, observer) || contains(told, observer)) continue;
         told.push_back(observer);
-        observer->update(this);
+        observer->update(owner());
     }
 }
 

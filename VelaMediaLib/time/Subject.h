@@ -44,6 +44,12 @@ public:
     NotifyDisabler disableNotifies() { return NotifyDisabler(*this); }
     bool notifiesEnabled() const { return disableCount_.load() <= 0; }
 
+    /// The object observers are told changed: a clip, track or project that
+    /// notifies through a subject of its own names itself here, so that an
+    /// observer of several objects can tell them apart.
+    void setOwner(Observable* owner) { owner_ = owner; }
+    Observable* owner() { return owner_ ? owner_ : this; }
+
     const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
     void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) { token_ = token; }
 
@@ -67,6 +73,7 @@ private:
 
     std::unique_ptr<Lists> lists_;
     std::atomic<int> disableCount_{0};
+    Observable* owner_ = nullptr;
     bool pendingInDelay_ = false; // guarded by the NotifyDelay registry mutex
     boost::weak_ptr<const ThreadSafe> token_;
 };

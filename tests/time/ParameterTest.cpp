@@ -55,8 +55,7 @@ TEST_F(ParameterTest, ValueAtTimeFollowsItsSteps) {
     EXPECT_DOUBLE_EQ(parameter->valueAtTime(RationalTime(19, 2)), 9.5);
 
     // With two ticks per unit, 9.6 lies less than one tick before 10 and snaps to it.
-    const TicksPerUnit ticks(2);
-    parameter->setTimeScalable(&ticks);
+    parameter->setTimeScalable(boost::make_shared<TicksPerUnit>(2));
     EXPECT_EQ(parameter->valueAtTime(RationalTime(48, 5)), 10.0);
     EXPECT_DOUBLE_EQ(parameter->valueAtTime(RationalTime(19, 2)), 9.5); // exactly one tick before
 }
