@@ -48,11 +48,16 @@ boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const 
 }
 
 bool AddMediaCmd::execute(CommandHandler* handler) {
+    saveState();
     return keep(handler->addMedia(track_, media_, amount_));
 }
 
+// Off the track again, the clip takes back the start it had before (its own
+// earlier state, which it cannot refuse).
 bool AddMediaCmd::unexecute(CommandHandler* handler) {
-    return bool(handler->removeMedia(resultTrack_, resultMedia_).second);
+    if (!handler->removeMedia(resultTrack_, resultMedia_).second) return false;
+    resultMedia_->restoreState(saved_, 0);
+    return true;
 }
 
 boost::shared_ptr<RemoveMediaCmd> RemoveMediaCmd::create(const TrackPtr& track, const MediaPtr& media) {

@@ -50,7 +50,8 @@ private:
         : AtomicEditCmd(track, media, delta) {}
 };
 
-/// Places a clip on a track at a start tick; undone by removing it.
+/// Places a clip on a track at a start tick; undone by removing it, the clip
+/// taking back the start it had before.
 class AddMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<AddMediaCmd> create(const TrackPtr& track, const MediaPtr& media,

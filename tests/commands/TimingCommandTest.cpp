@@ -114,3 +114,14 @@ TEST_F(TimingCommands, ARefusedMoveRefusesTheWholeClosing) {
     EXPECT_EQ(starts(), (std::vector<VelaTime>{5, 30})); // the first clip's move rolled back
     EXPECT_TRUE(history.undoStack().empty());
 }
+
+TEST_F(TimingCommands, UndoingAnAddGivesTheClipBackItsEarlierState) {
+    const MediaPtr loose = PlaceholderMedia::create(project->token(), project->editRateToken(), 3, 10);
+    const MediaState before = loose->state();
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, loose, 50)));
+    project->undo();
+    EXPECT_FALSE(track->hasMedia(loose));
+    EXPECT_EQ(loose->state(), before);
+    project->redo();
+    EXPECT_EQ(loose->startTime(), 50);
+}
