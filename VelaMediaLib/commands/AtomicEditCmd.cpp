@@ -52,11 +52,11 @@ bool AddMediaCmd::execute(CommandHandler* handler) {
     return keep(handler->addMedia(track_, media_, amount_));
 }
 
-// Off the track again, the clip takes back the start it had before (its own
-// earlier state, which it cannot refuse).
+// Placing a clip changes only its start; off the track again, it takes back
+// the one it had.
 bool AddMediaCmd::unexecute(CommandHandler* handler) {
     if (!handler->removeMedia(resultTrack_, resultMedia_).second) return false;
-    resultMedia_->restoreState(saved_, 0);
+    resultMedia_->setTrackStart(saved_.start);
     return true;
 }
 

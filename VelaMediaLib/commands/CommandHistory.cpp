@@ -123,27 +123,30 @@ void CommandHistory::queueFollowUp(const CommandPtr& command) {
     followUps_.push_back(command);
 }
 
+// Like a host command's, the follow-ups queued by a follow-up that refused or
+// threw answered changes that were rolled back, and are dropped.
 void CommandHistory::runFollowUps() {
     if (inner_ || draining_ || depth_ > 0 || replaying_ > 0) return;
-    draining_ = true;
-    try {
-        while (!followUps_.empty()) {
-            const CommandPtr next = followUps_.front();
-            followUps_.pop_front();
-            try {
-                if (record(next)) fold(true);
-            } catch (...) {
-                // A follow-up that throws has rolled itself back; the edit it
-                // answered stands, and so do the others.
-                if (const boost::shared_ptr<CommandHistoryObserver> observer = observer_.lock())
-                    observer->commandDidExecute(next, transactionNumber_, false);
-            }
+    const Counted draining(draining_);
+    while (!followUps_.empty()) {
+        const CommandPtr next = followUps_.front();
+        followUps_.pop_front();
+        const size_t queued = followUps_.size();
+        bool done = false, threw = false;
+        try {
+            done = record(next);
+        } catch (...) {
+            threw = true; // it has rolled itself back; the edit it answered stands
         }
-    } catch (...) {
-        draining_ = false;
-        throw;
+        if (done) {
+            fold(true);
+            continue;
+        }
+        followUps_.resize(queued);
+        if (threw)
+            if (const boost::shared_ptr<CommandHistoryObserver> observer = observer_.lock())
+                observer->commandDidExecute(next, transactionNumber_, false);
     }
-    draining_ = false;
 }
 
 // Undo and redo: the newest command of one stack replays (counted as

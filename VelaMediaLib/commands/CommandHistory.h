@@ -105,9 +105,9 @@ private:
     int undoLimit_ = -1;
     uint32_t transactionNumber_ = 1;
     int replaying_ = 0;
-    int depth_ = 0;         // commands of this history running
-    bool draining_ = false; // follow-ups running
-    bool inner_ = false;    // a composite's: follow-ups go to the history running it
+    int depth_ = 0;      // commands of this history running
+    int draining_ = 0;   // follow-ups running
+    bool inner_ = false; // a composite's: follow-ups go to the history running it
     bool combineNext_ = false;
     bool autoCombining_ = false;
     bool autoCombinedFirst_ = false;
