@@ -7,19 +7,17 @@
 namespace VelaMediaLib {
 
 TrackMagnetizer::TrackMagnetizer(const TrackPtr& track, CommandExecutor& executor)
-    : track_(track), executor_(executor) {
+    : track_(track), executor_(executor), flag_(track->magneticAttribute()), magnetic_(flag_->value()) {
     track->attachAddObserver(this);
-    track->magneticAttribute()->attachWithoutNotifyDelay(this);
+    flag_->attachWithoutNotifyDelay(this);
     for (const MediaPtr& media : track->medias()) observe(media);
 }
 
 TrackMagnetizer::~TrackMagnetizer() {
     for (const boost::weak_ptr<Media>& held : clips_)
         if (const MediaPtr media = held.lock()) media->detach(this);
-    if (const TrackPtr track = track_.lock()) {
-        track->detachAddObserver(this);
-        track->magneticAttribute()->detach(this);
-    }
+    flag_->detach(this);
+    if (const TrackPtr track = track_.lock()) track->detachAddObserver(this);
 }
 
 // Heard at once, without waiting for the edit's delay: hearing only queues a
@@ -44,16 +42,21 @@ void TrackMagnetizer::onTrackRemoveMedia(Track&, const MediaPtr& media) {
     requestClosing();
 }
 
-void TrackMagnetizer::update(Observable*) { requestClosing(); }
+void TrackMagnetizer::update(Observable* subject) {
+    if (subject == flag_.get()) magnetic_ = flag_->value();
+    requestClosing();
+}
 
-// Cheap on purpose: closing gaps moves every clip after the gap, and each
-// of them is heard again; only the first change after a request has started
+// Cheap on purpose, as it runs inside every edit of the track's clips: the
+// flag is kept at hand, and closing gaps moves every clip after the gap, each
+// of them heard again; only the first change after a request has started
 // asks for another (which finds no gap and records nothing).
 void TrackMagnetizer::requestClosing() {
+    if (!magnetic_) return;
     const boost::shared_ptr<CloseGapsOnTrackCmd> waiting = waiting_.lock();
     if ((waiting && !waiting->hasStarted()) || executor_.isReplaying()) return;
     const TrackPtr track = track_.lock();
-    if (!track || !track->attributeValue("magnetic", false)) return;
+    if (!track) return;
     const boost::shared_ptr<CloseGapsOnTrackCmd> request = CloseGapsOnTrackCmd::create(track);
     executor_.queueFollowUp(request);
     waiting_ = request;

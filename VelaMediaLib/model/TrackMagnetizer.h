@@ -33,6 +33,8 @@ private:
 
     boost::weak_ptr<Track> track_;
     CommandExecutor& executor_;
+    boost::shared_ptr<Attribute<bool>> flag_; // the track's "magnetic" attribute
+    bool magnetic_;
     std::vector<boost::weak_ptr<Media>> clips_;
     boost::weak_ptr<CloseGapsOnTrackCmd> waiting_;
 };
