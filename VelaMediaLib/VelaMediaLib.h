@@ -13,6 +13,8 @@
 #include <VelaMediaLib/commands/LambdaMultiCommand.h>
 #include <VelaMediaLib/commands/MultiCommand.h>
 #include <VelaMediaLib/commands/NullCmd.h>
+#include <VelaMediaLib/commands/StretchCmd.h>
+#include <VelaMediaLib/commands/TrimCmd.h>
 #include <VelaMediaLib/document/JSONReader.h>
 #include <VelaMediaLib/document/JSONWriter.h>
 #include <VelaMediaLib/document/ValueFormatter.h>

@@ -9,17 +9,26 @@ bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
     return true;
 }
 
+void AtomicEditCmd::saveState() {
+    if (media_) saved_ = media_->state();
+}
+
+bool AtomicEditCmd::restoreSavedState(CommandHandler* handler) {
+    return bool(handler->restoreMediaState(resultTrack_, resultMedia_, saved_).second);
+}
+
 boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
     const boost::shared_ptr<MoveCmd> command(new MoveCmd(track, media, delta));
     command->setName("Move");
     return command;
 }
 
-bool MoveCmd::execute(CommandHandler* handler) { return keep(handler->moveMedia(track_, media_, amount_)); }
-
-bool MoveCmd::unexecute(CommandHandler* handler) {
-    return bool(handler->moveMedia(resultTrack_, resultMedia_, -amount_).second);
+bool MoveCmd::execute(CommandHandler* handler) {
+    saveState();
+    return keep(handler->moveMedia(track_, media_, amount_));
 }
+
+bool MoveCmd::unexecute(CommandHandler* handler) { return restoreSavedState(handler); }
 
 CommandPtr MoveCmd::combine(const CommandPtr& later) {
     const boost::shared_ptr<MoveCmd> move = boost::dynamic_pointer_cast<MoveCmd>(later);
@@ -27,6 +36,7 @@ CommandPtr MoveCmd::combine(const CommandPtr& later) {
     const boost::shared_ptr<MoveCmd> both = create(track_, media_, amount_ + move->amount_);
     both->resultTrack_ = move->resultTrack_;
     both->resultMedia_ = move->resultMedia_;
+    both->saved_ = saved_;
     return both;
 }
 
@@ -38,11 +48,16 @@ boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const 
 }
 
 bool AddMediaCmd::execute(CommandHandler* handler) {
+    saveState();
     return keep(handler->addMedia(track_, media_, amount_));
 }
 
+// Placing a clip changes only its start; off the track again, it takes back
+// the one it had.
 bool AddMediaCmd::unexecute(CommandHandler* handler) {
-    return bool(handler->removeMedia(resultTrack_, resultMedia_).second);
+    if (!handler->removeMedia(resultTrack_, resultMedia_).second) return false;
+    resultMedia_->setTrackStart(saved_.start);
+    return true;
 }
 
 boost::shared_ptr<RemoveMediaCmd> RemoveMediaCmd::create(const TrackPtr& track, const MediaPtr& media) {

@@ -52,10 +52,11 @@ void BatchCmd::reportProgress(double fraction) {
             if (*callback) (*callback)(fraction);
 }
 
+// Every command of a batch is needed: one that refuses refuses the batch.
 void BatchCmd::executeCommands(const CommandHandler*) {
     const double count = double(commands_.size());
     for (size_t i = 0; i < commands_.size(); ++i) {
-        execute(commands_[i]);
+        if (!executeRequired(commands_[i])) return;
         reportProgress(double(i + 1) / count);
     }
     reportProgress(1.0);

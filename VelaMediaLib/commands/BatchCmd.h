@@ -7,7 +7,8 @@
 namespace VelaMediaLib {
 
 /// Ready-made commands executed one after another as one undo step, telling
-/// progress callbacks the fraction done after each.
+/// progress callbacks the fraction done after each. A command that refuses
+/// refuses the batch: the ones before it are undone and execute reports false.
 class BatchCmd : public MultiCommand {
 public:
     typedef boost::function<bool(double)> ProgressCallback;

@@ -38,12 +38,23 @@ void ChangeTrackFlagCmd::set(bool value) {
 
 bool ChangeTrackFlagCmd::execute(CommandHandler*) {
     previous_ = current();
+    if (flag_ == Locked) {
+        hadLockEntry_ = track_->hasMetaData(Track::isLockedMetaDataKey());
+        previousLockText_ = track_->metaDataValue(Track::isLockedMetaDataKey());
+    }
     set(value_);
     return true;
 }
 
 bool ChangeTrackFlagCmd::unexecute(CommandHandler*) {
-    set(previous_);
+    if (flag_ != Locked) {
+        set(previous_);
+    } else if (hadLockEntry_) {
+        track_->addMetaData(Track::isLockedMetaDataKey(), previousLockText_);
+    } else {
+        set(false); // observers of the entry hear the track unlocked before it goes
+        track_->removeMetaData(Track::isLockedMetaDataKey());
+    }
     return true;
 }
 

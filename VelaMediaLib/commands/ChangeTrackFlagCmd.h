@@ -5,8 +5,9 @@
 
 namespace VelaMediaLib {
 
-/// Sets one of a track's flags (locked, hidden or solo) and puts back the
-/// value it had on undo.
+/// Sets one of a track's flags (locked, hidden or solo) and puts back what
+/// it had on undo: for the locked flag, kept as metadata, that is the entry's
+/// text, or no entry at all when there was none.
 class ChangeTrackFlagCmd : public Command {
 public:
     enum Flag { Locked, Hidden, Solo };
@@ -26,6 +27,8 @@ private:
     Flag flag_;
     bool value_;
     bool previous_ = false;
+    bool hadLockEntry_ = false;
+    std::string previousLockText_;
 };
 
 } // namespace VelaMediaLib

@@ -3,6 +3,14 @@
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 
 namespace VelaMediaLib {
+namespace {
+
+struct Shift {
+    MediaPtr media;
+    VelaTime delta;
+};
+
+} // namespace
 
 boost::shared_ptr<CloseGapsOnTrackCmd> CloseGapsOnTrackCmd::create(const TrackPtr& track) {
     if (!track) throw VelaMediaLibException("no track to close gaps on");
@@ -12,21 +20,39 @@ boost::shared_ptr<CloseGapsOnTrackCmd> CloseGapsOnTrackCmd::create(const TrackPt
 }
 
 bool CloseGapsOnTrackCmd::hasGap(const Track& track) {
+    ScopedReadLock lock(track.projectMutex()); // one snapshot of the whole track
     VelaTime expected = 0;
     for (const MediaPtr& media : track.medias()) {
-        if (media->startTime() != expected) return true;
-        expected = media->endTime();
+        const Range<VelaTime> range = media->lockedTrackRange();
+        if (range.start() != expected) return true;
+        expected = range.end();
     }
     return false;
 }
 
+bool CloseGapsOnTrackCmd::execute(CommandHandler* handler) {
+    started_ = true;
+    return MultiCommand::execute(handler) && numUndoCommands() > 0;
+}
+
+// Each clip's target is the sum of the durations before it. A clip moving
+// left only lands where the clips before it have already gone (or still end
+// earlier); one moving right only where the clips after it have gone.
 void CloseGapsOnTrackCmd::executeCommands(const CommandHandler*) {
-    VelaTime position = 0;
-    for (const MediaPtr& media : track_->medias()) {
-        if (media->startTime() != position)
-            execute(MoveCmd::create(track_, media, position - media->startTime()));
-        position = media->endTime();
+    std::vector<Shift> shifts;
+    {
+        ScopedReadLock lock(track_->projectMutex());
+        VelaTime position = 0;
+        for (const MediaPtr& media : track_->medias()) {
+            const Range<VelaTime> range = media->lockedTrackRange();
+            if (range.start() != position) shifts.push_back(Shift{media, position - range.start()});
+            position += range.duration();
+        }
     }
+    for (const Shift& shift : shifts)
+        if (shift.delta < 0 && !executeRequired(MoveCmd::create(track_, shift.media, shift.delta))) return;
+    for (auto shift = shifts.rbegin(); shift != shifts.rend(); ++shift)
+        if (shift->delta > 0 && !executeRequired(MoveCmd::create(track_, shift->media, shift->delta))) return;
 }
 
 } // namespace VelaMediaLib

@@ -5,15 +5,22 @@
 
 namespace VelaMediaLib {
 
-/// Closes every gap on a track, the one before the first clip included: each
-/// clip that does not start where the previous one ends (0 for the first) is
-/// moved back there with a MoveCmd.
+/// Closes every gap on a track, the one before the first clip included: the
+/// clips keep their order and end up one after another from 0, each moved
+/// with a MoveCmd. Moves to the left go first, earliest clip first, then
+/// moves to the right, latest clip first, so no move lands on a clip that
+/// has not moved yet. A refused move refuses the whole command (rolled back,
+/// false); so does a track without a gap, which leaves nothing to record.
 class CloseGapsOnTrackCmd : public MultiCommand {
 public:
     static boost::shared_ptr<CloseGapsOnTrackCmd> create(const TrackPtr& track);
     const TrackPtr& track() const { return track_; }
     /// Whether the track has a gap to close.
     static bool hasGap(const Track& track);
+    bool execute(CommandHandler* handler) override;
+    using MultiCommand::execute;
+    /// Whether execute has begun: a request still waiting to run has not.
+    bool hasStarted() const { return started_; }
 
 protected:
     void executeCommands(const CommandHandler* handler) override;
@@ -21,6 +28,7 @@ protected:
 private:
     explicit CloseGapsOnTrackCmd(const TrackPtr& track) : track_(track) {}
     TrackPtr track_;
+    bool started_ = false;
 };
 
 } // namespace VelaMediaLib

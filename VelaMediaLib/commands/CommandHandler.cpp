@@ -17,6 +17,10 @@ CommandHandler::TrackAndMedia attempt(const TrackPtr& track, const MediaPtr& med
         return CommandHandler::TrackAndMedia();
     } catch (const AddRemoveException&) {
         return CommandHandler::TrackAndMedia();
+    } catch (const ValueException<double>&) { // a stretch to nothing
+        return CommandHandler::TrackAndMedia();
+    } catch (const ValueException<const SafeRational>&) { // a state the clip does not accept
+        return CommandHandler::TrackAndMedia();
     }
     return CommandHandler::TrackAndMedia(track, media);
 }
@@ -37,6 +41,18 @@ CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::trimMediaStart(c
 CommandHandler::TrackAndMedia
 ProjectIndependentCommandHandler::trimMediaEnd(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
     return attempt(track, media, [&] { track->trimEnd(media, delta); });
+}
+
+CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::stretchMedia(const TrackPtr& track,
+                                                                             const MediaPtr& media,
+                                                                             const SafeRational& factor) {
+    return attempt(track, media, [&] { track->stretch(media, factor); });
+}
+
+CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::restoreMediaState(const TrackPtr& track,
+                                                                                  const MediaPtr& media,
+                                                                                  const MediaState& state) {
+    return attempt(track, media, [&] { track->restoreMediaState(media, state, 0); });
 }
 
 CommandHandler::TrackAndMedia

@@ -5,11 +5,14 @@
 #include <VelaMediaLib/time/SubjectWithMutex.h>
 
 #include <cstdint>
+#include <deque>
 #include <list>
 
 namespace VelaMediaLib {
 
-/// Told before and after each command the history executes.
+class MultiCommand;
+
+/// Told before and after each command the history executes, follow-ups included.
 class CommandHistoryObserver {
 public:
     virtual ~CommandHistoryObserver() = default;
@@ -26,21 +29,44 @@ struct CommandHistoryState {
 /// The undo and redo stacks. Its observers hear after every change of the
 /// stacks. When given the project's token, each execute, undo and redo runs
 /// under a notify delay, so every object it changed notifies once at the end.
+///
+/// Follow-ups queued while a command runs (by observers hearing its changes)
+/// run after it, once its delay has ended, each recorded as a step of its
+/// own; a refused one is not recorded, one that throws leaves the stacks
+/// alone and the rest still run. Undo and redo replay recorded steps only:
+/// follow-ups queued meanwhile are dropped.
 class CommandHistory : public VelaObject, public Cloneable, public SubjectWithMutex, public CommandExecutor {
 public:
     explicit CommandHistory(CommandHandler* handler, const boost::weak_ptr<const ThreadSafe>& token =
                                                          boost::weak_ptr<const ThreadSafe>());
 
+    /// Executes and records the command, folds it as asked (combineNextCommand,
+    /// auto-combining), then runs the follow-ups.
     bool execute(const CommandPtr& command) override;
+    /// Queued while idle (a host editing the model directly), a follow-up
+    /// waits for the next execute or runFollowUps.
+    void queueFollowUp(const CommandPtr& command) override;
+    void runFollowUps();
+    size_t numFollowUps() const { return followUps_.size(); }
+    /// False when the command refused to undo: both stacks stay as they were.
     /// Throws VelaMediaLibException "no commands to undo".
-    void undo();
-    /// Throws VelaMediaLibException "no commands to redo".
-    void redo();
-    void undoAll();
-    void redoAll();
+    bool undo();
+    /// False when the command refused to redo. Throws "no commands to redo".
+    bool redo();
+    /// Stop at the first refusal and report false.
+    bool undoAll();
+    bool redoAll();
     /// Folds the newest two commands into one with combine; fewer than two: nothing.
     void combineLastCommands();
-    /// -1: no limit; 0 or more: the most commands the undo stack keeps.
+    /// The next command executed here that takes effect is folded into the
+    /// step before it; the follow-ups it causes stay steps of their own.
+    void combineNextCommand() { combineNext_ = true; }
+    /// Until the end, every step after the first (follow-ups included) is
+    /// folded into one, so the whole gesture undoes at once.
+    void beginAutoCommandCombining();
+    void endAutoCommandCombining() { autoCombining_ = false; }
+    bool isAutoCommandCombining() const { return autoCombining_; }
+    /// Below 0: no limit; 0 or more: the most commands the undo stack keeps.
     void setUndoLimit(int limit);
     int undoLimit() const { return undoLimit_; }
     const std::list<CommandPtr>& undoStack() const { return state_.undoStack; }
@@ -58,20 +84,33 @@ public:
     boost::shared_ptr<CommandHistory> clone() const;
 
 private:
+    friend class MultiCommand;
+    class Running;
+
     /// Runs one step under the project's notify delay, unless one is being delivered.
     template <typename Step>
     void delayedNotifications(Step step);
     void trimToLimit();
+    /// Executes the command as one step and records it when it took effect.
+    bool record(const CommandPtr& command);
+    void fold(bool followUp);
     template <typename Replay>
-    void replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
+    bool replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
                 Replay step);
 
     CommandHandler* handler_;
     boost::weak_ptr<const ThreadSafe> token_;
     CommandHistoryState state_;
+    std::deque<CommandPtr> followUps_;
     int undoLimit_ = -1;
     uint32_t transactionNumber_ = 1;
     int replaying_ = 0;
+    int depth_ = 0;      // commands of this history running
+    int draining_ = 0;   // follow-ups running
+    bool inner_ = false; // a composite's: follow-ups go to the history running it
+    bool combineNext_ = false;
+    bool autoCombining_ = false;
+    bool autoCombinedFirst_ = false;
     boost::weak_ptr<CommandHistoryObserver> observer_;
 };
 

@@ -5,7 +5,10 @@
 namespace VelaMediaLib {
 
 /// Two commands executed as one: the second only when the first took effect,
-/// and undone in reverse order. If the second refuses, the first is undone.
+/// and undone in reverse order. Like every composite it is never left half
+/// done: when the second refuses or throws, the first is put back (and the
+/// second's exception goes on); the same holds for undo and redo. When the
+/// first cannot be put back: VelaMediaLibFatalException.
 class CommandPair : public Command {
 public:
     static boost::shared_ptr<CommandPair> create(const CommandPtr& first, const CommandPtr& second);

@@ -1,28 +1,75 @@
 #include <VelaMediaLib/commands/MultiCommand.h>
 
+#include <VelaMediaLib/time/VelaMediaLibException.h>
+
+#include <exception>
+
 namespace VelaMediaLib {
+
+MultiCommand::MultiCommand() : history_(nullptr) { history_.inner_ = true; }
+
+void MultiCommand::rollBack() {
+    if (!history_.undoAll())
+        throw VelaMediaLibFatalException("a composite could not undo its finished sub-commands");
+    history_.restoreState(CommandHistoryState());
+}
 
 bool MultiCommand::execute(CommandHandler* handler) {
     history_.setHandler(handler);
+    refused_ = false;
     try {
         executeCommands(handler);
     } catch (...) {
-        history_.undoAll();
-        throw;
+        const std::exception_ptr original = std::current_exception();
+        try {
+            rollBack();
+        } catch (...) {
+            // The rollback's own failure must not hide what went wrong first.
+        }
+        std::rethrow_exception(original);
     }
-    return true;
+    if (!refused_) return true;
+    rollBack();
+    return false;
+}
+
+bool MultiCommand::executeRequired(const CommandPtr& command) {
+    if (execute(command)) return true;
+    refused_ = true;
+    return false;
+}
+
+void MultiCommand::replayBack(size_t count, bool backwards) {
+    for (size_t i = 0; i < count; ++i)
+        if (!(backwards ? history_.redo() : history_.undo()))
+            throw VelaMediaLibFatalException("a composite could not put back its replayed sub-commands");
+}
+
+bool MultiCommand::replayAll(bool backwards) {
+    const std::list<CommandPtr>& from = backwards ? history_.undoStack() : history_.redoStack();
+    size_t replayed = 0;
+    try {
+        while (!from.empty() && (backwards ? history_.undo() : history_.redo())) ++replayed;
+    } catch (...) {
+        const std::exception_ptr original = std::current_exception();
+        try {
+            replayBack(replayed, backwards);
+        } catch (...) {}
+        std::rethrow_exception(original);
+    }
+    if (from.empty()) return true;
+    replayBack(replayed, backwards);
+    return false;
 }
 
 bool MultiCommand::unexecute(CommandHandler* handler) {
     history_.setHandler(handler);
-    history_.undoAll();
-    return true;
+    return replayAll(true);
 }
 
 bool MultiCommand::reexecute(CommandHandler* handler) {
     history_.setHandler(handler);
-    history_.redoAll();
-    return true;
+    return replayAll(false);
 }
 
 bool MultiCommand::execute(const CommandPtr& command) { return history_.execute(command); }

@@ -101,6 +101,8 @@ VersionInfo InternalProject::authorVersionInfo() const {
     return info;
 }
 
+// The history folds the command as asked and runs its follow-ups; its
+// stacks are whole whenever it throws, and are put back all the same.
 bool InternalProject::execute(const CommandPtr& command) {
     const CommandHistoryState saved = history_->state();
     bool done = false;
@@ -115,28 +117,20 @@ bool InternalProject::execute(const CommandPtr& command) {
         }
         throw;
     }
-    if (done && (combineNext_ || (autoCombining_ && autoCombinedFirst_))) {
-        history_->combineLastCommands();
-        combineNext_ = false;
-    }
-    if (done && autoCombining_) autoCombinedFirst_ = true;
     commandSubject_->notify();
     return done;
 }
 
-void InternalProject::beginAutoCommandCombining() {
-    autoCombining_ = true;
-    autoCombinedFirst_ = false;
+bool InternalProject::undo() {
+    const bool done = history_->undo();
+    commandSubject_->notify();
+    return done;
 }
 
-void InternalProject::undo() {
-    history_->undo();
+bool InternalProject::redo() {
+    const bool done = history_->redo();
     commandSubject_->notify();
-}
-
-void InternalProject::redo() {
-    history_->redo();
-    commandSubject_->notify();
+    return done;
 }
 
 } // namespace VelaMediaLib

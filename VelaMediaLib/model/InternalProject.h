@@ -67,14 +67,15 @@ public:
     /// occurred restoring command state after exception thrown during project
     /// execution") and the exception goes on.
     bool execute(const CommandPtr& command) override;
+    void queueFollowUp(const CommandPtr& command) override { history_->queueFollowUp(command); }
     bool isReplaying() const override { return history_->isReplaying(); }
-    void undo() override;
-    void redo() override;
+    bool undo() override;
+    bool redo() override;
     void combineLastCommands() override { history_->combineLastCommands(); }
-    void combineNextCommand() override { combineNext_ = true; }
-    void beginAutoCommandCombining() override;
-    void endAutoCommandCombining() override { autoCombining_ = false; }
-    bool isAutoCommandCombining() const override { return autoCombining_; }
+    void combineNextCommand() override { history_->combineNextCommand(); }
+    void beginAutoCommandCombining() override { history_->beginAutoCommandCombining(); }
+    void endAutoCommandCombining() override { history_->endAutoCommandCombining(); }
+    bool isAutoCommandCombining() const override { return history_->isAutoCommandCombining(); }
     CommandHistoryState commandState() const override { return history_->state(); }
     void restoreCommandState(const CommandHistoryState& state) override { history_->restoreState(state); }
     void setCommandHandler(CommandHandler* handler) override { history_->setHandler(handler); }
@@ -105,9 +106,6 @@ private:
     boost::shared_ptr<CommandHistory> history_;
     std::unique_ptr<SubjectWithMutex> commandSubject_;
     std::unique_ptr<TrackMagnetizerAutoAttacher> magnetizers_; // goes before the timeline
-    bool combineNext_ = false;
-    bool autoCombining_ = false;
-    bool autoCombinedFirst_ = false;
     bool parsing_ = false;
 };
 

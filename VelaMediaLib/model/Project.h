@@ -80,14 +80,17 @@ public:
     virtual bool removeClipping(const MixerPtr& clipping) = 0;
 
     // Commands
+    /// False when the command refused to undo: both stacks stay as they were.
     /// Throws VelaMediaLibException "no commands to undo".
-    virtual void undo() = 0;
-    /// Throws VelaMediaLibException "no commands to redo".
-    virtual void redo() = 0;
+    virtual bool undo() = 0;
+    /// False when the command refused to redo. Throws "no commands to redo".
+    virtual bool redo() = 0;
     virtual void combineLastCommands() = 0;
-    /// The next command that takes effect is folded into the last one.
+    /// The next command that takes effect is folded into the last step; the
+    /// follow-ups it causes stay steps of their own. Kept by the history.
     virtual void combineNextCommand() = 0;
-    /// Until the end, every command that takes effect after the first is folded into one step.
+    /// Until the end, every step that takes effect after the first (follow-ups
+    /// included) is folded into one.
     virtual void beginAutoCommandCombining() = 0;
     virtual void endAutoCommandCombining() = 0;
     virtual bool isAutoCommandCombining() const = 0;

@@ -7,30 +7,29 @@
 namespace VelaMediaLib {
 
 TrackMagnetizer::TrackMagnetizer(const TrackPtr& track, CommandExecutor& executor)
-    : track_(track), executor_(executor), trigger_(track->projectMutex()) {
+    : track_(track), executor_(executor), flag_(track->magneticAttribute()), magnetic_(flag_->value()) {
     track->attachAddObserver(this);
-    track->magneticAttribute()->attach(this);
-    trigger_.attach(this);
+    flag_->attachWithoutNotifyDelay(this);
     for (const MediaPtr& media : track->medias()) observe(media);
 }
 
 TrackMagnetizer::~TrackMagnetizer() {
     for (const boost::weak_ptr<Media>& held : clips_)
         if (const MediaPtr media = held.lock()) media->detach(this);
-    if (const TrackPtr track = track_.lock()) {
-        track->detachAddObserver(this);
-        track->magneticAttribute()->detach(this);
-    }
+    flag_->detach(this);
+    if (const TrackPtr track = track_.lock()) track->detachAddObserver(this);
 }
 
+// Heard at once, without waiting for the edit's delay: hearing only queues a
+// request, and a clip that nobody else observes is then not held back at all.
 void TrackMagnetizer::observe(const MediaPtr& media) {
-    media->attach(this);
+    media->attachWithoutNotifyDelay(this);
     clips_.push_back(media);
 }
 
 void TrackMagnetizer::onTrackAddMedia(Track&, const MediaPtr& media) {
     observe(media);
-    trigger_.notify();
+    requestClosing();
 }
 
 void TrackMagnetizer::onTrackRemoveMedia(Track&, const MediaPtr& media) {
@@ -40,21 +39,27 @@ void TrackMagnetizer::onTrackRemoveMedia(Track&, const MediaPtr& media) {
                                     return held.expired() || held.lock() == media;
                                 }),
                  clips_.end());
-    trigger_.notify();
+    requestClosing();
 }
 
-void TrackMagnetizer::update(Observable*) {
-    if (running_ || executor_.isReplaying()) return;
+void TrackMagnetizer::update(Observable* subject) {
+    if (subject == flag_.get()) magnetic_ = flag_->value();
+    requestClosing();
+}
+
+// Cheap on purpose, as it runs inside every edit of the track's clips: the
+// flag is kept at hand, and closing gaps moves every clip after the gap, each
+// of them heard again; only the first change after a request has started
+// asks for another (which finds no gap and records nothing).
+void TrackMagnetizer::requestClosing() {
+    if (!magnetic_) return;
+    const boost::shared_ptr<CloseGapsOnTrackCmd> waiting = waiting_.lock();
+    if ((waiting && !waiting->hasStarted()) || executor_.isReplaying()) return;
     const TrackPtr track = track_.lock();
-    if (!track || !track->attributeValue("magnetic", false) || !CloseGapsOnTrackCmd::hasGap(*track)) return;
-    running_ = true;
-    try {
-        executor_.execute(CloseGapsOnTrackCmd::create(track));
-    } catch (...) {
-        running_ = false;
-        throw;
-    }
-    running_ = false;
+    if (!track) return;
+    const boost::shared_ptr<CloseGapsOnTrackCmd> request = CloseGapsOnTrackCmd::create(track);
+    executor_.queueFollowUp(request);
+    waiting_ = request;
 }
 
 } // namespace VelaMediaLib

@@ -6,15 +6,16 @@
 
 namespace VelaMediaLib {
 
+class CloseGapsOnTrackCmd;
+
 /// Keeps a magnetic track free of gaps: it observes the track's clips, its
 /// "magnetic" flag and the clips coming and going, and when the flag is set
-/// and the track has a gap it runs CloseGapsOnTrackCmd through the executor,
-/// so that closing the gaps is an undo step of its own. A change heard while
-/// the executor undoes or redoes, or while its own command runs, is left alone.
-///
-/// A clip that comes or goes is answered through a subject of the magnetizer's
-/// own, so that the answer waits for the notify delay of the edit that caused
-/// it and is recorded after that edit.
+/// it queues CloseGapsOnTrackCmd on the executor as a follow-up. It never
+/// edits from inside a notification: the history runs the request after the
+/// edit that caused it, as an undo step of its own (recorded only when the
+/// track has a gap by then). It hears changes at once (without notify delay)
+/// since all it does is queue; one request waits at a time, however many
+/// changes it hears; while the executor replays, it asks for nothing.
 class TrackMagnetizer : public Observer, public TrackAddObserver {
 public:
     TrackMagnetizer(const TrackPtr& track, CommandExecutor& executor);
@@ -28,12 +29,14 @@ public:
 
 private:
     void observe(const MediaPtr& media);
+    void requestClosing();
 
     boost::weak_ptr<Track> track_;
     CommandExecutor& executor_;
-    Subject trigger_;
+    boost::shared_ptr<Attribute<bool>> flag_; // the track's "magnetic" attribute
+    bool magnetic_;
     std::vector<boost::weak_ptr<Media>> clips_;
-    bool running_ = false;
+    boost::weak_ptr<CloseGapsOnTrackCmd> waiting_;
 };
 
 } // namespace VelaMediaLib

@@ -7,12 +7,13 @@
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
+#include <stdexcept>
 
 using namespace VelaMediaLib;
 
 namespace {
 
-// Adds its amount to a counter; reports false when told to.
+// Adds its amount to a counter; reports false when told to, on any step.
 class CountCmd : public Command {
 public:
     static boost::shared_ptr<CountCmd> create(int& counter, int amount, bool succeeds = true) {
@@ -24,9 +25,14 @@ public:
         return true;
     }
     bool unexecute(CommandHandler*) override {
+        if (throwOnUndo) throw std::runtime_error("undo failed on purpose");
+        if (refuseUndo) return false;
         counter_ -= amount_;
         return true;
     }
+    bool reexecute(CommandHandler* handler) override { return !refuseRedo && execute(handler); }
+
+    bool refuseUndo = false, refuseRedo = false, throwOnUndo = false;
 
 private:
     CountCmd(int& counter, int amount, bool succeeds)
@@ -36,12 +42,36 @@ private:
     bool succeeds_;
 };
 
+// Counts, and queues a follow-up as an observer of its change would.
+class QueueingCmd : public Command {
+public:
+    QueueingCmd(CommandExecutor& executor, int& counter, CommandPtr followUp)
+        : executor_(executor), counter_(counter), followUp_(followUp) {}
+    bool execute(CommandHandler*) override {
+        ++counter_;
+        executor_.queueFollowUp(followUp_);
+        seenBeforeFollowUp = counter_;
+        return true;
+    }
+    bool unexecute(CommandHandler*) override {
+        --counter_;
+        executor_.queueFollowUp(followUp_); // heard during a replay: dropped
+        return true;
+    }
+    int seenBeforeFollowUp = 0;
+
+private:
+    CommandExecutor& executor_;
+    int& counter_;
+    CommandPtr followUp_;
+};
+
 struct ThrowCmd : Command {
     bool execute(CommandHandler*) override { throw VelaMediaLibException("refused on purpose"); }
     bool unexecute(CommandHandler*) override { return true; }
 };
 
-std::string messageOf(void (CommandHistory::*step)(), CommandHistory& history) {
+std::string messageOf(bool (CommandHistory::*step)(), CommandHistory& history) {
     try {
         (history.*step)();
     } catch (const VelaMediaLibException& e) {
@@ -66,11 +96,11 @@ TEST_F(History, UndoLimitsKeepTheNewestCommands) {
     EXPECT_EQ(history.undoStack(), (std::list<CommandPtr>{second, third}));
     history.setUndoLimit(0);
     EXPECT_TRUE(history.undoStack().empty());
-    EXPECT_EQ(counter, 7); // dropping commands undoes nothing
-    history.setUndoLimit(-1);
+    EXPECT_EQ(counter, 7);    // dropping commands undoes nothing
+    history.setUndoLimit(-5); // stored as given: any negative limit is no cap
+    EXPECT_EQ(history.undoLimit(), -5);
     for (int i = 0; i < 50; ++i) history.execute(add(1));
     EXPECT_EQ(history.undoStack().size(), 50u);
-    EXPECT_EQ(history.undoLimit(), -1);
 }
 
 TEST_F(History, UndoRedoAndANewCommandClearingRedo) {
@@ -175,4 +205,163 @@ TEST_F(History, BatchesPairsAndNothing) {
     EXPECT_FALSE(history.execute(CommandPair::create(add(10), CountCmd::create(counter, 1, false))));
     EXPECT_EQ(counter, 7); // the first undone again when the second refuses
     EXPECT_TRUE(history.execute(NullCmd::create()));
+}
+
+TEST_F(History, ARefusedUndoOrRedoLeavesBothStacksAndSaysSo) {
+    const auto command = CountCmd::create(counter, 1);
+    history.execute(add(10));
+    history.execute(command);
+    const CommandHistoryState before = history.state();
+    command->refuseUndo = true;
+    EXPECT_FALSE(history.undo());
+    EXPECT_EQ(history.undoStack(), before.undoStack);
+    EXPECT_TRUE(history.redoStack().empty());
+    EXPECT_FALSE(history.undoAll()); // stops at the refusal
+    EXPECT_EQ(counter, 11);
+    command->refuseUndo = false;
+    command->refuseRedo = true;
+    EXPECT_TRUE(history.undo());
+    EXPECT_FALSE(history.redo());
+    EXPECT_EQ(history.undoStack().size(), 1u);
+    EXPECT_EQ(history.redoStack().size(), 1u);
+    EXPECT_EQ(counter, 10);
+}
+
+TEST_F(History, ACompositeReplaysBackWhenASubCommandRefusesToUndoOrRedo) {
+    const auto stubborn = CountCmd::create(counter, 2);
+    const auto composite = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->execute(add(1));
+        self->execute(stubborn);
+        self->execute(add(4));
+    });
+    history.execute(composite);
+    stubborn->refuseUndo = true;
+    EXPECT_FALSE(history.undo());
+    EXPECT_EQ(counter, 7); // the 4 undone and redone again
+    EXPECT_EQ(composite->numUndoCommands(), 3u);
+    stubborn->refuseUndo = false;
+    EXPECT_TRUE(history.undo());
+    EXPECT_EQ(counter, 0);
+    stubborn->refuseRedo = true;
+    EXPECT_FALSE(history.redo());
+    EXPECT_EQ(counter, 0);
+    EXPECT_EQ(history.redoStack().size(), 1u);
+}
+
+TEST_F(History, ABatchOrPairRefusesAsAWholeAndPutsBackWhatRan) {
+    const auto batch =
+        BatchCmd::create(std::vector<CommandPtr>{add(1), add(2), CountCmd::create(counter, 4, false)});
+    EXPECT_FALSE(history.execute(batch));
+    EXPECT_EQ(counter, 0);
+    EXPECT_TRUE(history.undoStack().empty());
+
+    EXPECT_THROW(history.execute(CommandPair::create(add(10), boost::make_shared<ThrowCmd>())),
+                 VelaMediaLibException);
+    EXPECT_EQ(counter, 0); // the first put back when the second threw
+    const auto second = CountCmd::create(counter, 20);
+    history.execute(CommandPair::create(add(10), second));
+    const auto first = boost::dynamic_pointer_cast<CountCmd>(
+        boost::dynamic_pointer_cast<CommandPair>(history.lastUndoCommand())->command1());
+    first->refuseUndo = true;
+    EXPECT_FALSE(history.undo());
+    EXPECT_EQ(counter, 30); // the second redone after the first refused
+}
+
+TEST_F(History, ACompositeRethrowsTheOriginalExceptionWhenItsRollbackFails) {
+    const auto unrollable = CountCmd::create(counter, 1);
+    unrollable->throwOnUndo = true;
+    const auto composite = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->execute(unrollable);
+        throw VelaMediaLibException("the first failure");
+    });
+    try {
+        history.execute(composite);
+        FAIL() << "no exception";
+    } catch (const VelaMediaLibException& e) {
+        EXPECT_STREQ(e.what(), "the first failure");
+    }
+    EXPECT_TRUE(history.undoStack().empty());
+}
+
+TEST_F(History, FollowUpsRunAfterTheCommandAsStepsOfTheirOwn) {
+    const auto command = boost::make_shared<QueueingCmd>(history, counter, add(10));
+    EXPECT_TRUE(history.execute(command));
+    EXPECT_EQ(command->seenBeforeFollowUp, 1); // not run from inside the command
+    EXPECT_EQ(counter, 11);
+    ASSERT_EQ(history.undoStack().size(), 2u);
+    history.undo(); // the follow-up alone
+    EXPECT_EQ(counter, 1);
+    history.undo(); // queues again while replaying: dropped
+    EXPECT_EQ(history.numFollowUps(), 0u);
+    history.redo();
+    EXPECT_EQ(counter, 1);
+    EXPECT_EQ(history.numFollowUps(), 0u);
+    EXPECT_EQ(history.redoStack().size(), 1u);
+}
+
+TEST_F(History, ARefusedOrThrowingFollowUpLeavesTheStacksAndTheOthersRun) {
+    struct Observer : CommandHistoryObserver {
+        std::vector<bool> results;
+        void commandWillExecute(const CommandPtr&, uint32_t) override {}
+        void commandDidExecute(const CommandPtr&, uint32_t, bool result) override {
+            results.push_back(result);
+        }
+    };
+    const auto observer = boost::make_shared<Observer>();
+    history.setObserver(observer);
+    const auto composite = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->queueFollowUp(CountCmd::create(counter, 100, false));
+        self->queueFollowUp(LambdaMultiCommand::create([&](MultiCommand* inner) {
+            inner->execute(add(1000));
+            throw VelaMediaLibException("the follow-up failed");
+        }));
+        self->queueFollowUp(add(10));
+        self->execute(add(1));
+    });
+    EXPECT_TRUE(history.execute(composite));
+    EXPECT_EQ(counter, 11);
+    EXPECT_EQ(history.undoStack().size(), 2u); // the composite, then the one follow-up that took effect
+    EXPECT_EQ(observer->results, (std::vector<bool>{true, false, false, true}));
+}
+
+TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesWaitForTheNext) {
+    history.queueFollowUp(add(5)); // queued while idle: waits
+    EXPECT_EQ(counter, 0);
+    const auto refused = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->queueFollowUp(add(100));
+        self->executeFunc()(CountCmd::create(counter, 1, false));
+        throw VelaMediaLibException("refused");
+    });
+    EXPECT_THROW(history.execute(refused), VelaMediaLibException);
+    EXPECT_EQ(history.numFollowUps(), 1u);
+    history.execute(add(1));
+    EXPECT_EQ(counter, 6);
+    EXPECT_EQ(history.undoStack().size(), 2u);
+    history.queueFollowUp(add(20));
+    history.runFollowUps();
+    EXPECT_EQ(counter, 26);
+
+    const auto loose = LambdaMultiCommand::create([&](MultiCommand* self) { self->queueFollowUp(add(1)); });
+    EXPECT_THROW(loose->execute(static_cast<CommandHandler*>(nullptr)),
+                 VelaMediaLibException); // no history runs it
+}
+
+TEST_F(History, CombiningFoldsTheCommandItWasMeantForNotItsFollowUps) {
+    history.execute(add(1));
+    history.combineNextCommand();
+    EXPECT_FALSE(history.execute(CountCmd::create(counter, 7, false))); // refused: the request waits
+    history.execute(boost::make_shared<QueueingCmd>(history, counter, add(10)));
+    ASSERT_EQ(history.undoStack().size(), 2u); // [1 + queueing], [follow-up]
+    history.undo();
+    EXPECT_EQ(counter, 2);
+    history.undo();
+    EXPECT_EQ(counter, 0);
+
+    history.beginAutoCommandCombining();
+    history.execute(boost::make_shared<QueueingCmd>(history, counter, add(10)));
+    history.execute(add(100));
+    history.endAutoCommandCombining();
+    EXPECT_EQ(history.undoStack().size(), 1u); // the gesture, follow-ups included, is one step
+    history.undo();
+    EXPECT_EQ(counter, 0);
 }

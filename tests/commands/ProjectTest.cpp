@@ -6,7 +6,10 @@
 #include <VelaMediaLib/model/LockData.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
 #include <VelaMediaLib/model/SymbolTable.h>
+#include <VelaMediaLib/time/NotifyDelay.h>
 
+#include <algorithm>
+#include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
 
 using namespace VelaMediaLib;
@@ -159,6 +162,71 @@ TEST_F(ProjectTest, AMagneticTrackClosesItsGapsAsAnUndoStepOfItsOwn) {
     EXPECT_EQ(loose->startTime(), 50); // not magnetic: stays
 }
 
+TEST_F(ProjectTest, TheMagnetizerQueuesItsClosingInsteadOfEditingFromANotification) {
+    struct Watcher : CommandHistoryObserver {
+        ProjectPtr project;
+        std::vector<bool> insideDelivery;
+        void commandWillExecute(const CommandPtr& command, uint32_t) override {
+            if (command->name() == "Close Gaps")
+                insideDelivery.push_back(
+                    NotifyDelay::isNotifying(boost::shared_ptr<const ThreadSafe>(project->token())));
+        }
+        void commandDidExecute(const CommandPtr&, uint32_t, bool) override {}
+    };
+    const auto watcher = boost::make_shared<Watcher>();
+    watcher->project = project;
+    project->commandHistory()->setObserver(watcher);
+    track->magneticAttribute()->setValue(true);
+    place(5, 10);
+    ASSERT_FALSE(watcher->insideDelivery.empty());
+    EXPECT_EQ(std::count(watcher->insideDelivery.begin(), watcher->insideDelivery.end(), true), 0);
+    watcher->project.reset();
+}
+
+TEST_F(ProjectTest, CombineNextFoldsTheCommandItWasMeantForNotTheClosingItCauses) {
+    track->magneticAttribute()->setValue(true);
+    place(0, 10);
+    const MediaPtr second = place(10, 10);
+    place(20, 10);
+    ASSERT_EQ(project->commandHistory()->undoStack().size(), 3u); // no gap: nothing closed
+    project->combineNextCommand();
+    project->execute(RemoveMediaCmd::create(track, second));
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10}));
+    ASSERT_EQ(project->commandHistory()->undoStack().size(), 4u);
+    EXPECT_EQ(project->commandHistory()->undoStack().back()->name(), "Close Gaps");
+    project->undo(); // the closing
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 20}));
+    project->undo(); // the third clip's addition and the removal, as one step
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10}));
+}
+
+TEST_F(ProjectTest, AMagneticTrackStartsAtZeroWhateverTheClipsStarts) {
+    track->magneticAttribute()->setValue(true);
+    const MediaPtr early = place(-39, 10);
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0}));
+    const MediaPtr late = place(10, 10);
+    project->execute(MoveCmd::create(track, late, -40)); // to [-30, -20), before the first
+    EXPECT_EQ(late->startTime(), 0);
+    EXPECT_EQ(early->startTime(), 10);
+    project->undo();
+    EXPECT_EQ(late->startTime(), -30);
+    EXPECT_EQ(early->startTime(), 0);
+    project->undo();
+    EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10}));
+    EXPECT_EQ(late->startTime(), 10);
+}
+
+TEST_F(ProjectTest, AnUndoTheModelRefusesLeavesTheStacks) {
+    const MediaPtr media = place(20, 10);
+    project->execute(MoveCmd::create(track, media, 30));
+    track->addMedia(clip(10), 20); // edited directly into the place the clip left
+    const CommandHistoryState before = project->commandState();
+    EXPECT_FALSE(project->undo());
+    EXPECT_EQ(media->startTime(), 50);
+    EXPECT_EQ(project->commandState().undoStack, before.undoStack);
+    EXPECT_TRUE(project->commandState().redoStack.empty());
+}
+
 TEST_F(ProjectTest, OneCommandNotifiesEachChangedObjectOnce) {
     const MediaPtr media = place(0, 10);
     struct Counter : Observer {
@@ -186,6 +254,13 @@ TEST_F(ProjectTest, LockHideAndSoloAreUndoable) {
     EXPECT_FALSE(LockData::IsTrackLocked(*track));
     EXPECT_FALSE(LockData::IsTrackHidden(*track));
     EXPECT_FALSE(track->attributeValue("solo", false));
+    EXPECT_FALSE(track->hasMetaData(Track::isLockedMetaDataKey())); // none before, none after
+
+    const auto other = newTrack();
+    other->addMetaData(Track::isLockedMetaDataKey(), "false");
+    project->execute(LockData::GetChangeIsLockedCommand(other, true));
+    project->undo();
+    EXPECT_EQ(other->metaDataValue(Track::isLockedMetaDataKey()), "false");
 }
 
 TEST_F(ProjectTest, AutoCombiningFoldsEverythingAfterTheFirst) {
@@ -226,7 +301,9 @@ TEST(TrackMagnetizerAutoAttacher, FollowsTracksAndMixersAsTheyComeAndGo) {
     // The magnetizer of a track made magnetic closes its gap through the history.
     const MediaPtr clip = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
     early->addMedia(clip, 7);
-    early->magneticAttribute()->setValue(true);
+    early->magneticAttribute()->setValue(true); // edited directly: the request waits
+    EXPECT_EQ(clip->startTime(), 7);
+    history.runFollowUps();
     EXPECT_EQ(clip->startTime(), 0);
     EXPECT_EQ(history.undoStack().size(), 1u);
 }
