@@ -37,13 +37,14 @@ public:
     typedef std::pair<TransitionPtr, boost::shared_ptr<Media>> TransitionAndNeighbour;
 
     /// A change of the clip's timing as a value, so that the clip's track can
-    /// check where it would put the clip before the clip takes it.
+    /// check where it would put the clip before the clip takes it. It lives
+    /// for one call: a restore refers to the caller's saved state.
     struct TimingEdit {
         enum Kind { Move, TrimStart, TrimEnd, SetStart, Stretch, Restore };
         Kind kind = Move;
         VelaTime amount = 0; // the offset; the new start for SetStart; the tolerance for Restore
         SafeRational factor; // Stretch
-        MediaState saved;    // Restore
+        const MediaState* saved = nullptr; // Restore
 
         static TimingEdit of(Kind kind, VelaTime amount) {
             TimingEdit edit;
@@ -58,7 +59,7 @@ public:
         }
         static TimingEdit restore(const MediaState& saved, VelaTime tolerance) {
             TimingEdit edit = of(Restore, tolerance);
-            edit.saved = saved;
+            edit.saved = &saved;
             return edit;
         }
     };

@@ -115,6 +115,10 @@ MediaState MediaImpl::defaultState() const {
 
 MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
     ScopedReadLock lock(projectMutex());
+    return lockedStateAfter(edit);
+}
+
+MediaState MediaImpl::lockedStateAfter(const TimingEdit& edit) const {
     switch (edit.kind) {
     case TimingEdit::Move:
         return editor_->move(state_, edit.amount);
@@ -127,16 +131,20 @@ MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
     case TimingEdit::Stretch:
         return editor_->stretch(state_, edit.factor);
     case TimingEdit::Restore:
-        return editor_->restoreState(edit.saved, edit.amount);
+        return editor_->restoreState(*edit.saved, edit.amount);
     }
     return state_;
 }
 
-bool MediaImpl::takeStateUnnotified(const MediaState& next) {
-    ScopedWriteLock lock(projectMutex());
+bool MediaImpl::lockedTakeState(const MediaState& next) {
     if (state_ == next) return false;
     state_ = next;
     return true;
+}
+
+bool MediaImpl::takeStateUnnotified(const MediaState& next) {
+    ScopedWriteLock lock(projectMutex());
+    return lockedTakeState(next);
 }
 
 MediaState MediaImpl::applyTimingEdit(const TimingEdit& edit) {
@@ -144,12 +152,12 @@ MediaState MediaImpl::applyTimingEdit(const TimingEdit& edit) {
     bool changed = false;
     {
         ScopedWriteLock lock(projectMutex()); // the clip stays on (or off) its track meanwhile
-        const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(parent_.lock());
-        if (track) {
+        const boost::shared_ptr<SubTimeline> container = parent_.lock();
+        if (const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(container)) {
             track->editLocked(shared_from_this(), edit, changed, &next);
         } else {
-            next = stateAfter(edit);
-            changed = takeStateUnnotified(next);
+            next = lockedStateAfter(edit);
+            changed = lockedTakeState(next);
         }
     }
     if (changed) notify();

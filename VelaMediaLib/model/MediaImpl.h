@@ -114,6 +114,7 @@ protected:
     /// Carries a timing edit out: through the clip's track when it has one,
     /// on the clip alone otherwise; notifies when something changed.
     MediaState applyTimingEdit(const TimingEdit& edit);
+
     /// Gives a clone of this clip everything but its placement on a track:
     /// name, parameters, attributes, metadata, effects and edge modifications.
     void copyContentInto(MediaImpl& clone) const;
@@ -123,6 +124,10 @@ protected:
     void setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left);
 
 private:
+    /// stateAfter and takeStateUnnotified under the lock the caller holds.
+    MediaState lockedStateAfter(const TimingEdit& edit) const;
+    bool lockedTakeState(const MediaState& next);
+
     Subject transitionSubject_;
     MediaState state_;
     TransitionPtr left_, right_;

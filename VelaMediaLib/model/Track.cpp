@@ -36,7 +36,7 @@ Range<VelaTime> previewOf(const Media& media, const Media::TimingEdit& edit) {
     case Media::TimingEdit::Stretch:
         return media.trackRangeWithRationalStretch(edit.factor);
     case Media::TimingEdit::Restore:
-        return edit.saved.trackRange();
+        return edit.saved->trackRange();
     }
     return media.lockedTrackRange();
 }
