@@ -33,11 +33,13 @@ bool EffectList::remove(const EffectPtr& effect) {
     return true;
 }
 
-void EffectList::swap(size_t first, size_t second) {
+bool EffectList::swap(size_t first, size_t second) {
     ScopedWriteLock lock(token_);
     checkIndex(first, effects_.size());
     checkIndex(second, effects_.size());
+    if (first == second) return false;
     std::swap(effects_[first], effects_[second]);
+    return true;
 }
 
 EffectList::EffectPtr EffectList::at(size_t index) const {

@@ -17,11 +17,14 @@ public:
     void add(const EffectPtr& effect);
     void insert(const EffectPtr& effect, size_t index);
     bool remove(const EffectPtr& effect);
-    void swap(size_t first, size_t second);
+    /// Returns whether the order changed (not for an index with itself).
+    bool swap(size_t first, size_t second);
     EffectPtr at(size_t index) const;
     size_t size() const;
     Effects all() const;
     Effects withName(const std::string& name) const;
+    Effects::iterator begin() { return effects_.begin(); }
+    Effects::iterator end() { return effects_.end(); }
     Effects::const_iterator begin() const { return effects_.begin(); }
     Effects::const_iterator end() const { return effects_.end(); }
     /// Clones of every effect, for a cloned owner.

@@ -26,7 +26,10 @@ public:
     /// A copy of the list, in order.
     virtual Effects allEffects() const = 0;
     /// Iterators over the list itself: valid until the next change; hold the
-    /// project's read lock while walking them on a shared project.
+    /// project's read lock while walking them on a shared project (the write
+    /// lock when changing the effects they lead to).
+    virtual Effects::iterator effectBegin() = 0;
+    virtual Effects::iterator effectEnd() = 0;
     virtual Effects::const_iterator effectBegin() const = 0;
     virtual Effects::const_iterator effectEnd() const = 0;
     virtual Effects effectsWithName(const std::string& name) = 0;

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/model/AudioMediaImpl.h>
 
+#include <VelaMediaLib/model/Track.h>
 #include <VelaMediaLib/time/InterpolatingParam.h>
 
 namespace VelaMediaLib {
@@ -31,13 +32,8 @@ boost::shared_ptr<Attribute<long long>> AudioMediaImpl::sourceFileOffset() {
 }
 
 boost::shared_ptr<SubTimeline> AudioMediaImpl::parentTrack() const {
-    ScopedReadLock lock(projectMutex());
-    return parentTrack_.lock();
-}
-
-void AudioMediaImpl::setParentTrack(const boost::weak_ptr<SubTimeline>& track) {
-    ScopedWriteLock lock(projectMutex());
-    parentTrack_ = track;
+    const boost::shared_ptr<SubTimeline> container = parent();
+    return boost::dynamic_pointer_cast<Track>(container) ? container : boost::shared_ptr<SubTimeline>();
 }
 
 boost::shared_ptr<Media> AudioMediaImpl::parentUnifiedMedia() const {

@@ -23,8 +23,9 @@ public:
     boost::shared_ptr<Attribute<bool>> mixToMono() override;
     boost::shared_ptr<Attribute<bool>> shouldApplyLoudnessNormalizationAttribute() override;
     boost::shared_ptr<Attribute<long long>> sourceFileOffset() override;
+    /// The clip's parent when that is a track: the one parent link, not a copy.
     boost::shared_ptr<SubTimeline> parentTrack() const override;
-    void setParentTrack(const boost::weak_ptr<SubTimeline>& track) override;
+    void setParentTrack(const boost::weak_ptr<SubTimeline>& track) override { setParent(track); }
     boost::shared_ptr<Media> parentUnifiedMedia() const override;
     void setParentUnifiedMedia(const boost::weak_ptr<Media>& unified) override;
     void addAudioFadeEdgeMods(VelaTime fadeIn, VelaTime fadeOut) override;
@@ -40,7 +41,6 @@ protected:
     std::vector<std::string> defaultParameterNames() const override { return {"volume"}; }
 
 private:
-    boost::weak_ptr<SubTimeline> parentTrack_;
     boost::weak_ptr<Media> parentUnified_;
     std::vector<CaptionData> captions_;
     std::string transcription_;

@@ -20,6 +20,7 @@ class MediaDispatcher;
 class MediaEditor;
 class RationalMediaEditor;
 class Timeline;
+class Track;
 class XMLOptions;
 
 /// A clip that can stand on a track. It plays a slice of its media (the media
@@ -34,6 +35,34 @@ class Media : public SubTimeline,
 public:
     typedef boost::function<void(const boost::shared_ptr<SubTimeline>&)> ParentVisitor;
     typedef std::pair<TransitionPtr, boost::shared_ptr<Media>> TransitionAndNeighbour;
+
+    /// A change of the clip's timing as a value, so that the clip's track can
+    /// check where it would put the clip before the clip takes it. It lives
+    /// for one call: a restore refers to the caller's saved state.
+    struct TimingEdit {
+        enum Kind { Move, TrimStart, TrimEnd, SetStart, Stretch, Restore };
+        Kind kind = Move;
+        VelaTime amount = 0; // the offset; the new start for SetStart; the tolerance for Restore
+        SafeRational factor; // Stretch
+        const MediaState* saved = nullptr; // Restore
+
+        static TimingEdit of(Kind kind, VelaTime amount) {
+            TimingEdit edit;
+            edit.kind = kind;
+            edit.amount = amount;
+            return edit;
+        }
+        static TimingEdit stretch(const SafeRational& factor) {
+            TimingEdit edit = of(Stretch, 0);
+            edit.factor = factor;
+            return edit;
+        }
+        static TimingEdit restore(const MediaState& saved, VelaTime tolerance) {
+            TimingEdit edit = of(Restore, tolerance);
+            edit.saved = &saved;
+            return edit;
+        }
+    };
 
     explicit Media(const boost::weak_ptr<const ThreadSafe>& token) : SubTimeline(token) {}
 
@@ -52,6 +81,7 @@ public:
     /// holds the project's lock (a track answering a query).
     virtual Range<VelaTime> lockedTrackRange() const = 0;
     virtual double scalar() const = 0;
+    virtual SafeRational rationalScalar() const = 0;
     /// The scalar at which the clip's media would last the given track duration.
     virtual double findScalar(VelaTime duration) const = 0;
     virtual VelaTime trimEndLimit() const = 0;
@@ -86,6 +116,8 @@ public:
     virtual void toJSONSpecificProperties(JSONWriter&) const {}
     /// The right transition and the clip on its other side, which a split or a merge carries over.
     virtual TransitionAndNeighbour splitMergeTransitions() const = 0;
+    /// Timing edits. On a track they go through the track, which refuses a
+    /// collision (CollisionException) and keeps its clips keyed by start.
     virtual void move(VelaTime offset) = 0;
     virtual void trimStart(VelaTime offset) = 0;
     virtual void trimEnd(VelaTime offset) = 0;
@@ -100,15 +132,22 @@ public:
     virtual void dispatch(MediaDispatcher& dispatcher) = 0;
     virtual void dispatch(ConstMediaDispatcher& dispatcher) const = 0;
     virtual long long editingUnit() const = 0;
+    /// The timeline the clip's containers lead to, followed outward from its
+    /// parent at each call; empty off a timeline.
     virtual boost::weak_ptr<Timeline> parentTimeline() const = 0;
-    virtual void setParentTimeline(const boost::weak_ptr<Timeline>& timeline) = 0;
+    /// The clip's container (a track or a group), held weakly: the one link
+    /// outward, from which its time converter parent and timeline follow.
+    virtual boost::shared_ptr<SubTimeline> parent() const = 0;
     /// Calls the visitor with the clip's parent (a track or a group), if it has one.
     virtual void parentVisitor(const ParentVisitor& visitor) const = 0;
+    /// Set by the container as it takes the clip in or lets it go.
     virtual void setParent(const boost::weak_ptr<SubTimeline>& parent) = 0;
     /// Makes the clone share what must stay shared with this clip.
     virtual void setupSharedClone(const boost::shared_ptr<Media>& clone) const = 0;
-    virtual const TimeConverter* timeConverterParent() const = 0;
-    virtual void setTimeConverterParent(const TimeConverter* parent) = 0;
+    /// The parent as a time converter (every container is one), or null.
+    virtual boost::shared_ptr<const TimeConverter> timeConverterParent() const = 0;
+    /// The same link as setParent: a container converts the time of what it holds.
+    void setTimeConverterParent(const boost::weak_ptr<SubTimeline>& parent) { setParent(parent); }
     /// Global timeline time to the clip's parametric time and back.
     virtual RationalTime fromGlobalToParametricTime(const RationalTime& time) const = 0;
     virtual RationalTime fromParametricToGlobalTime(const RationalTime& time) const = 0;
@@ -122,6 +161,16 @@ public:
     static boost::shared_ptr<Attribute<bool>> clipSpeedAttributeForMedia(Media& media);
     static boost::shared_ptr<Attribute<bool>> voxaneAttributeForMedia(Media& media);
     static boost::shared_ptr<Attribute<std::string>> voxaneLinkedSessionAttributeForMedia(Media& media);
+
+protected:
+    friend class Track;
+    /// The state the edit would give the clip; throws as the edit would
+    /// refuse, changing nothing.
+    virtual MediaState stateAfter(const TimingEdit& edit) const = 0;
+    /// Takes a state computed by stateAfter, under the write lock its caller
+    /// holds, without notifying; returns whether anything changed. The track
+    /// uses this to change a clip and re-key it in one step, and notifies after.
+    virtual bool takeStateUnnotified(const MediaState& next) = 0;
 };
 
 typedef boost::shared_ptr<Media> MediaPtr;

@@ -6,6 +6,8 @@
 #include <VelaMediaLib/model/MediaTypeFromMediaDispatcher.h>
 #include <VelaMediaLib/model/RationalStaticEditor.h>
 #include <VelaMediaLib/model/RationalTemporalEditor.h>
+#include <VelaMediaLib/model/Timeline.h>
+#include <VelaMediaLib/model/Track.h>
 #include <VelaMediaLib/time/RationalUtil.h>
 
 #include <algorithm>
@@ -19,15 +21,19 @@ MediaImpl::MediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
       editRate_(rate) {
     if (initial.duration <= 0)
         throw ValueException<long long>("a clip's duration must be greater than 0", initial.duration);
+    if (initial.mediaDuration <= 0)
+        throw ValueException<double>("a clip's media duration must be greater than 0",
+                                     initial.mediaDuration.asDouble());
     if (initial.scalar <= 0)
         throw ValueException<double>("a clip's scalar must be greater than 0", initial.scalar.asDouble());
+    transitionSubject_.setOwner(this);
     if (editor == Temporal)
         editor_.reset(new RationalTemporalEditor(*this));
     else
         editor_.reset(new RationalStaticEditor(*this));
 }
 
-MediaImpl::~MediaImpl() = default;
+MediaImpl::~MediaImpl() { delete oldEditor_.load(); }
 
 MediaState MediaImpl::state() const {
     ScopedReadLock lock(projectMutex());
@@ -59,7 +65,7 @@ long long MediaImpl::editingUnit() const {
 }
 
 Range<VelaTime> MediaImpl::trackRangeWithMove(VelaTime offset) const {
-    return editor_->move(state(), offset).trackRange();
+    return stateAfter(TimingEdit::of(TimingEdit::Move, offset)).trackRange();
 }
 
 Range<VelaTime> MediaImpl::trackRangeWithTrimStart(VelaTime offset) const {
@@ -76,10 +82,9 @@ Range<VelaTime> MediaImpl::trackRangeWithStretch(double factor) const {
     return trackRangeWithRationalStretch(RationalUtil::fromDoubleApprox(factor));
 }
 
+// Through the editor, so the preview refuses what the stretch refuses.
 Range<VelaTime> MediaImpl::trackRangeWithRationalStretch(const SafeRational& factor) const {
-    const MediaState current = state();
-    const SafeRational duration = SafeRational(current.duration) * factor;
-    return Range<VelaTime>(current.start, RationalUtil::toVelaTime(RationalUtil::Round(duration)));
+    return stateAfter(TimingEdit::stretch(factor)).trackRange();
 }
 
 Range<double> MediaImpl::mediaRange() const { return RationalUtil::toDoubleRange(rationalMediaRange()); }
@@ -93,34 +98,84 @@ VelaTime MediaImpl::trimStartLimit() const { return editor_->trimStartLimit(stat
 bool MediaImpl::validTrimStart(VelaTime offset) const { return editor_->validTrimStart(state(), offset); }
 bool MediaImpl::validTrimEnd(VelaTime offset) const { return editor_->validTrimEnd(state(), offset); }
 
+// All the media the limits allow at scalar 1, the duration its rounded
+// length; media shorter than half a tick plays over one tick instead.
 MediaState MediaImpl::defaultState() const {
     MediaState whole = state();
     if (!whole.minUnbounded()) whole.mediaStart = whole.minMediaStart;
     if (!whole.minUnbounded() && !whole.maxUnbounded()) whole.mediaDuration = whole.fullMediaLength();
     whole.scalar = SafeRational(1);
-    const VelaTime duration = RationalUtil::toVelaTime(RationalUtil::Round(whole.mediaDuration));
-    whole.duration = duration > 0 ? duration : whole.duration;
+    whole.duration = RationalUtil::toVelaTime(RationalUtil::Round(whole.mediaDuration));
+    if (whole.duration <= 0) {
+        whole.duration = 1;
+        whole.scalar = SafeRational(1) / whole.mediaDuration;
+    }
     return whole;
 }
 
+MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
+    ScopedReadLock lock(projectMutex());
+    return lockedStateAfter(edit);
+}
+
+MediaState MediaImpl::lockedStateAfter(const TimingEdit& edit) const {
+    switch (edit.kind) {
+    case TimingEdit::Move:
+        return editor_->move(state_, edit.amount);
+    case TimingEdit::SetStart:
+        return editor_->move(state_, edit.amount - state_.start);
+    case TimingEdit::TrimStart:
+        return editor_->trimStart(state_, edit.amount);
+    case TimingEdit::TrimEnd:
+        return editor_->trimEnd(state_, edit.amount);
+    case TimingEdit::Stretch:
+        return editor_->stretch(state_, edit.factor);
+    case TimingEdit::Restore:
+        return editor_->restoreState(*edit.saved, edit.amount);
+    }
+    return state_;
+}
+
+bool MediaImpl::lockedTakeState(const MediaState& next) {
+    if (state_ == next) return false;
+    state_ = next;
+    return true;
+}
+
+bool MediaImpl::takeStateUnnotified(const MediaState& next) {
+    ScopedWriteLock lock(projectMutex());
+    return lockedTakeState(next);
+}
+
+MediaState MediaImpl::applyTimingEdit(const TimingEdit& edit) {
+    MediaState next;
+    bool changed = false;
+    {
+        ScopedWriteLock lock(projectMutex()); // the clip stays on (or off) its track meanwhile
+        const boost::shared_ptr<SubTimeline> container = parent_.lock();
+        if (const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(container)) {
+            track->editLocked(shared_from_this(), edit, changed, &next);
+        } else {
+            next = lockedStateAfter(edit);
+            changed = lockedTakeState(next);
+        }
+    }
+    if (changed) notify();
+    return next;
+}
+
 void MediaImpl::restoreState(const MediaState& saved, VelaTime tolerance) {
-    commit([&](const MediaState&) { return editor_->restoreState(saved, tolerance); });
+    applyTimingEdit(TimingEdit::restore(saved, tolerance));
 }
 
-void MediaImpl::move(VelaTime offset) {
-    commit([&](const MediaState& s) { return editor_->move(s, offset); });
-}
+void MediaImpl::move(VelaTime offset) { applyTimingEdit(TimingEdit::of(TimingEdit::Move, offset)); }
 
-void MediaImpl::trimStart(VelaTime offset) {
-    commit([&](const MediaState& s) { return editor_->trimStart(s, offset); });
-}
+void MediaImpl::trimStart(VelaTime offset) { applyTimingEdit(TimingEdit::of(TimingEdit::TrimStart, offset)); }
 
-void MediaImpl::trimEnd(VelaTime offset) {
-    commit([&](const MediaState& s) { return editor_->trimEnd(s, offset); });
-}
+void MediaImpl::trimEnd(VelaTime offset) { applyTimingEdit(TimingEdit::of(TimingEdit::TrimEnd, offset)); }
 
 void MediaImpl::setTrackStart(VelaTime start) {
-    commit([&](const MediaState& s) { return editor_->move(s, start - s.start); });
+    applyTimingEdit(TimingEdit::of(TimingEdit::SetStart, start));
 }
 
 double MediaImpl::stretch(double factor) {
@@ -128,24 +183,22 @@ double MediaImpl::stretch(double factor) {
 }
 
 SafeRational MediaImpl::rationalStretch(const SafeRational& factor) {
-    SafeRational scalar;
-    commit([&](const MediaState& s) {
-        const MediaState stretched = editor_->stretch(s, factor);
-        scalar = stretched.scalar;
-        return stretched;
-    });
-    return scalar;
+    return applyTimingEdit(TimingEdit::stretch(factor)).scalar;
 }
 
 MediaEditor& MediaImpl::mediaEditor() {
-    ScopedWriteLock lock(projectMutex());
-    if (!oldEditor_) {
-        if (dynamic_cast<RationalTemporalEditor*>(editor_.get()))
-            oldEditor_.reset(new TemporalEditor(*this));
-        else
-            oldEditor_.reset(new StaticEditor(*this));
-    }
-    return *oldEditor_;
+    MediaEditor* existing = oldEditor_.load(std::memory_order_acquire);
+    if (existing) return *existing;
+    std::unique_ptr<MediaEditor> made;
+    if (dynamic_cast<RationalTemporalEditor*>(editor_.get()))
+        made.reset(new TemporalEditor(*this));
+    else
+        made.reset(new StaticEditor(*this));
+    // Another thread may have published one meanwhile: then that one is the editor.
+    if (oldEditor_.compare_exchange_strong(existing, made.get(), std::memory_order_acq_rel,
+                                           std::memory_order_acquire))
+        return *made.release();
+    return *existing;
 }
 
 TransitionPtr MediaImpl::leftTransition() {
@@ -165,24 +218,28 @@ TransitionPtr MediaImpl::rightTransition() const {
     return right_;
 }
 
-void MediaImpl::setTransition(TransitionPtr& slot, const TransitionPtr& transition) {
+// The old transition lets go of the clip; the new one holds it on the side
+// facing it. Setting the transition the slot already holds changes nothing.
+void MediaImpl::setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left) {
+    const MediaPtr self = shared_from_this();
     {
         ScopedWriteLock lock(projectMutex());
         if (slot == transition) return;
+        const TransitionPtr old = slot;
         slot = transition;
+        if (old && left && old->rightMedia() == self) old->setRightMedia(boost::weak_ptr<Media>());
+        if (old && !left && old->leftMedia() == self) old->setLeftMedia(boost::weak_ptr<Media>());
+        if (transition && left) transition->setRightMedia(self);
+        if (transition && !left) transition->setLeftMedia(self);
     }
     transitionSubject_.notify();
     notify();
 }
 
-void MediaImpl::setLeftTransition(const TransitionPtr& transition) {
-    if (transition) transition->setRightMedia(shared_from_this());
-    setTransition(left_, transition);
-}
+void MediaImpl::setLeftTransition(const TransitionPtr& transition) { setTransition(left_, transition, true); }
 
 void MediaImpl::setRightTransition(const TransitionPtr& transition) {
-    if (transition) transition->setLeftMedia(shared_from_this());
-    setTransition(right_, transition);
+    setTransition(right_, transition, false);
 }
 
 TransitionPtr MediaImpl::transitionAtTime(VelaTime time) const {
@@ -198,14 +255,8 @@ Media::TransitionAndNeighbour MediaImpl::splitMergeTransitions() const {
     return TransitionAndNeighbour(right, right ? right->rightMedia() : MediaPtr());
 }
 
-const TimeConverter* MediaImpl::timeConverterParent() const {
-    ScopedReadLock lock(projectMutex());
-    return timeConverterParent_;
-}
-
-void MediaImpl::setTimeConverterParent(const TimeConverter* parent) {
-    ScopedWriteLock lock(projectMutex());
-    timeConverterParent_ = parent;
+TimeConverterPtr MediaImpl::timeConverterParent() const {
+    return boost::dynamic_pointer_cast<const TimeConverter>(parent());
 }
 
 SafeRational MediaImpl::parentParametricTimeToThisParametricTime(const SafeRational& time) const {
@@ -223,35 +274,39 @@ SafeRational MediaImpl::thisParametricTimeToParentParametricTime(const SafeRatio
     return time + SafeRational(startTime());
 }
 
+// One read lock for the whole walk, so that no edit falls between its steps.
 RationalTime MediaImpl::fromGlobalToParametricTime(const RationalTime& time) const {
+    ScopedReadLock lock(projectMutex());
     return TimeConverter::recursiveFromGlobalToParametricTime(this, time.asRational());
 }
 
 RationalTime MediaImpl::fromParametricToGlobalTime(const RationalTime& time) const {
+    ScopedReadLock lock(projectMutex());
     return TimeConverter::recursiveFromParametricToGlobalTime(this, time.asRational());
 }
 
 RationalTime MediaImpl::clippingFromGlobalToParametricTime(const RationalTime& time) const {
+    ScopedReadLock lock(projectMutex());
     return TimeConverter::clippingRecursiveFromGlobalToParametricTime(this, time.asRational());
 }
 
+// Followed outward at each call: a track leads to its mixer's timeline, a
+// group to its own parent timeline.
 boost::weak_ptr<Timeline> MediaImpl::parentTimeline() const {
     ScopedReadLock lock(projectMutex());
-    return timeline_;
+    const boost::shared_ptr<SubTimeline> container = parent_.lock();
+    if (const auto track = boost::dynamic_pointer_cast<Track>(container)) return track->parentTimeline();
+    if (const auto group = boost::dynamic_pointer_cast<Media>(container)) return group->parentTimeline();
+    return boost::weak_ptr<Timeline>();
 }
 
-void MediaImpl::setParentTimeline(const boost::weak_ptr<Timeline>& timeline) {
-    ScopedWriteLock lock(projectMutex());
-    timeline_ = timeline;
+boost::shared_ptr<SubTimeline> MediaImpl::parent() const {
+    ScopedReadLock lock(projectMutex());
+    return parent_.lock();
 }
 
 void MediaImpl::parentVisitor(const ParentVisitor& visitor) const {
-    boost::shared_ptr<SubTimeline> parent;
-    {
-        ScopedReadLock lock(projectMutex());
-        parent = parent_.lock();
-    }
-    if (parent) visitor(parent);
+    if (const boost::shared_ptr<SubTimeline> container = parent()) visitor(container);
 }
 
 void MediaImpl::setParent(const boost::weak_ptr<SubTimeline>& parent) {
@@ -347,11 +402,15 @@ bool MediaImpl::removeEdgeModification(EdgeModifications& side, const EdgeModifi
 }
 
 void MediaImpl::setEdgeModificationLength(EdgeModifications& side, VelaTime length) {
+    bool changed = false;
     {
         ScopedWriteLock lock(projectMutex());
-        for (const EdgeModificationPtr& modification : side) modification->setDuration(length);
+        for (const EdgeModificationPtr& modification : side) {
+            changed = changed || modification->duration() != length;
+            modification->setDuration(length);
+        }
     }
-    notify();
+    if (changed) notify();
 }
 
 void MediaImpl::addLeftEdgeModification(const EdgeModificationPtr& m) { addEdgeModification(leftEdges_, m); }

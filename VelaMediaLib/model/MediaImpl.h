@@ -4,6 +4,7 @@
 #include <VelaMediaLib/model/RationalMediaEditor.h>
 #include <VelaMediaLib/model/SubTimelineParts.h>
 
+#include <atomic>
 #include <memory>
 
 namespace VelaMediaLib {
@@ -37,7 +38,8 @@ public:
     double maxMediaEnd() const override { return maxRationalMediaEnd().asDouble(); }
     Range<VelaTime> trackRange() const override;
     Range<VelaTime> lockedTrackRange() const override { return state_.trackRange(); }
-    double scalar() const override { return state().scalar.asDouble(); }
+    double scalar() const override { return rationalScalar().asDouble(); }
+    SafeRational rationalScalar() const override { return state().scalar; }
     double findScalar(VelaTime duration) const override { return findRationalScalar(duration).asDouble(); }
     VelaTime trimEndLimit() const override;
     VelaTime trimStartLimit() const override;
@@ -68,6 +70,7 @@ public:
     TransitionPtr rightTransition() const override;
     void setLeftTransition(const TransitionPtr& transition) override;
     void setRightTransition(const TransitionPtr& transition) override;
+    /// Its observers are told the clip itself.
     Observable& transitionAddRemoveObservable() override { return transitionSubject_; }
     TransitionPtr transitionAtTime(VelaTime time) const override;
     TransitionAndNeighbour splitMergeTransitions() const override;
@@ -89,16 +92,15 @@ public:
     SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override;
     SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override;
     SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override;
-    const TimeConverter* parentTimeConverter() const override { return timeConverterParent(); }
-    const TimeConverter* timeConverterParent() const override;
-    void setTimeConverterParent(const TimeConverter* parent) override;
+    TimeConverterPtr parentTimeConverter() const override { return timeConverterParent(); }
+    TimeConverterPtr timeConverterParent() const override;
     RationalTime fromGlobalToParametricTime(const RationalTime& time) const override;
     RationalTime fromParametricToGlobalTime(const RationalTime& time) const override;
     RationalTime clippingFromGlobalToParametricTime(const RationalTime& time) const override;
 
     // Parents, parameters, cloning, document
     boost::weak_ptr<Timeline> parentTimeline() const override;
-    void setParentTimeline(const boost::weak_ptr<Timeline>& timeline) override;
+    boost::shared_ptr<SubTimeline> parent() const override;
     void parentVisitor(const ParentVisitor& visitor) const override;
     void setParent(const boost::weak_ptr<SubTimeline>& parent) override;
     boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const override;
@@ -107,34 +109,35 @@ public:
     void toJSON(XMLOptions& options, int indent) const override;
 
 protected:
-    /// Applies what the editor computes from the current state, then notifies.
-    template <typename Compute>
-    void commit(Compute compute) {
-        {
-            ScopedWriteLock lock(projectMutex());
-            state_ = compute(state_);
-        }
-        notify();
-    }
+    MediaState stateAfter(const TimingEdit& edit) const override;
+    bool takeStateUnnotified(const MediaState& next) override;
+    /// Carries a timing edit out: through the clip's track when it has one,
+    /// on the clip alone otherwise; notifies when something changed.
+    MediaState applyTimingEdit(const TimingEdit& edit);
+
     /// Gives a clone of this clip everything but its placement on a track:
     /// name, parameters, attributes, metadata, effects and edge modifications.
     void copyContentInto(MediaImpl& clone) const;
     void addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     bool removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     void setEdgeModificationLength(EdgeModifications& side, VelaTime length);
-    void setTransition(TransitionPtr& slot, const TransitionPtr& transition);
+    void setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left);
 
 private:
+    /// stateAfter and takeStateUnnotified under the lock the caller holds.
+    MediaState lockedStateAfter(const TimingEdit& edit) const;
+    bool lockedTakeState(const MediaState& next);
+
     Subject transitionSubject_;
     MediaState state_;
     TransitionPtr left_, right_;
     boost::weak_ptr<ProjectEditRate> editRate_;
     std::unique_ptr<RationalMediaEditor> editor_;
-    std::unique_ptr<MediaEditor> oldEditor_;
+    /// Made on first use and published atomically, so that asking for it
+    /// takes no lock (readers ask for it inside their snapshots).
+    std::atomic<MediaEditor*> oldEditor_{nullptr};
     EdgeModifications leftEdges_, rightEdges_;
     boost::weak_ptr<SubTimeline> parent_;
-    boost::weak_ptr<Timeline> timeline_;
-    const TimeConverter* timeConverterParent_ = nullptr;
 };
 
 } // namespace VelaMediaLib

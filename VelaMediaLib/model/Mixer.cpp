@@ -18,6 +18,8 @@ void Mixer::addTrackSansTypeCheck(const TrackPtr& track, int index) {
     if (index < -1 || index > int(tracks_.size())) throw ValueException<int>("invalid index", index);
     if (std::find(tracks_.begin(), tracks_.end(), track) != tracks_.end())
         throw AddRemoveException("the track is already in this mixer");
+    if (track->parentMixer() || track->parentStitchedMedia())
+        throw AddRemoveException("the track is already in another mixer or a stitched clip");
     tracks_.insert(index == -1 ? tracks_.end() : tracks_.begin() + index, track);
     track->setParentMixer(shared_from_this());
     track->attachAddObserver(this);
@@ -81,10 +83,10 @@ bool Mixer::sortTracksByIndex(const TrackPtr& a, const TrackPtr& b) {
 
 std::vector<MediaPtr> Mixer::allMedias() const {
     std::vector<MediaPtr> clips;
-    for (const TrackPtr& track : tracks()) {
-        const std::vector<MediaPtr> more = track->allMedias();
+    eachTrack([&](const Track& track) {
+        const std::vector<MediaPtr> more = track.allMedias();
         clips.insert(clips.end(), more.begin(), more.end());
-    }
+    });
     return clips;
 }
 
@@ -105,32 +107,34 @@ bool Mixer::hasVisual() const { return anyOf<VisualMedia>(allMedias()); }
 VelaTime Mixer::startTime() const {
     bool any = false;
     VelaTime start = 0;
-    for (const TrackPtr& track : tracks()) {
-        if (track->numMedias() == 0) continue;
-        start = any ? std::min(start, track->startTime()) : track->startTime();
+    eachTrack([&](const Track& track) {
+        if (track.numMedias() == 0) return;
+        start = any ? std::min(start, track.startTime()) : track.startTime();
         any = true;
-    }
+    });
     return start;
 }
 
 VelaTime Mixer::endTime() const {
     VelaTime end = 0;
-    for (const TrackPtr& track : tracks()) end = std::max(end, track->endTime());
+    eachTrack([&](const Track& track) { end = std::max(end, track.endTime()); });
     return end;
 }
 
 VelaTime Mixer::endTimeNotIncludingHiddenAndMutedTracks() const {
+    ScopedReadLock lock(projectMutex()); // the solo mode and the ends read together
     const bool solo = isInSoloMode();
     VelaTime end = 0;
-    for (const TrackPtr& track : tracks())
-        if (track->isRenderable(solo)) end = std::max(end, track->endTime());
+    eachTrack([&](const Track& track) {
+        if (track.isRenderable(solo)) end = std::max(end, track.endTime());
+    });
     return end;
 }
 
 bool Mixer::isInSoloMode() const {
-    const Tracks all = tracks();
-    return std::any_of(all.begin(), all.end(),
-                       [](const TrackPtr& t) { return t->attributeValue("solo", false); });
+    bool solo = false;
+    eachTrack([&](const Track& track) { solo = solo || track.attributeValue("solo", false); });
+    return solo;
 }
 
 boost::shared_ptr<Timeline> Mixer::parentTimeline() const {
@@ -143,6 +147,19 @@ void Mixer::setParentTimeline(const boost::weak_ptr<Timeline>& timeline) {
     if (!timeline.expired() && !group_.expired())
         throw VelaMediaLibException("Cannot set parent timeline on a mixer that has a parent group");
     timeline_ = timeline;
+}
+
+boost::shared_ptr<Timeline> Mixer::enclosingTimeline() const {
+    ScopedReadLock lock(projectMutex());
+    if (const boost::shared_ptr<Timeline> timeline = timeline_.lock()) return timeline;
+    const MediaPtr group = group_.lock();
+    return group ? group->parentTimeline().lock() : boost::shared_ptr<Timeline>();
+}
+
+TimeConverterPtr Mixer::parentTimeConverter() const {
+    ScopedReadLock lock(projectMutex());
+    if (const MediaPtr group = group_.lock()) return group;
+    return timeline_.lock();
 }
 
 MediaPtr Mixer::parentGroup() const {

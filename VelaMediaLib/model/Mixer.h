@@ -28,6 +28,8 @@ public:
     /// The track's index, or -1 when the mixer does not hold it.
     int indexForTrack(const TrackPtr& track) const;
     Tracks tracks() const;
+    /// Iterators over the list itself; the caller holds the project's read
+    /// lock while it uses them.
     Tracks::const_iterator trackBegin() const { return tracks_.begin(); }
     Tracks::const_iterator trackEnd() const { return tracks_.end(); }
     size_t numTracks() const;
@@ -56,6 +58,8 @@ public:
 
     // Parents and observers
     boost::shared_ptr<Timeline> parentTimeline() const;
+    /// The parent timeline, or the one its parent group lies on.
+    boost::shared_ptr<Timeline> enclosingTimeline() const;
     /// Throws when the mixer has a parent group.
     void setParentTimeline(const boost::weak_ptr<Timeline>& timeline);
     MediaPtr parentGroup() const;
@@ -71,15 +75,24 @@ public:
                                          std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
     virtual boost::shared_ptr<Mixer> cloneEmpty() const = 0;
 
-    /// The group holding the mixer, if any: a timeline's mixer has no further parent.
-    const TimeConverter* parentTimeConverter() const override { return parentGroup().get(); }
+    /// The group holding the mixer, or its timeline.
+    TimeConverterPtr parentTimeConverter() const override;
 
 protected:
     /// Index -1 appends; 0 to the number of tracks inserts there; any other
-    /// throws ValueException<int> "invalid index".
+    /// throws ValueException<int> "invalid index". A track in another mixer
+    /// (or inside a stitched clip) throws AddRemoveException.
     void addTrackSansTypeCheck(const TrackPtr& track, int index);
 
 private:
+    /// Folds over the tracks under one read lock, so a concurrent edit
+    /// cannot change the list between steps.
+    template <typename Fold>
+    void eachTrack(Fold fold) const {
+        ScopedReadLock lock(projectMutex());
+        for (const TrackPtr& track : tracks_) fold(*track);
+    }
+
     Tracks tracks_;
     boost::weak_ptr<Timeline> timeline_;
     boost::weak_ptr<Media> group_;

@@ -24,12 +24,15 @@ MediaState RationalMediaEditor::move(const MediaState& state, VelaTime offset) c
     return moved;
 }
 
+VelaTime RationalMediaEditor::durationFor(const SafeRational& mediaDuration, const SafeRational& scalar) {
+    return RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar));
+}
+
 MediaState RationalMediaEditor::stretch(const MediaState& state, const SafeRational& factor) const {
     MediaState stretched = state;
     stretched.scalar = state.scalar * factor;
-    const SafeRational duration = SafeRational(state.duration) / state.scalar * stretched.scalar;
-    stretched.duration = RationalUtil::toVelaTime(RationalUtil::Round(duration));
-    if (stretched.duration <= 0)
+    stretched.duration = durationFor(state.mediaDuration, stretched.scalar);
+    if (stretched.duration <= 0 || stretched.scalar <= 0)
         throw ValueException<double>("invalid duration after media stretch (<=0)", factor.asDouble());
     return stretched;
 }
@@ -43,14 +46,18 @@ namespace {
 } // namespace
 
 MediaState RationalMediaEditor::restoreState(const MediaState& saved, VelaTime tolerance) const {
+    if (saved.duration <= 0)
+        refuseRestore("restored duration is not greater than 0", SafeRational(saved.duration));
+    if (saved.mediaDuration <= 0)
+        refuseRestore("restored media duration is not greater than 0", saved.mediaDuration);
+    if (saved.scalar <= 0) refuseRestore("restored scalar is not greater than 0", saved.scalar);
     if (saved.mediaStart < saved.minMediaStart)
         refuseRestore("restored mediaRange start is less than minimum", saved.mediaStart);
     if (saved.mediaStart > saved.maxMediaEnd)
         refuseRestore("restored mediaRange start is greater than maximum", saved.mediaStart);
     if (saved.mediaEnd().asDouble() - saved.maxMediaEnd.asDouble() > 0.001)
         refuseRestore("restored mediaRange end is greater than maximum", saved.mediaEnd());
-    const VelaTime implied =
-        RationalUtil::toVelaTime(RationalUtil::Round(saved.mediaDuration * saved.scalar));
+    const VelaTime implied = durationFor(saved.mediaDuration, saved.scalar);
     if (std::llabs(implied - saved.duration) > 2 * tolerance)
         refuseRestore("restored scalar is inconsistent with restored ranges", saved.scalar);
     return saved;

@@ -22,6 +22,7 @@ MediaState RationalStaticEditor::trimStart(const MediaState& state, VelaTime off
     MediaState next = state;
     next.start += offset;
     next.duration -= offset;
+    next.mediaDuration = SafeRational(next.duration) / next.scalar;
     if (next.hasStartOffset) {
         const boost::shared_ptr<ProjectEditRate> rate = clip_.projectEditRate().lock();
         if (!rate) throw DanglingWeakPtrException<ProjectEditRate>("the clip's edit rate has gone");
@@ -39,6 +40,7 @@ MediaState RationalStaticEditor::trimEnd(const MediaState& state, VelaTime offse
         throw InvalidTrimRangeException("invalid media trim end offset", offset, state.trackRange());
     MediaState next = state;
     next.duration -= offset;
+    next.mediaDuration = SafeRational(next.duration) / next.scalar;
     return next;
 }
 

@@ -7,7 +7,9 @@ namespace VelaMediaLib {
 /// The editor of clips without a media extent (stills, generated content):
 /// trims change only the track range, always keeping more than the minimum
 /// track duration (one tick more than the temporal editor, deliberately),
-/// and shift an attached start offset with the start. Its limits are unbounded.
+/// and shift an attached start offset with the start. The media duration
+/// follows the track duration (duration / scalar), so the clip's state keeps
+/// the rule that restoring checks. Its limits are unbounded.
 class RationalStaticEditor : public RationalMediaEditor {
 public:
     using RationalMediaEditor::RationalMediaEditor;

@@ -8,6 +8,9 @@ namespace VelaMediaLib {
 
 /// What every concrete SubTimeline (clip, track, mixer) implements the same
 /// way: observation through a subject, an ordered effect list, and a name.
+/// Observers are told the object itself (the subject names it its owner).
+/// A change that changes nothing (the same name, an effect swapped with
+/// itself) notifies nobody.
 /// Interface is SubTimeline or an interface derived from it, held as a
 /// virtual base so that clip families can share it.
 template <typename Interface>
@@ -35,6 +38,7 @@ public:
     void setIdentifier(const std::string& identifier) override {
         {
             ScopedWriteLock lock(this->projectMutex());
+            if (identifier_ == identifier) return;
             identifier_ = identifier;
         }
         notify();
@@ -54,12 +58,13 @@ public:
         return true;
     }
     void swapEffectOrder(size_t first, size_t second) override {
-        effects_.swap(first, second);
-        notify();
+        if (effects_.swap(first, second)) notify();
     }
     EffectPtr effectAtIndex(size_t index) const override { return effects_.at(index); }
     size_t numEffects() const override { return effects_.size(); }
     Effects allEffects() const override { return effects_.all(); }
+    typename Effects::iterator effectBegin() override { return effects_.begin(); }
+    typename Effects::iterator effectEnd() override { return effects_.end(); }
     typename Effects::const_iterator effectBegin() const override { return effects_.begin(); }
     typename Effects::const_iterator effectEnd() const override { return effects_.end(); }
     Effects effectsWithName(const std::string& name) override { return effects_.withName(name); }

@@ -89,6 +89,13 @@ std::vector<std::string> Timeline::mixerNames() const {
     return names;
 }
 
+std::vector<MixerPtr> Timeline::mixers() const {
+    std::vector<MixerPtr> all;
+    ScopedReadLock lock(projectMutex());
+    for (const auto& entry : mixers_) all.push_back(entry.second);
+    return all;
+}
+
 boost::shared_ptr<GenericMixer> Timeline::newMixer(const std::string& name) {
     const boost::shared_ptr<GenericMixer> made = GenericMixer::create(projectMutex());
     made->setIdentifier(name);
@@ -101,6 +108,7 @@ void Timeline::addMixer(const std::string& name, const MixerPtr& mixer) {
     {
         ScopedWriteLock lock(projectMutex());
         if (mixers_.count(name)) throw AddRemoveException("the timeline already has a mixer named " + name);
+        if (mixer->parentTimeline()) throw AddRemoveException("the mixer already belongs to a timeline");
         mixer->setParentTimeline(shared_from_this()); // throws when the mixer has a group
         mixers_[name] = mixer;
         mixer->attachAddObserver(this);
@@ -124,6 +132,7 @@ void Timeline::removeMixer(const MixerPtr& mixer) {
 boost::shared_ptr<GenericTrack> Timeline::newTrack() const { return GenericTrack::create(projectMutex()); }
 
 void Timeline::addTrack(const MixerPtr& mixer, const TrackPtr& track, int index) {
+    ScopedWriteLock lock(projectMutex()); // the mixer stays on this timeline meanwhile
     const boost::shared_ptr<GenericMixer> generic = boost::dynamic_pointer_cast<GenericMixer>(mixer);
     if (!generic || mixer->parentTimeline().get() != this)
         throw AddRemoveException("the mixer does not belong to this timeline");
@@ -139,16 +148,16 @@ RemoveTrackInfo Timeline::removeTrack(const MixerPtr& mixer, const TrackPtr& tra
 
 size_t Timeline::numTracks() const {
     size_t count = 0;
-    for (const std::string& name : mixerNames()) count += mixer(name)->numTracks();
+    eachMixer([&](const Mixer& mixer) { count += mixer.numTracks(); });
     return count;
 }
 
 std::vector<MediaPtr> Timeline::allMedias() const {
     std::vector<MediaPtr> clips;
-    for (const std::string& name : mixerNames()) {
-        const std::vector<MediaPtr> more = mixer(name)->allMedias();
+    eachMixer([&](const Mixer& mixer) {
+        const std::vector<MediaPtr> more = mixer.allMedias();
         clips.insert(clips.end(), more.begin(), more.end());
-    }
+    });
     return clips;
 }
 
@@ -179,14 +188,14 @@ size_t Timeline::swapSourceForTimelineMedias(const boost::shared_ptr<const Sourc
 
 VelaTime Timeline::endTime() const {
     VelaTime end = 0;
-    for (const std::string& name : mixerNames()) end = std::max(end, mixer(name)->endTime());
+    eachMixer([&](const Mixer& mixer) { end = std::max(end, mixer.endTime()); });
     return end;
 }
 
 VelaTime Timeline::endTimeNotIncludingHiddenAndMutedTracks() const {
     VelaTime end = 0;
-    for (const std::string& name : mixerNames())
-        end = std::max(end, mixer(name)->endTimeNotIncludingHiddenAndMutedTracks());
+    eachMixer(
+        [&](const Mixer& mixer) { end = std::max(end, mixer.endTimeNotIncludingHiddenAndMutedTracks()); });
     return end;
 }
 
@@ -263,13 +272,12 @@ void Timeline::onMixerRemoveTrack(Mixer& mixer, const TrackPtr& track) {
     addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineRemoveTrack(*this, mixer, track); });
 }
 
+// A clip's parent timeline follows from its track, so relaying is all there is to do.
 void Timeline::onMixerAddMedia(Mixer&, Track& track, const MediaPtr& media) {
-    media->setParentTimeline(shared_from_this());
     addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineAddMedia(*this, track, media); });
 }
 
 void Timeline::onMixerRemoveMedia(Mixer&, Track& track, const MediaPtr& media) {
-    media->setParentTimeline(boost::weak_ptr<Timeline>());
     addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineRemoveMedia(*this, track, media); });
 }
 

@@ -17,6 +17,7 @@ class Source;
 /// ("width", "height", "backgroundColor"), the camera that looks at it, the
 /// markers and the master gain. Tracks are made and placed through it, and
 /// it tells its add observers of every mixer, track and clip that comes or goes.
+/// It places its content in model space unchanged (TransformerImpl).
 ///
 /// The camera: eye, look-at point and up vector (points), vertical field of
 /// view in degrees (45), near and far clip distances (1, 100000). The default
@@ -27,7 +28,7 @@ class Timeline : public SubProject,
                  public Subject,
                  public Temporal,
                  public Parametric,
-                 public Transformer,
+                 public TransformerImpl,
                  public IdentityTimeConverter,
                  public MixerAddObserver,
                  public Attributable,
@@ -43,8 +44,11 @@ public:
     /// The mixer whose name comes first, or null.
     MixerPtr mixer() const;
     std::vector<std::string> mixerNames() const;
+    /// The mixers in name order, read under one lock.
+    std::vector<MixerPtr> mixers() const;
     boost::shared_ptr<GenericMixer> newMixer(const std::string& name);
-    /// Throws AddRemoveException when the name is taken.
+    /// Throws AddRemoveException when the name is taken or the mixer already
+    /// belongs to a timeline (this one under another name included).
     void addMixer(const std::string& name, const MixerPtr& mixer);
     /// Throws VelaMediaLibException "unable to find mixer".
     void removeMixer(const MixerPtr& mixer);
@@ -125,8 +129,6 @@ public:
     TransformMatrix projectionTransformAtTimeLH(const RationalTime& time) const;
     /// World to canvas pixels (origin top left): viewport * projection * camera.
     TransformMatrix calcScreenTransformAtTime(const RationalTime& time) const;
-    /// The timeline places its content in model space unchanged.
-    TransformMatrix transformAtTime(const RationalTime&) const override { return TransformMatrix(); }
 
     // Observers
     void attachAddObserver(TimelineAddObserver* observer);
@@ -149,6 +151,13 @@ private:
     };
     Camera cameraAtTime(const RationalTime& time) const;
     double defaultEyeDistance() const;
+    /// Folds over the mixers under one read lock, so that a concurrent
+    /// removeMixer cannot take one away between steps.
+    template <typename Fold>
+    void eachMixer(Fold fold) const {
+        ScopedReadLock lock(projectMutex());
+        for (const auto& entry : mixers_) fold(*entry.second);
+    }
 
     std::map<std::string, MixerPtr> mixers_;
     AddObserverList<TimelineAddObserver> addObservers_;

@@ -17,12 +17,28 @@ bool shareATick(VelaTime start, VelaTime end, const Range<VelaTime>& range) {
 }
 
 boost::shared_ptr<Track> trackOf(const MediaPtr& media) {
-    boost::shared_ptr<Track> track;
-    if (media)
-        media->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
-            track = boost::dynamic_pointer_cast<Track>(parent);
-        });
-    return track;
+    return media ? boost::dynamic_pointer_cast<Track>(media->parent()) : boost::shared_ptr<Track>();
+}
+
+// The range the edit would give the clip, as the previews compute it (a
+// trim's preview is plain arithmetic, so a collision is named before the
+// clip's own refusal).
+Range<VelaTime> previewOf(const Media& media, const Media::TimingEdit& edit) {
+    switch (edit.kind) {
+    case Media::TimingEdit::Move:
+        return media.trackRangeWithMove(edit.amount);
+    case Media::TimingEdit::SetStart:
+        return Range<VelaTime>(edit.amount, media.lockedTrackRange().duration());
+    case Media::TimingEdit::TrimStart:
+        return media.trackRangeWithTrimStart(edit.amount);
+    case Media::TimingEdit::TrimEnd:
+        return media.trackRangeWithTrimEnd(edit.amount);
+    case Media::TimingEdit::Stretch:
+        return media.trackRangeWithRationalStretch(edit.factor);
+    case Media::TimingEdit::Restore:
+        return edit.saved->trackRange();
+    }
+    return media.lockedTrackRange();
 }
 
 } // namespace
@@ -43,32 +59,38 @@ boost::shared_ptr<ParameterInterface> Track::createDefaultParameter(const std::s
     return made;
 }
 
-// A clip is on this track only when the track is its parent; it is found
-// under its start unless it was edited past the track.
+// A clip is on this track only when the track is its parent; every timing
+// edit of a placed clip goes through the track, so it is keyed by its start.
 Track::MediaMap::const_iterator Track::findMedia(const MediaPtr& media) const {
     if (!media || trackOf(media).get() != this) return medias_.end();
-    const auto keyed = medias_.find(media->startTime());
-    if (keyed != medias_.end() && keyed->second == media) return keyed;
-    return std::find_if(medias_.begin(), medias_.end(),
-                        [&](const MediaMap::value_type& e) { return e.second == media; });
+    const auto keyed = medias_.find(media->lockedTrackRange().start());
+    return keyed != medias_.end() && keyed->second == media ? keyed : medias_.end();
 }
 
 void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media) const {
     if (!mediasIntersectingRange(range, media).empty()) throw CollisionException(range, media, range.start());
 }
 
+// A clip lies on one track at most: one with a live parent elsewhere is refused.
 void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
     if (!media) throw AddRemoveException("no clip to add");
-    ScopedWriteLock lock(projectMutex());
-    if (findMedia(media) != medias_.end()) throw AddRemoveException("the clip is already on this track");
-    refuseCollision(Range<VelaTime>(start, media->duration()), media);
-    media->setTrackStart(start);
-    medias_[start] = media;
-    media->setParent(boost::shared_ptr<SubTimeline>(shared_from_this()));
-    media->setTimeConverterParent(this);
-    Transition::mergeMediaPairTransitions(mediaAtTime(start));
-    Transition::mergeMediaPairTransitions(mediaAtTime(media->endTime()));
-    addObservers_.tell([&](TrackAddObserver& o) { o.onTrackAddMedia(*this, media); });
+    bool moved = false;
+    {
+        ScopedWriteLock lock(projectMutex());
+        const boost::shared_ptr<SubTimeline> parent = media->parent();
+        if (parent.get() == this) throw AddRemoveException("the clip is already on this track");
+        if (parent) throw AddRemoveException("the clip is already on another track or in a group");
+        const MediaState placed =
+            media->stateAfter(Media::TimingEdit::of(Media::TimingEdit::SetStart, start));
+        refuseCollision(placed.trackRange(), media);
+        moved = media->takeStateUnnotified(placed);
+        medias_.emplace(start, media);
+        media->setParent(boost::shared_ptr<SubTimeline>(shared_from_this()));
+        Transition::mergeMediaPairTransitions(mediaAtTime(start));
+        Transition::mergeMediaPairTransitions(mediaAtTime(media->endTime()));
+        addObservers_.tell([&](TrackAddObserver& o) { o.onTrackAddMedia(*this, media); });
+    }
+    if (moved) media->notify();
 }
 
 void Track::removeMedia(const MediaPtr& media) {
@@ -77,7 +99,6 @@ void Track::removeMedia(const MediaPtr& media) {
     if (found == medias_.end()) throw AddRemoveException("the clip is not on this track");
     medias_.erase(found);
     media->setParent(boost::weak_ptr<SubTimeline>());
-    media->setTimeConverterParent(nullptr);
     addObservers_.tell([&](TrackAddObserver& o) { o.onTrackRemoveMedia(*this, media); });
 }
 
@@ -212,38 +233,56 @@ MediaPtr Track::getTouchingMediaToRightOfMedia(const MediaPtr& media) {
     return right && right->startTime() == media->endTime() ? right : MediaPtr();
 }
 
-template <typename Edit>
-Track::TransitionAndNeighbour Track::editPlaced(const MediaPtr& media, const Range<VelaTime>& preview,
-                                                Edit edit) {
+Track::TransitionAndNeighbour Track::editLocked(const MediaPtr& media, const Media::TimingEdit& edit,
+                                                bool& changed, MediaState* after) {
     ScopedWriteLock lock(projectMutex());
     const auto at = findMedia(media);
     if (at == medias_.end()) throw AddRemoveException("the clip is not on this track");
+    const Range<VelaTime> preview = previewOf(*media, edit);
     refuseCollision(preview, media);
+    const MediaState next = media->stateAfter(edit); // throws, changing nothing, when the clip refuses
+    if (next.trackRange() != preview) refuseCollision(next.trackRange(), media);
     const TransitionAndNeighbour before = media->splitMergeTransitions();
-    edit(); // throws, changing nothing, when the clip refuses
-    medias_.erase(at);
-    medias_[media->startTime()] = media;
-    const bool separated = before.first && before.second && media->endTime() != before.second->startTime();
+    changed = media->takeStateUnnotified(next);
+    if (at->first != next.start) {
+        auto node = medias_.extract(at);
+        node.key() = next.start;
+        medias_.insert(std::move(node));
+    }
+    if (after) *after = next;
+    const bool separated =
+        before.first && before.second && next.trackRange().end() != before.second->startTime();
     return separated ? before : TransitionAndNeighbour();
 }
 
+Track::TransitionAndNeighbour Track::editPlaced(const MediaPtr& media, const Media::TimingEdit& edit,
+                                                MediaState* after) {
+    bool changed = false;
+    TransitionAndNeighbour separated;
+    {
+        ScopedWriteLock lock(projectMutex());
+        separated = editLocked(media, edit, changed, after);
+    }
+    if (changed) media->notify();
+    return separated;
+}
+
 Track::TransitionAndNeighbour Track::move(const MediaPtr& media, VelaTime offset) {
-    return editPlaced(media, media->trackRangeWithMove(offset), [&] { media->move(offset); });
+    return editPlaced(media, Media::TimingEdit::of(Media::TimingEdit::Move, offset));
 }
 
 Track::TransitionAndNeighbour Track::trimStart(const MediaPtr& media, VelaTime offset) {
-    return editPlaced(media, media->trackRangeWithTrimStart(offset), [&] { media->trimStart(offset); });
+    return editPlaced(media, Media::TimingEdit::of(Media::TimingEdit::TrimStart, offset));
 }
 
 Track::TransitionAndNeighbour Track::trimEnd(const MediaPtr& media, VelaTime offset) {
-    return editPlaced(media, media->trackRangeWithTrimEnd(offset), [&] { media->trimEnd(offset); });
+    return editPlaced(media, Media::TimingEdit::of(Media::TimingEdit::TrimEnd, offset));
 }
 
 SafeRational Track::stretch(const MediaPtr& media, const SafeRational& factor) {
-    SafeRational scalar;
-    editPlaced(media, media->trackRangeWithRationalStretch(factor),
-               [&] { scalar = media->rationalStretch(factor); });
-    return scalar;
+    MediaState after;
+    editPlaced(media, Media::TimingEdit::stretch(factor), &after);
+    return after.scalar;
 }
 
 double Track::stretch(const MediaPtr& media, double factor) {
@@ -251,7 +290,7 @@ double Track::stretch(const MediaPtr& media, double factor) {
 }
 
 void Track::restoreMediaState(const MediaPtr& media, const MediaState& state, VelaTime tolerance) {
-    editPlaced(media, state.trackRange(), [&] { media->restoreState(state, tolerance); });
+    editPlaced(media, Media::TimingEdit::restore(state, tolerance));
 }
 
 boost::shared_ptr<Track> Track::copyPortion(const Range<VelaTime>& range,
@@ -350,7 +389,18 @@ VelaTime Track::endTime() const {
     return medias_.empty() ? 0 : medias_.rbegin()->second->lockedTrackRange().end();
 }
 
-const TimeConverter* Track::parentTimeConverter() const { return parentMixer().get(); }
+TimeConverterPtr Track::parentTimeConverter() const {
+    ScopedReadLock lock(projectMutex());
+    if (const boost::shared_ptr<Mixer> mixer = parentMixer_.lock()) return mixer;
+    return parentStitched_.lock();
+}
+
+boost::shared_ptr<Timeline> Track::parentTimeline() const {
+    ScopedReadLock lock(projectMutex());
+    if (const boost::shared_ptr<Mixer> mixer = parentMixer_.lock()) return mixer->enclosingTimeline();
+    if (const MediaPtr stitched = parentStitched_.lock()) return stitched->parentTimeline().lock();
+    return boost::shared_ptr<Timeline>();
+}
 
 void Track::copyFlagsInto(Track& other) const {
     for (const char* key : kFlags) other.addAttribute<bool>(key, attributeValue(key, false));

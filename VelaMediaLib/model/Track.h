@@ -17,6 +17,7 @@
 namespace VelaMediaLib {
 
 class Mixer;
+class Timeline;
 
 /// A track: clips keyed by start tick, never overlapping, so the map's order
 /// is the clips' order. Two ranges collide when they share a tick; a clip
@@ -61,6 +62,17 @@ public:
     std::vector<MediaPtr> allMedias() const;
     /// A copy of the map; iterate it freely.
     MediaMap mediaMap() const;
+    /// Iterators over the map itself, by start, without copying it. The
+    /// caller must hold the project's read lock (ScopedReadLock on the
+    /// track's projectMutex()) for as long as it uses them: any edit of the
+    /// track may invalidate them.
+    MediaMap::const_iterator mediaBegin() const { return medias_.begin(); }
+    MediaMap::const_iterator mediaEnd() const { return medias_.end(); }
+    MediaMap::const_reverse_iterator mediaRBegin() const { return medias_.rbegin(); }
+    MediaMap::const_reverse_iterator mediaREnd() const { return medias_.rend(); }
+    /// The first clip starting at or after the time / after the time (same rule).
+    MediaMap::const_iterator lower_bound(VelaTime start) const { return medias_.lower_bound(start); }
+    MediaMap::const_iterator upper_bound(VelaTime start) const { return medias_.upper_bound(start); }
     std::vector<TransitionPtr> transitions() const;
 
     // Queries by time
@@ -78,7 +90,8 @@ public:
     static MediaPtr getTouchingMediaToLeftOfMedia(const MediaPtr& media);
     static MediaPtr getTouchingMediaToRightOfMedia(const MediaPtr& media);
 
-    // Edits that refuse collisions; each returns what it separated
+    // Edits that refuse collisions; each returns what it separated. A clip
+    // edited by itself (clip->move) comes here too.
     TransitionAndNeighbour move(const MediaPtr& media, VelaTime offset);
     TransitionAndNeighbour trimStart(const MediaPtr& media, VelaTime offset);
     TransitionAndNeighbour trimEnd(const MediaPtr& media, VelaTime offset);
@@ -119,6 +132,9 @@ public:
 
     // Parents and observers
     boost::shared_ptr<Mixer> parentMixer() const;
+    /// The timeline the track's mixer belongs to (through a group, its
+    /// timeline), followed at each call; null off a timeline.
+    boost::shared_ptr<Timeline> parentTimeline() const;
     void setParentMixer(const boost::weak_ptr<Mixer>& mixer);
     MediaPtr parentStitchedMedia() const;
     void setParentStitchedMedia(const boost::weak_ptr<Media>& media);
@@ -131,8 +147,8 @@ public:
     /// The end of the last clip: a track's time starts at 0.
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
-    /// The mixer, which passes time on to its group, if any.
-    const TimeConverter* parentTimeConverter() const override;
+    /// The mixer, or the stitched clip holding the track, if any.
+    TimeConverterPtr parentTimeConverter() const override;
 
     /// An empty track of the same kind with the same flags, name and parameters.
     virtual boost::shared_ptr<Track> cloneEmpty() const = 0;
@@ -146,13 +162,21 @@ protected:
     void copyFlagsInto(Track& other) const;
 
 private:
+    friend class MediaImpl;
     boost::shared_ptr<Attribute<bool>> flag(const char* key) const { return attribute<bool>(key); }
     void refuseCollision(const Range<VelaTime>& range, const MediaPtr& media) const;
+    /// The clip's entry: it is on this track when the track is its parent,
+    /// keyed under its start (every timing edit of a placed clip re-keys it).
     MediaMap::const_iterator findMedia(const MediaPtr& media) const;
-    /// Runs a clip edit that may change its range: collision check on the
-    /// preview, the edit, then the clip re-keyed under its new start.
-    template <typename Edit>
-    TransitionAndNeighbour editPlaced(const MediaPtr& media, const Range<VelaTime>& preview, Edit edit);
+    /// A timing edit of a clip on this track, under the write lock the caller
+    /// holds: the clip's preview checked for collisions, the edit computed
+    /// (it may refuse), taken and re-keyed in one step with no other code
+    /// running in between. Does not notify: `changed` tells the caller to.
+    TransitionAndNeighbour editLocked(const MediaPtr& media, const Media::TimingEdit& edit, bool& changed,
+                                      MediaState* after);
+    /// editLocked under its own write lock, then the clip's notification.
+    TransitionAndNeighbour editPlaced(const MediaPtr& media, const Media::TimingEdit& edit,
+                                      MediaState* after = nullptr);
 
     std::unique_ptr<std::pmr::unsynchronized_pool_resource> nodePool_; // before the map that uses it
     MediaMap medias_;

@@ -13,4 +13,11 @@ public:
     virtual TransformMatrix transformAtTime(const RationalTime& time) const = 0;
 };
 
+/// The transform base of containers that place their content unchanged
+/// unless a kind says otherwise (the timeline).
+class TransformerImpl : public Transformer {
+public:
+    TransformMatrix transformAtTime(const RationalTime&) const override { return TransformMatrix(); }
+};
+
 } // namespace VelaMediaLib

@@ -2,23 +2,15 @@
 
 #include <VelaMediaLib/time/RationalUtil.h>
 
-#include <vector>
-
 namespace VelaMediaLib {
 namespace {
 
-// The chain from the given converter outward.
-std::vector<const TimeConverter*> chainOf(const TimeConverter* converter) {
-    std::vector<const TimeConverter*> chain;
-    for (; converter; converter = converter->parentTimeConverter()) chain.push_back(converter);
-    return chain;
-}
-
+// The outer containers' steps first, then this converter's. Each parent is
+// held by the stack frame that converts through it.
 template <typename Step>
-SafeRational inward(const TimeConverter* converter, SafeRational time, Step step) {
-    const std::vector<const TimeConverter*> chain = chainOf(converter);
-    for (auto it = chain.rbegin(); it != chain.rend(); ++it) time = step(**it, time);
-    return time;
+SafeRational inward(const TimeConverter& converter, const SafeRational& time, Step step) {
+    const TimeConverterPtr parent = converter.parentTimeConverter();
+    return step(converter, parent ? inward(*parent, time, step) : time);
 }
 
 } // namespace
@@ -37,23 +29,27 @@ long long TimeConverter::thisParametricTimeToParentParametricVelaTime(long long 
 
 SafeRational TimeConverter::recursiveFromGlobalToParametricTime(const TimeConverter* converter,
                                                                 const SafeRational& time) {
-    return inward(converter, time, [](const TimeConverter& c, const SafeRational& t) {
+    if (!converter) return time;
+    return inward(*converter, time, [](const TimeConverter& c, const SafeRational& t) {
         return c.parentParametricTimeToThisParametricTime(t);
     });
 }
 
 SafeRational TimeConverter::clippingRecursiveFromGlobalToParametricTime(const TimeConverter* converter,
                                                                         const SafeRational& time) {
-    return inward(converter, time, [](const TimeConverter& c, const SafeRational& t) {
+    if (!converter) return time;
+    return inward(*converter, time, [](const TimeConverter& c, const SafeRational& t) {
         return c.clippingParentParametricTimeToThisParametricTime(t);
     });
 }
 
 SafeRational TimeConverter::recursiveFromParametricToGlobalTime(const TimeConverter* converter,
                                                                 const SafeRational& time) {
-    SafeRational result = time;
-    for (; converter; converter = converter->parentTimeConverter())
-        result = converter->thisParametricTimeToParentParametricTime(result);
+    if (!converter) return time;
+    SafeRational result = converter->thisParametricTimeToParentParametricTime(time);
+    for (TimeConverterPtr outer = converter->parentTimeConverter(); outer;
+         outer = outer->parentTimeConverter())
+        result = outer->thisParametricTimeToParentParametricTime(result);
     return result;
 }
 

@@ -88,6 +88,13 @@ TEST_F(MediaContent, EffectsKeepTheirOrder) {
     EXPECT_EQ(media->effectAtIndex(0)->effectName(), "tint");
     EXPECT_EQ(media->effectsWithName("blur").size(), 2u);
     EXPECT_EQ(std::distance(media->effectBegin(), media->effectEnd()), 3);
+    {
+        ScopedWriteLock lock(project); // the list itself, changed in place
+        *std::next(media->effectBegin()) = boost::make_shared<NamedEffect>("sharpen");
+    }
+    EXPECT_EQ(media->effectAtIndex(1)->effectName(), "sharpen");
+    media->swapEffectOrder(1, 2);
+    EXPECT_EQ(media->effectAtIndex(2)->effectName(), "sharpen");
     EXPECT_THROW(media->effectAtIndex(3), IndexException);
     EXPECT_THROW(media->insertEffect(boost::make_shared<NamedEffect>("x"), 5), IndexException);
     EXPECT_THROW(media->swapEffectOrder(0, 9), IndexException);

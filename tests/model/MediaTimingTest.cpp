@@ -4,9 +4,11 @@
 #include <VelaMediaLib/model/IdentManager.h>
 #include <VelaMediaLib/model/MediaEditor.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/model/RationalTemporalEditor.h>
 
 #include <gtest/gtest.h>
 #include <limits>
+#include <random>
 
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
@@ -213,4 +215,118 @@ TEST(IdentManager, RetiredIdentifiersComeBackLastInFirstOut) {
     EXPECT_EQ(manager.newIdent(), 7u);
     EXPECT_EQ(manager.newIdent(), 5u);
     EXPECT_EQ(manager.newIdent(), 9u);
+}
+
+TEST_F(MediaTiming, DurationIsAlwaysTheMediaDurationTimesTheScalarRounded) {
+    auto media = placeholder(0, 10, 1);
+    const MediaState original = media->state();
+    media->rationalStretch(SafeRational(1, 3)); // 10/3 rounds to 3
+    EXPECT_EQ(media->duration(), 3);
+    media->rationalStretch(SafeRational(3)); // back to 10, not 3 * 3
+    EXPECT_EQ(media->duration(), 10);
+    EXPECT_EQ(media->rationalScalar(), SafeRational(1));
+    media->rationalStretch(SafeRational(1, 3));
+    media->restoreState(original, 0); // its own earlier state, exactly
+    EXPECT_TRUE(media->state() == original);
+
+    // A static clip's media follows its track range, so its state restores too.
+    auto colour = ColorMedia::create(project, rate, 0, 10);
+    colour->trimEnd(-5);
+    colour->trimStart(3);
+    colour->restoreState(colour->state(), 0);
+    EXPECT_EQ(colour->rationalMediaRange().duration(), SafeRational(12));
+}
+
+TEST_F(MediaTiming, SeededEditsKeepTheDurationRuleAndRestoreExactly) {
+    std::mt19937 random(20240611);
+    for (const MediaImpl::EditorKind kind : {MediaImpl::Temporal, MediaImpl::Static}) {
+        auto media = clip(timing(0, 60, 20, 60, 1, 0, 200), kind);
+        std::vector<MediaState> history{media->state()};
+        for (int step = 0; step < 400; ++step) {
+            const MediaState before = media->state();
+            const int amount = int(random() % 41) - 20;
+            try {
+                switch (random() % 4) {
+                case 0:
+                    media->trimStart(amount);
+                    break;
+                case 1:
+                    media->trimEnd(amount);
+                    break;
+                case 2:
+                    media->move(amount);
+                    break;
+                default:
+                    media->rationalStretch(SafeRational(1 + random() % 5, 1 + random() % 5));
+                    break;
+                }
+            } catch (const VelaMediaLibException&) {
+                EXPECT_TRUE(media->state() == before) << "a refused edit changed the clip";
+            }
+            const MediaState now = media->state();
+            ASSERT_EQ(now.duration, RationalMediaEditor::durationFor(now.mediaDuration, now.scalar))
+                << "step " << step;
+            history.push_back(now);
+        }
+        for (auto state = history.rbegin(); state != history.rend(); ++state) {
+            media->restoreState(*state, 0);
+            ASSERT_TRUE(media->state() == *state);
+        }
+    }
+}
+
+TEST_F(MediaTiming, RestoreRefusesWhatConstructionRefuses) {
+    auto media = clip(timing(0, 100, 0, 100, 1, 0, 1000));
+    const MediaState good = media->state();
+    auto expectRefusedState = [&](const MediaState& bad, const std::string& message) {
+        expectRefused<ValueException<const SafeRational>>(
+            *media, [&] { media->restoreState(bad, 2); }, message);
+    };
+    MediaState bad = good;
+    bad.duration = 0;
+    bad.mediaDuration = 0;
+    expectRefusedState(bad, "restored duration is not greater than 0");
+    bad = good;
+    bad.mediaDuration = SafeRational(-100);
+    bad.scalar = SafeRational(-1);
+    expectRefusedState(bad, "restored media duration is not greater than 0");
+    bad = good;
+    bad.mediaDuration = SafeRational(1, 1000000);
+    bad.scalar = SafeRational(0);
+    bad.duration = 1;
+    expectRefusedState(bad, "restored scalar is not greater than 0");
+    EXPECT_THROW(clip(timing(0, 10, 0, 0, 1, 0, 10)), ValueException<double>);
+}
+
+TEST_F(MediaTiming, StretchPreviewsRefuseWhatTheStretchRefuses) {
+    auto media = PlaceholderMedia::create(project, rate, 0, 100);
+    EXPECT_THROW(media->trackRangeWithRationalStretch(SafeRational(1, 1000)), ValueException<double>);
+    EXPECT_THROW(media->trackRangeWithStretch(-2.0), ValueException<double>);
+    EXPECT_THROW(media->rationalStretch(SafeRational(-2)), ValueException<double>);
+    EXPECT_EQ(media->trackRangeWithRationalStretch(SafeRational(1, 3)), Range<VelaTime>(0, 33));
+    EXPECT_EQ(media->duration(), 100);
+}
+
+TEST_F(MediaTiming, DefaultStateKeepsTheDurationRule) {
+    auto media = placeholder(0, SafeRational(1, 4), 8); // two ticks of a quarter tick of media
+    const MediaState whole = media->defaultState();
+    EXPECT_EQ(whole.duration, RationalMediaEditor::durationFor(whole.mediaDuration, whole.scalar));
+    media->restoreState(whole, 0);
+    auto longer = placeholder(0, 50, 2);
+    longer->trimStart(10);
+    EXPECT_EQ(longer->defaultState().trackRange(), Range<VelaTime>(10, 50));
+    EXPECT_EQ(longer->defaultState().scalar, SafeRational(1));
+}
+
+TEST_F(MediaTiming, AnEditorsStretchCanBeReplacedByAKind) {
+    struct Doubling : RationalTemporalEditor {
+        using RationalTemporalEditor::RationalTemporalEditor;
+        MediaState stretch(const MediaState& state, const SafeRational& factor) const override {
+            return RationalTemporalEditor::stretch(state, factor * SafeRational(2));
+        }
+    };
+    auto media = clip(timing(0, 10, 0, 10, 1, 0, 100));
+    const Doubling doubling(*media);
+    const RationalMediaEditor& editor = doubling;
+    EXPECT_EQ(editor.stretch(media->state(), SafeRational(2)).duration, 40);
 }

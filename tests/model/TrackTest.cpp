@@ -291,6 +291,8 @@ TEST(TimelineCamera, RightAndLeftHandedTransforms) {
     const Point3d topLeft = project2d(Point3d(-960, 540, 0));
     EXPECT_NEAR(topLeft.x, 0.0, 1e-6);
     EXPECT_NEAR(topLeft.y, 0.0, 1e-6);
+    const TransformerImpl& placement = *timeline; // the timeline places its content unchanged
+    EXPECT_EQ(placement.transformAtTime(RationalTime(3)), TransformMatrix());
     const Point3d bottomRight = project2d(Point3d(960, -540, 0));
     EXPECT_NEAR(bottomRight.x, 1920.0, 1e-6);
     EXPECT_NEAR(bottomRight.y, 1080.0, 1e-6);

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/time/TimeConverter.h>
 
+#include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
 
 using namespace VelaMediaLib;
@@ -10,7 +11,7 @@ namespace {
 // showing at most `length` of it.
 class OffsetConverter : public TimeConverter {
 public:
-    OffsetConverter(SafeRational offset, SafeRational speed, SafeRational length, const TimeConverter* parent)
+    OffsetConverter(SafeRational offset, SafeRational speed, SafeRational length, TimeConverterPtr parent)
         : offset_(offset), speed_(speed), length_(length), parent_(parent) {}
     SafeRational parentParametricTimeToThisParametricTime(const SafeRational& t) const override {
         return (t - offset_) * speed_;
@@ -22,18 +23,18 @@ public:
     SafeRational thisParametricTimeToParentParametricTime(const SafeRational& t) const override {
         return t / speed_ + offset_;
     }
-    const TimeConverter* parentTimeConverter() const override { return parent_; }
+    TimeConverterPtr parentTimeConverter() const override { return parent_; }
 
 private:
     SafeRational offset_, speed_, length_;
-    const TimeConverter* parent_;
+    TimeConverterPtr parent_;
 };
 
 } // namespace
 
 TEST(TimeConverter, ComposesFromTheOutermostContainerInward) {
-    const OffsetConverter outer(10, 2, 100, nullptr);
-    const OffsetConverter inner(4, SafeRational(1, 3), 5, &outer);
+    const auto outer = boost::make_shared<const OffsetConverter>(10, 2, 100, TimeConverterPtr());
+    const OffsetConverter inner(4, SafeRational(1, 3), 5, outer);
     // Global 13 -> outer (13-10)*2 = 6 -> inner (6-4)/3 = 2/3.
     EXPECT_EQ(TimeConverter::recursiveFromGlobalToParametricTime(&inner, 13), SafeRational(2, 3));
     EXPECT_EQ(TimeConverter::recursiveFromParametricToGlobalTime(&inner, SafeRational(2, 3)), 13);

@@ -1,0 +1,177 @@
+// Clips, tracks and mixers that the host keeps after their containers or
+// their project have gone still answer, and only through live objects (run
+// under AddressSanitizer to see that nothing freed is read).
+#include "MediaTestSupport.h"
+
+#include <VelaMediaLib/model/LockData.h>
+#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/model/Timeline.h>
+
+#include <gtest/gtest.h>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+// A project as the host builds one: timeline, mixer "main", one track with
+// a clip at 100 whose opacity runs from 0 at 0 to 1 at 20.
+struct Built {
+    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    boost::shared_ptr<ProjectEditRate> rate =
+        boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
+    TimelinePtr timeline = Timeline::create(project);
+    MixerPtr mixer = timeline->newMixer("main");
+    TrackPtr track = timeline->newTrack();
+    boost::shared_ptr<PlaceholderMedia> clip = PlaceholderMedia::create(project, rate, 0, 50);
+
+    Built() {
+        timeline->addTrack(mixer, track);
+        boost::static_pointer_cast<GenericTrack>(track)->addMedia(clip, 100);
+        clip->opacity()->setDefaultValue(0.0);
+        clip->opacity()->addKeyFrame(RationalTime(20), 1.0, RationalTime(0));
+    }
+};
+
+// What a clip off any live container answers: its own time, its own values.
+void expectAnswersAlone(const boost::shared_ptr<PlaceholderMedia>& clip) {
+    EXPECT_FALSE(clip->parent());
+    EXPECT_FALSE(clip->timeConverterParent());
+    EXPECT_TRUE(clip->parentTimeline().expired());
+    EXPECT_EQ(clip->fromGlobalToParametricTime(RationalTime(115)), RationalTime(15));
+    EXPECT_EQ(clip->fromParametricToGlobalTime(RationalTime(15)), RationalTime(115));
+    EXPECT_EQ(clip->clippingFromGlobalToParametricTime(RationalTime(500)), RationalTime(50));
+    EXPECT_DOUBLE_EQ(clip->opacity()->valueAtTime(RationalTime(15)), 0.75); // between keyframes
+    EXPECT_EQ(clip->mediaToModelTransformAtGlobalTime(RationalTime(115)), TransformMatrix());
+    EXPECT_EQ(clip->trackRange(), Range<VelaTime>(100, 50));
+    EXPECT_FALSE(LockData::IsMediaLocked(*clip));
+}
+
+} // namespace
+
+TEST(Lifetime, AClipKeptPastItsProjectAnswersAlone) {
+    boost::shared_ptr<PlaceholderMedia> kept;
+    {
+        Built built;
+        kept = built.clip;
+        EXPECT_EQ(kept->parentTimeline().lock(), built.timeline);
+        EXPECT_EQ(kept->timeConverterParent(), TimeConverterPtr(built.track));
+    }
+    expectAnswersAlone(kept);
+    kept->move(5); // edits without a project take no lock
+    EXPECT_EQ(kept->startTime(), 105);
+}
+
+TEST(Lifetime, AClipKeptPastItsTrackCanBePlacedAgain) {
+    Built built;
+    const boost::shared_ptr<PlaceholderMedia> kept = built.clip;
+    built.timeline->removeTrack(built.mixer, built.track);
+    built.track.reset(); // the track goes; the clip stays with the host
+    expectAnswersAlone(kept);
+    const auto other = built.timeline->newTrack();
+    built.timeline->addTrack(built.mixer, other);
+    other->addMedia(kept, 40);
+    EXPECT_EQ(kept->parentTimeline().lock(), built.timeline);
+    EXPECT_EQ(kept->fromGlobalToParametricTime(RationalTime(55)), RationalTime(15));
+}
+
+TEST(Lifetime, ATrackKeptPastItsMixerAndProject) {
+    TrackPtr kept;
+    boost::shared_ptr<PlaceholderMedia> clip;
+    {
+        Built built;
+        kept = built.track;
+        clip = built.clip;
+    }
+    EXPECT_FALSE(kept->parentMixer());
+    EXPECT_FALSE(kept->parentTimeline());
+    EXPECT_FALSE(kept->parentTimeConverter());
+    EXPECT_FALSE(kept->isParentMixerInSoloMode());
+    EXPECT_TRUE(kept->isRenderable());
+    EXPECT_EQ(kept->mediaAtTime(120).first, clip);
+    EXPECT_TRUE(clip->parentTimeline().expired());
+    EXPECT_EQ(clip->fromGlobalToParametricTime(RationalTime(115)), RationalTime(15));
+    kept->move(clip, 10);
+    EXPECT_EQ(clip->startTime(), 110);
+    kept->removeMedia(clip);
+    EXPECT_EQ(kept->numMedias(), 0u);
+}
+
+TEST(Lifetime, AMixerKeptPastItsTimeline) {
+    MixerPtr kept;
+    boost::shared_ptr<PlaceholderMedia> clip;
+    {
+        Built built;
+        kept = built.mixer;
+        clip = built.clip;
+    }
+    EXPECT_FALSE(kept->parentTimeline());
+    EXPECT_FALSE(kept->parentTimeConverter());
+    EXPECT_EQ(kept->numTracks(), 1u);
+    EXPECT_EQ(kept->endTime(), 150);
+    EXPECT_EQ(kept->allMedias(), std::vector<MediaPtr>{clip});
+    EXPECT_TRUE(clip->parentTimeline().expired());
+    EXPECT_EQ(clip->fromGlobalToParametricTime(RationalTime(115)), RationalTime(15));
+    kept->trackAtIndex(0)->trimEnd(clip, 10); // the track still tells its mixer, which is alive
+    EXPECT_EQ(kept->endTime(), 140);
+}
+
+TEST(Lifetime, ACopyOutlivesTheClipsItWasCopiedFrom) {
+    TrackPtr portion;
+    std::map<MediaPtr, MediaPtr> copied;
+    {
+        Built built;
+        portion = built.track->copyPortion(Range<VelaTime>(100, 50), &copied);
+    }
+    const MediaPtr copy = portion->medias().at(0);
+    copied.clear(); // the originals go
+    const auto visual = boost::dynamic_pointer_cast<VisualMedia>(copy);
+    EXPECT_DOUBLE_EQ(visual->opacity()->valueAtTime(RationalTime(15)), 0.75);
+    EXPECT_EQ(copy->fromGlobalToParametricTime(RationalTime(15)), RationalTime(15));
+}
+
+TEST(Lifetime, TransitionsAndNeighboursKeptPastTheirClips) {
+    TransitionPtr shared;
+    MediaPtr later;
+    {
+        Built built;
+        shared.reset(new Transition("dissolve", 4));
+        built.clip->setRightTransition(shared);
+        later = PlaceholderMedia::create(built.project, built.rate, 0, 10);
+        boost::static_pointer_cast<GenericTrack>(built.track)->addMedia(later, 150); // joins the transition
+        EXPECT_EQ(shared->rightMedia(), later);
+        EXPECT_EQ(Track::getTouchingMediaToLeftOfMedia(later), built.clip);
+    }
+    EXPECT_FALSE(shared->leftMedia()); // the earlier clip has gone
+    EXPECT_EQ(shared->rightMedia(), later);
+    EXPECT_EQ(later->leftTransition(), shared);
+    EXPECT_EQ(later->transitionAtTime(151), shared);
+    EXPECT_FALSE(Track::getLeftOfMedia(later));
+    EXPECT_FALSE(Track::getTouchingMediaToLeftOfMedia(later));
+    EXPECT_FALSE(LockData::IsTransitionLocked(*shared));
+}
+
+TEST(ParentTimeline, FollowsTheClipsContainersWhicheverWayTheyGotThere) {
+    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    const TimelinePtr timeline = Timeline::create(project);
+    const auto mixer = GenericMixer::create(project);
+    const auto track = GenericTrack::create(project);
+    const MediaPtr early = PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 10);
+    track->addMedia(early, 0); // on the track before the track is anywhere
+    mixer->addTrack(track);
+    EXPECT_TRUE(early->parentTimeline().expired());
+    timeline->addMixer("main", mixer); // the mixer joins with its tracks and clips
+    EXPECT_EQ(early->parentTimeline().lock(), timeline);
+
+    const RemoveTrackInfo removed = timeline->removeTrack(mixer, track);
+    EXPECT_TRUE(early->parentTimeline().expired());
+    mixer->putBack(removed);
+    EXPECT_EQ(early->parentTimeline().lock(), timeline);
+
+    timeline->removeMixer(mixer);
+    EXPECT_TRUE(early->parentTimeline().expired());
+    EXPECT_FALSE(track->parentTimeline());
+    timeline->addMixer("again", mixer);
+    EXPECT_EQ(early->parentTimeline().lock(), timeline);
+    track->removeMedia(early);
+    EXPECT_TRUE(early->parentTimeline().expired());
+}
