@@ -37,8 +37,12 @@ bool RationalTemporalEditor::validTrimStart(const MediaState& state, VelaTime of
     return state.maxUnbounded() || mediaStart < state.maxMediaEnd;
 }
 
+// The limit alone is not enough when the duration was rounded up: the media
+// the extended duration implies must still end within the media.
 bool RationalTemporalEditor::validTrimEnd(const MediaState& state, VelaTime offset) const {
-    return leavesEnoughMedia(state, offset) && offset >= trimEndLimit(state);
+    if (!leavesEnoughMedia(state, offset) || offset < trimEndLimit(state)) return false;
+    return state.maxUnbounded() ||
+           state.mediaStart + mediaDurationFor(state, state.duration - offset) <= state.maxMediaEnd;
 }
 
 MediaState RationalTemporalEditor::trimStart(const MediaState& state, VelaTime offset) const {

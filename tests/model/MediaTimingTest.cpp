@@ -330,3 +330,15 @@ TEST_F(MediaTiming, AnEditorsStretchCanBeReplacedByAKind) {
     const RationalMediaEditor& editor = doubling;
     EXPECT_EQ(editor.stretch(media->state(), SafeRational(2)).duration, 40);
 }
+
+// A duration rounded up leaves less media past the end than the limit says:
+// an extension that would play past the media's end is refused.
+TEST_F(MediaTiming, ExtendingTheEndNeverPlaysPastTheMedia) {
+    auto rounded = clip(timing(0, 8, 1, SafeRational(45, 2), SafeRational(1, 3), 0, 30));
+    EXPECT_EQ(rounded->trimEndLimit(), -2);
+    EXPECT_FALSE(rounded->validTrimEnd(-2));
+    expectRefused<InvalidTrimRangeException>(*rounded, [&] { rounded->trimEnd(-2); },
+                                             "invalid media trim end offset");
+    rounded->trimEnd(-1);
+    EXPECT_LE(rounded->state().mediaEnd(), SafeRational(30));
+}
