@@ -41,8 +41,8 @@ bool LockData::IsTransitionHidden(const Transition& transition) {
 
 std::vector<TrackPtr> LockData::GetAllEditableTracks(const Timeline& timeline) {
     std::vector<TrackPtr> editable;
-    for (const std::string& name : timeline.mixerNames())
-        for (const TrackPtr& track : timeline.mixer(name)->tracks())
+    for (const MixerPtr& mixer : timeline.mixers())
+        for (const TrackPtr& track : mixer->tracks())
             if (IsTrackEditable(*track)) editable.push_back(track);
     return editable;
 }

@@ -6,8 +6,7 @@ TrackMagnetizerAutoAttacher::TrackMagnetizerAutoAttacher(const TimelinePtr& time
                                                          CommandExecutor& executor)
     : timeline_(timeline), executor_(executor) {
     timeline->attachAddObserver(this);
-    for (const std::string& name : timeline->mixerNames())
-        onTimelineAddMixer(*timeline, timeline->mixer(name));
+    for (const MixerPtr& mixer : timeline->mixers()) onTimelineAddMixer(*timeline, mixer);
 }
 
 TrackMagnetizerAutoAttacher::~TrackMagnetizerAutoAttacher() {
