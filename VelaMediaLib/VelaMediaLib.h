@@ -102,6 +102,7 @@
 #include <VelaMediaLib/time/KeyFrameInterface.h>
 #include <VelaMediaLib/time/KeyFrameMapUtil.h>
 #include <VelaMediaLib/time/LambdaObserverWithoutNotifyDelay.h>
+#include <VelaMediaLib/time/LazyCreation.h>
 #include <VelaMediaLib/time/LeftInterpolater.h>
 #include <VelaMediaLib/time/LeftParameter.h>
 #include <VelaMediaLib/time/LinearInterpolater.h>

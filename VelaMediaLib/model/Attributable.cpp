@@ -6,22 +6,23 @@ namespace VelaMediaLib {
 
 Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
     ScopedReadLock lock(attributesToken_);
-    if (!attributes_) return AttributePtr();
-    const auto found = attributes_->find(name);
-    return found == attributes_->end() ? AttributePtr() : found->second;
+    return attributes_.find(name);
 }
 
-void Attributable::insertAttribute(const AttributePtr& attribute) {
+Attributable::AttributePtr Attributable::insertAttribute(const AttributePtr& attribute) {
     ScopedWriteLock lock(attributesToken_);
-    if (!attributes_) attributes_.reset(new std::map<std::string, AttributePtr>);
-    (*attributes_)[attribute->name()] = attribute;
+    return attributes_.insertIfAbsent(attribute->name(), attribute);
+}
+
+Attributable::AttributePtr Attributable::insertAttributeIfAbsent(const AttributePtr& attribute) {
+    ScopedReadLock lock(attributesToken_);
+    return attributes_.insertIfAbsent(attribute->name(), attribute);
 }
 
 std::vector<std::string> Attributable::attributeNames() const {
     ScopedReadLock lock(attributesToken_);
     std::vector<std::string> names;
-    if (attributes_)
-        for (const auto& entry : *attributes_) names.push_back(entry.first);
+    attributes_.forEach([&](const std::string& name, const AttributePtr&) { names.push_back(name); });
     return names;
 }
 
@@ -31,10 +32,9 @@ void Attributable::writeAttributes(JSONWriter& writer) const {
 
 void Attributable::copyAttributesTo(Attributable& other) const {
     ScopedReadLock lock(attributesToken_);
-    if (!attributes_) return;
-    if (!other.attributes_) other.attributes_.reset(new std::map<std::string, AttributePtr>);
-    for (const auto& entry : *attributes_)
-        (*other.attributes_)[entry.first] = entry.second->cloneAttribute(other.attributesToken_);
+    attributes_.forEach([&](const std::string& name, const AttributePtr& attribute) {
+        other.attributes_.set(name, attribute->cloneAttribute(other.attributesToken_));
+    });
 }
 
 } // namespace VelaMediaLib

@@ -1,10 +1,9 @@
 #pragma once
 
 #include <VelaMediaLib/time/Attribute.h>
+#include <VelaMediaLib/time/LazyCreation.h>
 #include <VelaMediaLib/time/VelaMediaLibException.h>
 
-#include <map>
-#include <memory>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -30,21 +29,23 @@ public:
     /// Adds the attribute, or sets the value of the one the name already has.
     template <typename T>
     boost::shared_ptr<Attribute<T>> addAttribute(const std::string& name, const T& value) {
-        if (const AttributePtr existing = findAttribute(name)) {
-            const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(existing);
-            if (!typed) throw TypeException("attribute " + name + " holds another type");
-            typed->setValue(value);
-            return typed;
-        }
-        const boost::shared_ptr<Attribute<T>> made(new Attribute<T>(name, value, attributesToken_));
-        insertAttribute(made);
-        return made;
+        AttributePtr kept = findAttribute(name);
+        if (!kept) kept = insertAttribute(AttributePtr(new Attribute<T>(name, value, attributesToken_)));
+        const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(kept);
+        if (!typed) throw TypeException("attribute " + name + " holds another type");
+        typed->setValue(value); // tells nobody when it holds the value already
+        return typed;
     }
     /// The attribute of the name, made with the initial value if it has none.
+    /// Making it takes only the read lock (the initial value is the default
+    /// readers assume), so it may be asked inside a reader's snapshot.
     template <typename T>
     boost::shared_ptr<Attribute<T>> attributeOrAdd(const std::string& name, const T& initial) {
-        const auto existing = attribute<T>(name);
-        return existing ? existing : addAttribute<T>(name, initial);
+        if (const auto existing = attribute<T>(name)) return existing;
+        const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(
+            insertAttributeIfAbsent(AttributePtr(new Attribute<T>(name, initial, attributesToken_))));
+        if (!typed) throw TypeException("attribute " + name + " holds another type");
+        return typed;
     }
     /// The value, or the fallback when the name has no attribute of that type.
     template <typename T>
@@ -66,10 +67,13 @@ protected:
 
 private:
     AttributePtr findAttribute(const std::string& name) const;
-    void insertAttribute(const AttributePtr& attribute);
+    /// Links the attribute in under the write lock unless the name has one; returns the one it has.
+    AttributePtr insertAttribute(const AttributePtr& attribute);
+    /// The attribute the name has, or else the given one, linked in under the read lock.
+    AttributePtr insertAttributeIfAbsent(const AttributePtr& attribute);
 
     boost::weak_ptr<const ThreadSafe> attributesToken_;
-    std::unique_ptr<std::map<std::string, AttributePtr>> attributes_;
+    NamedEntries<AttributeInterface> attributes_;
 };
 
 } // namespace VelaMediaLib

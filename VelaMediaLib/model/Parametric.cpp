@@ -5,6 +5,7 @@
 #include <VelaMediaLib/time/VelaMediaLibException.h>
 
 #include <algorithm>
+#include <utility>
 
 namespace VelaMediaLib {
 
@@ -14,6 +15,8 @@ class UnitTimeScale : public TimeScalable {
 public:
     SafeRational timeScale() const override { return SafeRational(1); }
 };
+
+typedef std::vector<std::pair<std::string, boost::shared_ptr<ParameterInterface>>> NamedParameters;
 
 } // namespace
 
@@ -28,27 +31,26 @@ boost::shared_ptr<ParameterInterface> Parametric::createDefaultParameter(const s
 
 boost::shared_ptr<ParameterInterface> Parametric::madeParameter(const std::string& name) const {
     ScopedReadLock lock(parametersToken_);
-    if (!parameters_) return boost::shared_ptr<ParameterInterface>();
-    const auto found = parameters_->find(name);
-    return found == parameters_->end() ? boost::shared_ptr<ParameterInterface>() : found->second;
+    return parameters_.find(name);
 }
 
+// Made outside any lock and linked in under the read lock; a thread that
+// made the same parameter at the same moment gets the one linked in first.
 boost::shared_ptr<ParameterInterface> Parametric::parameter(const std::string& name) const {
     if (const auto made = madeParameter(name)) return made;
     const boost::shared_ptr<ParameterInterface> created = createDefaultParameter(name);
     if (!created) return created;
-    ScopedWriteLock lock(parametersToken_);
-    if (!parameters_) parameters_.reset(new Map);
-    const auto inserted = parameters_->insert(Map::value_type(name, created));
-    return inserted.first->second; // another thread may have made it first
+    ScopedReadLock lock(parametersToken_);
+    return parameters_.insertIfAbsent(name, created);
 }
 
 std::vector<std::string> Parametric::parameterNames() const {
     std::vector<std::string> names = defaultParameterNames();
     {
         ScopedReadLock lock(parametersToken_);
-        if (parameters_)
-            for (const auto& entry : *parameters_) names.push_back(entry.first);
+        parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>&) {
+            names.push_back(name);
+        });
     }
     std::sort(names.begin(), names.end());
     names.erase(std::unique(names.begin(), names.end()), names.end());
@@ -59,17 +61,18 @@ void Parametric::addParameter(const std::string& name,
                               const boost::shared_ptr<ParameterInterface>& parameter) {
     if (!parameter) throw AddRemoveException("no parameter to add as " + name);
     ScopedWriteLock lock(parametersToken_);
-    if (!parameters_) parameters_.reset(new Map);
-    (*parameters_)[name] = parameter;
+    parameters_.set(name, parameter);
 }
 
 bool Parametric::hasMadeParameter(const std::string& name) const { return bool(madeParameter(name)); }
 
 void Parametric::toJSONParameterList(JSONWriter& writer) const {
-    Map made;
+    NamedParameters made;
     {
         ScopedReadLock lock(parametersToken_);
-        if (parameters_) made = *parameters_;
+        parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
+            made.emplace_back(name, p);
+        });
     }
     writer.key("parameters");
     JSONWriter members(writer.options(), writer.memberLevel());
@@ -80,21 +83,31 @@ void Parametric::toJSONParameterList(JSONWriter& writer) const {
     }
 }
 
+// Every member is read into a new parameter first (the kind of the one made,
+// or of the declared default), so a failure leaves the object as it was; the
+// new parameters go in together under one write lock.
 void Parametric::readParameterList(const Json::Value& parameters) {
     if (!parameters.isObject()) return;
-    for (const std::string& name : parameters.getMemberNames())
-        if (const auto target = parameter(name)) target->readFromJSON(parameters[name]);
+    NamedParameters read;
+    for (const std::string& name : parameters.getMemberNames()) {
+        const boost::shared_ptr<ParameterInterface> made = madeParameter(name);
+        const boost::shared_ptr<ParameterInterface> fresh =
+            made ? made->cloneParameter() : createDefaultParameter(name);
+        if (!fresh) continue; // a name this object does not have
+        fresh->replaceFromJSON(parameters[name]);
+        read.emplace_back(name, fresh);
+    }
+    ScopedWriteLock lock(parametersToken_);
+    for (const auto& entry : read) parameters_.set(entry.first, entry.second);
 }
 
 void Parametric::cloneParametersInto(Parametric& other) const {
     ScopedReadLock lock(parametersToken_);
-    if (!parameters_) return;
-    other.parameters_.reset(new Map);
-    for (const auto& entry : *parameters_) {
-        const boost::shared_ptr<ParameterInterface> copy = entry.second->cloneParameter();
+    parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
+        const boost::shared_ptr<ParameterInterface> copy = p->cloneParameter();
         copy->setTimeScalable(other.sharedTimeScale());
-        (*other.parameters_)[entry.first] = copy;
-    }
+        other.parameters_.set(name, copy);
+    });
 }
 
 } // namespace VelaMediaLib

@@ -1,11 +1,10 @@
 #pragma once
 
 #include <VelaMediaLib/model/XMLIdentified.h>
+#include <VelaMediaLib/time/LazyCreation.h>
 #include <VelaMediaLib/time/Parameter.h>
 #include <VelaMediaLib/time/TimeScalable.h>
 
-#include <map>
-#include <memory>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -17,12 +16,17 @@ class JSONWriter;
 /// for the parameters in use, and queries that find a parameter not yet made
 /// answer its default. Parameter times are this object's parametric time,
 /// one tick per unit.
+///
+/// Making a parameter on first use is invisible to readers: it happens under
+/// the read lock (the new parameter holds the default they would have
+/// answered) and never asks for the write lock, so a reader's snapshot stays
+/// one.
 class Parametric : public virtual XMLIdentified, public virtual TimeScalable {
 public:
     explicit Parametric(const boost::weak_ptr<const ThreadSafe>& token) : parametersToken_(token) {}
 
     /// The parameter of the name, made with its default if need be; null for
-    /// a name the object does not have.
+    /// a name the object does not have. Takes only the read lock.
     boost::shared_ptr<ParameterInterface> parameter(const std::string& name) const;
     template <typename T>
     boost::shared_ptr<Parameter<T>> typedParameter(const std::string& name) const {
@@ -44,7 +48,10 @@ public:
     /// Writes the "parameters" member: every parameter made (those not made
     /// hold their defaults, which reading gives back).
     void toJSONParameterList(JSONWriter& writer) const;
-    /// Reads a document's "parameters" object, each member into the parameter of its name.
+    /// Reads a document's "parameters" object: each member becomes the
+    /// parameter of its name, built from no keyframes (so what was written
+    /// reads back equal) and put in place of the one the object had. All or
+    /// nothing: a member that fails to read leaves every parameter as it was.
     void readParameterList(const Json::Value& parameters);
 
     SafeRational timeScale() const override { return SafeRational(1); }
@@ -55,6 +62,7 @@ public:
 
 protected:
     /// A new parameter of the name with its default, or null for unknown names.
+    /// It may be made under a reader's lock: it must take no write lock.
     virtual boost::shared_ptr<ParameterInterface> createDefaultParameter(const std::string& name) const;
     virtual std::vector<std::string> defaultParameterNames() const { return {}; }
     /// Clones of the parameters made so far, for a cloned object.
@@ -62,11 +70,10 @@ protected:
     const boost::weak_ptr<const ThreadSafe>& parametersToken() const { return parametersToken_; }
 
 private:
-    typedef std::map<std::string, boost::shared_ptr<ParameterInterface>> Map;
     boost::shared_ptr<ParameterInterface> madeParameter(const std::string& name) const;
 
     boost::weak_ptr<const ThreadSafe> parametersToken_;
-    mutable std::unique_ptr<Map> parameters_;
+    mutable NamedEntries<ParameterInterface> parameters_;
 };
 
 } // namespace VelaMediaLib

@@ -17,7 +17,8 @@ struct Animation {
 /// pairs around animations: a keyframe with a lead-in ends an animation over
 /// that lead-in, which the track records. When read from a document, a
 /// keyframe without a lead-in adds no keyframe: its value goes to the keyframe
-/// in force at its time (the last one at or before it, else the first).
+/// in force at its time (the last one at or before it, else the first). So
+/// that what is written reads back, every keyframe but the first has a lead-in.
 template <typename T>
 class AnimationParam : public InterpolatingParam<T> {
 public:
@@ -44,6 +45,22 @@ public:
 protected:
     boost::shared_ptr<ParameterImpl<T>> cloneImpl() const override {
         return boost::shared_ptr<ParameterImpl<T>>(new AnimationParam(*this));
+    }
+
+    bool canAddKeyFrame(const RationalTime& time, const RationalTime& leadIn,
+                        const KeyFrame<T>* ignoring) const override {
+        if (!ParameterImpl<T>::canAddKeyFrame(time, leadIn, ignoring)) return false;
+        for (const auto& entry : this->keyframes_) {
+            if (entry.keyframe.get() == ignoring || entry.time == time) continue;
+            if (entry.time < time) return leadIn > RationalTime(0); // it would not be the first
+            return entry.keyframe->duration() > RationalTime(0);    // the first would follow it
+        }
+        return true;
+    }
+    RationalTime edgeLeadIn(const RationalTime& segment) const override { return segment; }
+    void clearForReading() override {
+        InterpolatingParam<T>::clearForReading();
+        animations_.clear();
     }
 
     KeyFramePtr placeReadKeyFrame(const RationalTime& end, const T& value,

@@ -40,6 +40,12 @@ std::string BezierInterpolater::asJson() const {
            ")\"";
 }
 
+bool BezierInterpolater::sameAs(const Interpolater<Point3d>& other) const {
+    if (this == &other) return true;
+    const BezierInterpolater* bezier = dynamic_cast<const BezierInterpolater*>(&other);
+    return bezier && bezier->cp1_ == cp1_ && bezier->cp2_ == cp2_ && temporal_->sameAs(*bezier->temporal_);
+}
+
 Point3d BezierInterpolater::pointAt(const Point3d& a, const Point3d& b, double s) const {
     const double r = 1.0 - s;
     const double wa = r * r * r, w1 = 3.0 * s * r * r, w2 = 3.0 * s * s * r, wb = s * s * s;

@@ -26,6 +26,8 @@ public:
     Point3d doInterpolate(const Point3d& a, const Point3d& b, const RationalTime& t0, const RationalTime& t1,
                           double t) const override;
     double ease(double u) const override { return temporal_->ease(u); }
+    /// The same control points and the same temporal interpolater.
+    bool sameAs(const Interpolater<Point3d>& other) const override;
 
     /// The point at curve parameter s in [0, 1].
     Point3d pointAt(const Point3d& a, const Point3d& b, double s) const;

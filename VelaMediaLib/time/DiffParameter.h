@@ -110,6 +110,9 @@ protected:
             const RationalTime leadIn = entry.isMember("duration")
                                             ? JSONReader::jsonValueAsRationalTime(entry["duration"])
                                             : RationalTime(0);
+            if (leadIn < RationalTime(0))
+                throw ParserException("Invalid project json - an edit of " + this->identifier() +
+                                      " has a negative duration");
             const typename Base::KeyFramePtr keyframe =
                 this->newKeyFrame(time, ValueFormatter<T>::read(entry["value"]), leadIn);
             if (entry.isMember("interp"))
@@ -156,12 +159,16 @@ private:
         return keyframes;
     }
 
-    // The curve: the source's keyframes less the deletions, with the edits on top.
+    // The curve: the source's keyframes less the deletions, with the edits on
+    // top. An edit's lead-in that would now reach back past a keyframe of the
+    // source is cut to start at that keyframe, so the curve keeps to the
+    // placement rule (and reads back as written) with the same values.
     void rebuild() {
         KeyFrameMap merged;
         for (const auto& entry : sourceKeyFrames())
             if (!deletions_.count(entry.time)) merged.push_back(entry);
         for (const auto& entry : edits_) MapUtil::put(merged, entry.time, entry.keyframe->clone());
+        Base::cutLeadInsToTheirSegments(merged);
         this->keyframes_.swap(merged);
     }
 

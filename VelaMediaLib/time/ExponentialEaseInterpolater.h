@@ -11,6 +11,10 @@ class ExponentialEaseInterpolater : public TweenableInterpolater<T> {
 public:
     double exponent() const { return exponent_; }
     double ease(double u) const override { return InterpolaterUtil::easeExponential(u, exponent_); }
+    bool sameAs(const Interpolater<T>& other) const override {
+        return TweenableInterpolater<T>::sameAs(other) &&
+               static_cast<const ExponentialEaseInterpolater&>(other).exponent_ == exponent_;
+    }
 
 protected:
     ExponentialEaseInterpolater(const char* name, double exponent)

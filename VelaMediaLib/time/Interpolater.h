@@ -4,6 +4,7 @@
 
 #include <boost/shared_ptr.hpp>
 #include <string>
+#include <typeinfo>
 
 namespace VelaMediaLib {
 
@@ -36,6 +37,11 @@ public:
     virtual T doInterpolate(const T& a, const T& b, const RationalTime& t0, const RationalTime& t1,
                             double t) const = 0;
     virtual double ease(double u) const = 0;
+    /// Whether the other moves values exactly as this one does: the same kind
+    /// and name, and whatever shapes a kind's curve (control points, exponents).
+    virtual bool sameAs(const Interpolater& other) const {
+        return this == &other || (typeid(*this) == typeid(other) && name_ == other.name_);
+    }
 
     const std::string& name() const { return name_; }
 

@@ -5,120 +5,111 @@
 #include <VelaMediaLib/time/VelaMediaLibException.h>
 
 #include <algorithm>
-#include <map>
-#include <mutex>
-#include <vector>
 
 namespace VelaMediaLib {
-namespace {
 
-struct ProjectState {
-    int state = 0; // > 0: live delays; 0: idle; -1: delivering
-    std::vector<Subject*> waiting;
-};
-
-struct Registry {
-    std::mutex mutex;
-    std::map<const ThreadSafe*, ProjectState> projects;
-};
-
-// Never destroyed: subjects may be destroyed during static destruction.
-Registry& registry() {
-    static Registry* instance = new Registry;
-    return *instance;
-}
-
-int stateOf(const ThreadSafe* token) {
-    Registry& r = registry();
-    std::lock_guard<std::mutex> lock(r.mutex);
-    const auto found = r.projects.find(token);
-    return found == r.projects.end() ? 0 : found->second.state;
-}
-
-} // namespace
+NotifyDelayState& NotifyDelay::stateOf(const ThreadSafe& project) { return project.notifyDelayState_; }
 
 NotifyDelay::NotifyDelay(const boost::shared_ptr<const ThreadSafe>& token) : token_(token) {
-    Registry& r = registry();
-    std::lock_guard<std::mutex> lock(r.mutex);
-    ProjectState& project = r.projects[token_.get()];
-    if (project.state < 0) throw VelaMediaLibException("nested delays not supported");
-    ++project.state;
+    if (!token_) return;
+    NotifyDelayState& s = stateOf(*token_);
+    std::lock_guard<std::mutex> lock(s.mutex_);
+    if (s.count_ < 0) throw VelaMediaLibException("nested delays not supported");
+    ++s.count_;
 }
 
 NotifyDelay::~NotifyDelay() {
+    if (!token_) return;
     {
-        Registry& r = registry();
-        std::lock_guard<std::mutex> lock(r.mutex);
-        ProjectState& project = r.projects[token_.get()];
-        if (--project.state > 0) return;
-        project.state = -1;
+        NotifyDelayState& s = stateOf(*token_);
+        std::lock_guard<std::mutex> lock(s.mutex_);
+        if (--s.count_ > 0) return;
+        s.count_ = -1;
+        s.deliverer_ = std::this_thread::get_id();
     }
-    deliver();
+    while (deliverNext()) {}
 }
 
 // Takes the waiting subjects one at a time, so that a subject destroyed by an
-// observer during delivery is simply no longer there.
-void NotifyDelay::deliver() {
-    Registry& r = registry();
-    for (;;) {
-        Subject* next = nullptr;
-        {
-            std::lock_guard<std::mutex> lock(r.mutex);
-            ProjectState& project = r.projects[token_.get()];
-            if (project.waiting.empty()) {
-                project.state = 0;
-                return;
-            }
-            next = project.waiting.front();
-            project.waiting.erase(project.waiting.begin());
-            next->pendingInDelay_ = false;
+// observer during delivery is simply no longer there. The project's read lock
+// is held from taking a subject to the end of its delivery, so a subject
+// released under the write lock is never caught in between.
+bool NotifyDelay::deliverNext() {
+    NotifyDelayState& s = stateOf(*token_);
+    ScopedReadLock read(token_->mutex());
+    Subject* next = nullptr;
+    {
+        std::lock_guard<std::mutex> lock(s.mutex_);
+        if (s.waiting_.empty()) {
+            s.count_ = 0;
+            return false;
         }
-        try {
-            next->tellOrdinaryObservers();
-        } catch (...) {
-            // An observer's failure must not stop the others from hearing.
-        }
+        next = s.waiting_.front();
+        s.waiting_.pop_front();
+        s.delivering_ = next;
     }
+    try {
+        next->tellHeldBackObservers();
+    } catch (...) {
+        // Nothing to report to: the edit has finished (observers' own failures are dropped inside).
+    }
+    {
+        std::lock_guard<std::mutex> lock(s.mutex_);
+        if (s.delivering_ == next) next->parked_ = false; // else one of its observers destroyed it
+        s.delivering_ = nullptr;
+    }
+    s.delivered_.notify_all();
+    return true;
 }
 
 bool NotifyDelay::isActive(const boost::shared_ptr<const ThreadSafe>& token) {
-    return stateOf(token.get()) > 0;
+    if (!token) return false;
+    NotifyDelayState& s = stateOf(*token);
+    std::lock_guard<std::mutex> lock(s.mutex_);
+    return s.count_ > 0;
 }
 
 bool NotifyDelay::isNotifying(const boost::shared_ptr<const ThreadSafe>& token) {
-    return stateOf(token.get()) < 0;
+    if (!token) return false;
+    NotifyDelayState& s = stateOf(*token);
+    std::lock_guard<std::mutex> lock(s.mutex_);
+    return s.count_ < 0;
 }
 
-void NotifyDelay::addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token) {
-    Registry& r = registry();
-    std::lock_guard<std::mutex> lock(r.mutex);
-    if (subject->pendingInDelay_) return;
-    r.projects[token.get()].waiting.push_back(subject);
-    subject->pendingInDelay_ = true;
-}
-
-void NotifyDelay::removeSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>&) {
-    removeSubject(subject);
-}
-
-void NotifyDelay::removeSubject(Subject* subject) {
-    Registry& r = registry();
-    std::lock_guard<std::mutex> lock(r.mutex);
-    if (!subject->pendingInDelay_) return;
-    for (auto& entry : r.projects) {
-        std::vector<Subject*>& waiting = entry.second.waiting;
-        waiting.erase(std::remove(waiting.begin(), waiting.end(), subject), waiting.end());
+bool NotifyDelay::addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token) {
+    if (!subject || !token) return false;
+    NotifyDelayState& s = stateOf(*token);
+    std::lock_guard<std::mutex> lock(s.mutex_);
+    if (s.count_ <= 0) return false;
+    if (!subject->parked_.load(std::memory_order_relaxed)) {
+        s.waiting_.push_back(subject);
+        subject->parked_.store(true, std::memory_order_relaxed);
     }
-    subject->pendingInDelay_ = false;
+    return true;
 }
 
+void NotifyDelay::removeSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token) {
+    if (!subject || !token) return;
+    NotifyDelayState& s = stateOf(*token);
+    std::unique_lock<std::mutex> lock(s.mutex_);
+    if (s.delivering_ == subject) {
+        if (s.deliverer_ == std::this_thread::get_id())
+            s.delivering_ = nullptr; // one of its own observers is destroying it
+        else
+            s.delivered_.wait(lock, [&] { return s.delivering_ != subject; });
+    }
+    s.waiting_.erase(std::remove(s.waiting_.begin(), s.waiting_.end(), subject), s.waiting_.end());
+    subject->parked_.store(false, std::memory_order_relaxed);
+}
+
+// Every subject still waiting is alive here: a subject destroyed while its
+// project lives removes itself under the same mutex first.
 void NotifyDelay::removeMappingForThreadSafe(const ThreadSafe* token) {
-    Registry& r = registry();
-    std::lock_guard<std::mutex> lock(r.mutex);
-    const auto found = r.projects.find(token);
-    if (found == r.projects.end()) return;
-    for (Subject* subject : found->second.waiting) subject->pendingInDelay_ = false;
-    r.projects.erase(found);
+    if (!token) return;
+    NotifyDelayState& s = stateOf(*token);
+    std::lock_guard<std::mutex> lock(s.mutex_);
+    for (Subject* subject : s.waiting_) subject->parked_.store(false, std::memory_order_relaxed);
+    s.waiting_.clear();
 }
 
 } // namespace VelaMediaLib

@@ -1,17 +1,43 @@
 #pragma once
 
 #include <boost/shared_ptr.hpp>
+#include <condition_variable>
+#include <deque>
+#include <mutex>
+#include <thread>
 
 namespace VelaMediaLib {
 
 class Subject;
 class ThreadSafe;
 
+/// The delay state of one project, held by the project itself (its
+/// ThreadSafe): the number of live delays (or -1 while the held-back
+/// notifications are being delivered), the subjects waiting, in the order in
+/// which they first changed, and the subject being delivered. Its small mutex
+/// is taken only for the state's own reads and writes, never while observers run.
+class NotifyDelayState {
+public:
+    NotifyDelayState() = default;
+    NotifyDelayState(const NotifyDelayState&) = delete;
+    NotifyDelayState& operator=(const NotifyDelayState&) = delete;
+
+private:
+    friend class NotifyDelay;
+
+    std::mutex mutex_;
+    std::condition_variable delivered_;
+    int count_ = 0; // > 0: live delays; 0: idle; -1: delivering
+    std::deque<Subject*> waiting_;
+    Subject* delivering_ = nullptr;
+    std::thread::id deliverer_;
+};
+
 /// Holds back the ordinary notifications of one project while it lives; when
 /// the last delay of that project ends, each held-back subject is told once,
-/// in the order in which it first changed. A process-wide registry keeps, per
-/// project, the number of live delays (or -1 while the held-back notifications
-/// are being delivered) and the subjects waiting.
+/// in the order in which it first changed. An observer that throws during
+/// that delivery is skipped and its exception dropped: the edit it heard of
+/// has already finished, and the other observers must still hear of it.
 class NotifyDelay {
 public:
     /// Throws VelaMediaLibException "nested delays not supported" when opened
@@ -23,14 +49,19 @@ public:
 
     static bool isActive(const boost::shared_ptr<const ThreadSafe>& token);
     static bool isNotifying(const boost::shared_ptr<const ThreadSafe>& token);
-    static void addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token);
+    /// Holds the subject back if a delay of the project is active, checking
+    /// and parking in one step; returns whether it did. A subject is held
+    /// back once however often it changes.
+    static bool addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token);
+    /// Forgets a held-back subject (one that is destroyed). If another thread
+    /// is delivering it at that moment, waits until that delivery has ended.
     static void removeSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token);
-    /// Forgets a subject wherever it waits (a subject destroyed while held back).
-    static void removeSubject(Subject* subject);
+    /// Forgets every subject the project holds back (they will not be told).
     static void removeMappingForThreadSafe(const ThreadSafe* token);
 
 private:
-    void deliver();
+    static NotifyDelayState& stateOf(const ThreadSafe& project);
+    bool deliverNext();
 
     boost::shared_ptr<const ThreadSafe> token_;
 };

@@ -12,10 +12,15 @@
 //   interface; values outside the bounds are stored as given.
 // - copyPortion keeps the keyframes inside the range and, for an animated
 //   parameter, adds keyframes at the range's edges holding the values there.
+// - The identifier attribute and the metadata are made on first use under the
+//   read lock (published with one compare-and-swap), so asking for them never
+//   takes the write lock; what they add to a constant parameter's document
+//   form counts only when it holds something.
 
 #include <VelaMediaLib/time/InterpolaterFactory.h>
 #include <VelaMediaLib/time/InterpolaterValueFormatter.h>
 #include <VelaMediaLib/time/KeyFrameMapUtil.h>
+#include <VelaMediaLib/time/LazyCreation.h>
 #include <VelaMediaLib/time/Parameter.h>
 
 #include <boost/optional.hpp>
@@ -64,6 +69,7 @@ public:
 
     // Identification and description
     std::string identifier() const override;
+    /// Made on first use under the read lock only.
     boost::shared_ptr<Attribute<std::string>> identAttribute() override;
     std::string parameterTypeString() const override { return ParameterTraits<T>::typeName(); }
     bool isSimpleType() const override {
@@ -80,6 +86,8 @@ public:
     void setTimeScalable(const boost::shared_ptr<const TimeScalable>& scalable) override {
         scalable_ = scalable;
     }
+    /// Made on first use under the read lock only; stays the same object for
+    /// the parameter's life (reading a document replaces its entries).
     MetaDatable* metaDataPtr() override;
     std::map<std::string, std::string> generateMetaDataMap() const override;
 
@@ -129,6 +137,7 @@ public:
     void toJSON(XMLOptions& options, int indent, const std::string& name,
                 const std::string& typeName = std::string()) const override;
     void readFromJSON(const Json::Value& value) override;
+    void replaceFromJSON(const Json::Value& value) override;
     /// Names of parameters that are always written as objects, never bare.
     static std::set<std::string>& namesWrittenInFull() {
         static std::set<std::string> names;
@@ -136,11 +145,15 @@ public:
     }
 
 protected:
-    /// A new parameter of a kind, holding the value as its only keyframe at time 0.
+    /// A new parameter of a kind, holding the value as its only keyframe at
+    /// time 0. Nothing else knows it yet, so it takes no lock: parameters are
+    /// made on first use inside readers' snapshots.
     template <typename Kind, typename... Args>
     static boost::shared_ptr<Kind> createHolding(const T& value, Args&&... args) {
         boost::shared_ptr<Kind> parameter(new Kind(std::forward<Args>(args)...));
-        parameter->setDefaultValue(value);
+        ParameterImpl& made = *parameter;
+        made.keyframes_.push_back(
+            {RationalTime(0), made.newKeyFrame(RationalTime(0), value, RationalTime(0))});
         return parameter;
     }
 
@@ -167,6 +180,18 @@ protected:
                                 const KeyFrame<T>* ignoring = nullptr) const;
     /// Called under the write lock after every edit that changed the keyframes.
     virtual void keyframesEdited() {}
+    /// The lead-in of the keyframe copyPortion adds at the range's end, given
+    /// the length of the segment it ends (a lead-in of 0 and one of the whole
+    /// segment give the same values).
+    virtual RationalTime edgeLeadIn(const RationalTime&) const { return RationalTime(0); }
+    /// Cuts every lead-in that reaches back past the previous keyframe to
+    /// start at it (which gives the same values).
+    static void cutLeadInsToTheirSegments(KeyFrameMap& curve) {
+        for (size_t i = 1; i < curve.size(); ++i) {
+            const RationalTime segment = curve[i].time - curve[i - 1].time;
+            if (curve[i].keyframe->leadIn_ > segment) curve[i].keyframe->leadIn_ = segment;
+        }
+    }
     /// Reads one keyframe object of a document's "keyframes" array into this parameter.
     virtual void readKeyFrame(const Json::Value& keyframe);
     /// Puts a keyframe read from a document at its end time: an existing one
@@ -177,6 +202,10 @@ protected:
     /// Adopts what a scratch copy read from a document; kinds with state of
     /// their own take theirs too.
     virtual void takeStateFrom(ParameterImpl& read);
+    /// Empties a scratch copy's curve and metadata before a whole parameter
+    /// is read into it; kinds with a curve of their own empty theirs too.
+    virtual void clearForReading();
+    void readDocument(const Json::Value& json, bool fromNoKeyFrames);
     void readInto(const Json::Value& json);
     /// Whether the parameter is written as its bare value: it is written under
     /// its own type name, its name is not one always written in full, and it
@@ -193,6 +222,8 @@ protected:
     KeyFramePtr newKeyFrame(const RationalTime& time, const T& value, const RationalTime& leadIn) const {
         return KeyFramePtr(new KeyFrame<T>(this->projectMutex(), time, value, leadIn));
     }
+    /// Whether every keyframe of the curve stands where canAddKeyFrame allows.
+    bool placementHolds(KeyFrameMap& curve);
     [[noreturn]] void refuse(const std::string& what, const RationalTime& time) const {
         throw KeyFrameException(what + " at time " + describe(time) + " in parameter " + identifier_, time,
                                 identifier_);
@@ -216,18 +247,25 @@ protected:
     KeyFrameMap keyframes_;
 
 private:
-    // What few parameters have, allocated when first needed.
+    // What few parameters have, allocated when first needed. Bounds and hints
+    // change under the write lock; the attribute and the metadata are made on
+    // first use by queries.
     struct Extras {
         boost::optional<ValueBounds<T>> bounds;
         boost::optional<UIHints> hints;
-        boost::shared_ptr<Attribute<std::string>> identAttribute;
-        std::unique_ptr<MetaDatable> metadata;
+        LazyPtr<boost::shared_ptr<Attribute<std::string>>> identAttribute;
+        LazyPtr<MetaDatable> metadata;
     };
-    Extras& extras() const;
+    Extras& extras() const {
+        return extras_.getOrMake([] { return new Extras; });
+    }
+    MetaDatable& metadata() const;
+    /// Whether bounds, hints or metadata entries need the document's object form.
+    bool describedBeyondTheCurve() const;
 
     std::string identifier_;
     boost::shared_ptr<const TimeScalable> scalable_;
-    mutable std::unique_ptr<Extras> extras_;
+    LazyPtr<Extras> extras_;
 };
 
 } // namespace VelaMediaLib

@@ -30,7 +30,7 @@ template <typename T>
 bool ParameterImpl<T>::writtenBare(const std::string& name, const std::string& typeName) const {
     if (!typeName.empty() && typeName != parameterTypeString()) return false;
     if (namesWrittenInFull().count(name)) return false;
-    if (keyframes_.size() != 1 || extras_) return false; // bounds, hints and metadata need the object form
+    if (keyframes_.size() != 1 || describedBeyondTheCurve()) return false;
     const std::string interp = parameterInterpolaterName();
     if (!interp.empty() && interp != InterpolaterFactory<T>::defaultInterpolater()->name()) return false;
     const KeyFrame<T>& only = *keyframes_.front().keyframe;
@@ -52,21 +52,22 @@ void ParameterImpl<T>::toJSON(XMLOptions& options, int indent, const std::string
     if (!type.empty()) object.key("type") << quotedJSONString(type);
     const std::string interp = parameterInterpolaterName();
     if (!interp.empty()) object.key("interp") << quotedJSONString(interp);
-    if (extras_ && extras_->bounds) {
+    const Extras* e = extras_.get();
+    if (e && e->bounds) {
         object.key("valueBounds");
         JSONWriter bounds(options, object.memberLevel());
-        ValueFormatter<T>::write(bounds.key("minValue"), extras_->bounds->minValue);
-        ValueFormatter<T>::write(bounds.key("maxValue"), extras_->bounds->maxValue);
-        ValueFormatter<T>::write(bounds.key("defaultValue"), extras_->bounds->defaultValue);
+        ValueFormatter<T>::write(bounds.key("minValue"), e->bounds->minValue);
+        ValueFormatter<T>::write(bounds.key("maxValue"), e->bounds->maxValue);
+        ValueFormatter<T>::write(bounds.key("defaultValue"), e->bounds->defaultValue);
     }
-    if (extras_ && extras_->hints) {
+    if (e && e->hints) {
         object.key("uiHints");
         JSONWriter hints(options, object.memberLevel());
-        hints.key("userInterfaceType") << quotedJSONString(extras_->hints->userInterfaceType);
-        hints.key("unitType") << quotedJSONString(extras_->hints->unitType);
+        hints.key("userInterfaceType") << quotedJSONString(e->hints->userInterfaceType);
+        hints.key("unitType") << quotedJSONString(e->hints->unitType);
     }
     writeKeyFrames(object);
-    if (extras_ && extras_->metadata) MetaDatable::toJSON(object, *extras_->metadata);
+    if (e && e->metadata.get()) MetaDatable::toJSON(object, *e->metadata.get());
 }
 
 template <typename T>
@@ -81,9 +82,26 @@ void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
 
 template <typename T>
 void ParameterImpl<T>::readFromJSON(const Json::Value& json) {
+    readDocument(json, false);
+}
+
+template <typename T>
+void ParameterImpl<T>::replaceFromJSON(const Json::Value& json) {
+    readDocument(json, true);
+}
+
+template <typename T>
+void ParameterImpl<T>::readDocument(const Json::Value& json, bool fromNoKeyFrames) {
     const boost::shared_ptr<ParameterImpl> scratch = cloneImpl();
+    if (fromNoKeyFrames) scratch->clearForReading();
     scratch->readInto(json);
     edit([&] { takeStateFrom(*scratch); });
+}
+
+template <typename T>
+void ParameterImpl<T>::clearForReading() {
+    keyframes_.clear();
+    if (Extras* e = extras_.get()) e->metadata.reset();
 }
 
 template <typename T>
@@ -109,14 +127,13 @@ void ParameterImpl<T>::readInto(const Json::Value& json) {
     if (json.isMember("metadata")) JSONReader::readMetaData(json, *metaDataPtr());
 }
 
-// A "keyframes" array replaces the curve: reading starts from no keyframes,
-// and a later entry at the same end time replaces the value of an earlier one.
+// A "keyframes" array is read into the curve there is: an entry at a
+// keyframe's time replaces that keyframe's value, others add keyframes.
 template <typename T>
 void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
     const Json::Value& array = json["keyframes"];
     if (array.isNull()) return;
     if (!array.isArray()) throw ParserException("Invalid project json - \"keyframes\" is not an array");
-    keyframes_.clear();
     for (const Json::Value& keyframe : array) readKeyFrame(keyframe);
     if (keyframes_.empty())
         throw ParserException("Invalid project json - parameter " + identifier_ + " has no keyframe");
@@ -155,15 +172,32 @@ ParameterImpl<T>::placeReadKeyFrame(const RationalTime& end, const T& value, con
     return exactKeyFrame(end);
 }
 
+namespace ParameterDocument {
+
+/// Gives the metadata exactly the entries read, keeping the object (callers
+/// may hold it).
+inline void replaceEntries(MetaDatable& metadata, const std::map<std::string, std::string>& entries) {
+    for (const std::string& key : metadata.metaDataKeys())
+        if (!entries.count(key)) metadata.removeMetaData(key);
+    for (const auto& entry : entries) metadata.addMetaData(entry.first, entry.second);
+}
+
+} // namespace ParameterDocument
+
 template <typename T>
 void ParameterImpl<T>::takeStateFrom(ParameterImpl& read) {
     keyframes_.swap(read.keyframes_);
     for (auto& entry : keyframes_) entry.keyframe->setMetaDataProjectMutex(this->projectMutex());
-    if (!read.extras_ && !extras_) return;
+    const Extras* theirs = read.extras_.get();
+    if (!theirs && !extras_.get()) return;
     Extras& mine = extras();
-    mine.bounds = read.extras_ ? read.extras_->bounds : boost::none;
-    mine.hints = read.extras_ ? read.extras_->hints : boost::none;
-    mine.metadata.reset(read.extras_ ? read.extras_->metadata.release() : nullptr);
+    mine.bounds = theirs ? theirs->bounds : boost::none;
+    mine.hints = theirs ? theirs->hints : boost::none;
+    const std::map<std::string, std::string> entries = read.generateMetaDataMap();
+    if (MetaDatable* metadata = mine.metadata.get())
+        ParameterDocument::replaceEntries(*metadata, entries);
+    else if (!entries.empty())
+        ParameterDocument::replaceEntries(this->metadata(), entries);
 }
 
 } // namespace VelaMediaLib

@@ -21,6 +21,20 @@ bool ParameterImpl<T>::canAddKeyFrame(const RationalTime& time, const RationalTi
     return true;
 }
 
+// Checks a whole candidate curve by putting it in place for the test.
+template <typename T>
+bool ParameterImpl<T>::placementHolds(KeyFrameMap& curve) {
+    keyframes_.swap(curve);
+    bool holds = true;
+    for (const auto& entry : keyframes_)
+        if (!canAddKeyFrame(entry.time, entry.keyframe->leadIn_, entry.keyframe.get())) {
+            holds = false;
+            break;
+        }
+    keyframes_.swap(curve);
+    return holds;
+}
+
 template <typename T>
 T ParameterImpl<T>::setDefaultValue(const T& value) {
     T previous = value;
@@ -162,6 +176,7 @@ void ParameterImpl<T>::moveKeyframes(const RationalTime& offset, std::function<b
         for (const auto& entry : keyframes_)
             MapUtil::put(moved, select(entry.time) ? entry.time + offset : entry.time, entry.keyframe);
         if (moved.size() != keyframes_.size()) refuse("moveKeyframes: keyframes would meet", offset);
+        if (!placementHolds(moved)) refuse("moveKeyframes: a lead-in would reach past a keyframe", offset);
         for (auto& entry : moved) entry.keyframe->endTime_ = entry.time;
         keyframes_.swap(moved);
     });
@@ -188,6 +203,7 @@ boost::shared_ptr<Parameter<T>> ParameterImpl<T>::copyPortion(const Range<Ration
         const auto cut = MapUtil::firstAfter(keyframes_, end);
         const KeyFramePtr edge = newKeyFrame(end, valueAtTimeLocked(end), RationalTime(0));
         if (cut != keyframes_.end()) edge->interpolater_ = cut->keyframe->interpolater_;
+        edge->leadIn_ = edgeLeadIn(end - start - kept.back().time);
         keep(end, edge);
     }
     if (kept.empty()) keep(start, newKeyFrame(start, valueAtTimeLocked(start), RationalTime(0)));
@@ -203,6 +219,7 @@ void ParameterImpl<T>::setupSharedClone(const boost::shared_ptr<ParameterInterfa
     boost::optional<UIHints> hints = uiHints();
     target->setTimeScalable(scalable_);
     target->edit([&] {
+        if (!bounds && !hints && !target->extras_.get()) return; // nothing to share or to clear
         target->extras().bounds = bounds;
         target->extras().hints = hints;
     });

@@ -3,9 +3,9 @@
 
 namespace VelaMediaLib {
 
-// What is read from the other parameter is gathered under its read lock and
-// put in place after it, so that nothing here asks for the write lock while
-// holding the read lock.
+// What is read from the other parameter is gathered under its read lock; the
+// copy is known to no one yet, so filling it takes no lock at all (a caller
+// may be inside a reader's snapshot). Empty optional parts are not copied.
 template <typename T>
 ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
     : Base(other.projectMutex()), identifier_(other.identifier()), scalable_(other.scalable_) {
@@ -14,52 +14,69 @@ ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
         ScopedReadLock lock(other.projectMutex());
         for (const auto& entry : other.keyframes_)
             keyframes_.push_back({entry.time, entry.keyframe->clone()});
-        if (other.extras_) {
-            extras().bounds = other.extras_->bounds;
-            extras().hints = other.extras_->hints;
+        const Extras* theirs = other.extras_.get();
+        if (theirs && (theirs->bounds || theirs->hints)) {
+            extras().bounds = theirs->bounds;
+            extras().hints = theirs->hints;
         }
         metadata = other.generateMetaDataMap();
     }
-    for (const auto& entry : metadata) metaDataPtr()->addMetaData(entry.first, entry.second);
+    if (metadata.empty()) return;
+    MetaDatable* copied = new MetaDatable();
+    extras().metadata.reset(copied);
+    for (const auto& entry : metadata) copied->addMetaData(entry.first, entry.second);
+    copied->setMetaDataProjectMutex(this->projectMutex());
 }
 
 template <typename T>
-typename ParameterImpl<T>::Extras& ParameterImpl<T>::extras() const {
-    if (!extras_) extras_.reset(new Extras);
-    return *extras_;
+MetaDatable& ParameterImpl<T>::metadata() const {
+    return extras().metadata.getOrMake([this] { return new MetaDatable(this->projectMutex()); });
+}
+
+template <typename T>
+bool ParameterImpl<T>::describedBeyondTheCurve() const {
+    const Extras* e = extras_.get();
+    if (!e) return false;
+    const MetaDatable* metadata = e->metadata.get();
+    return e->bounds || e->hints || (metadata && !metadata->metaDataKeys().empty());
 }
 
 template <typename T>
 std::string ParameterImpl<T>::identifier() const {
     ScopedReadLock lock(this->projectMutex());
-    if (extras_ && extras_->identAttribute) return extras_->identAttribute->value();
-    return identifier_;
+    const Extras* e = extras_.get();
+    const boost::shared_ptr<Attribute<std::string>>* attribute = e ? e->identAttribute.get() : nullptr;
+    return attribute ? (*attribute)->value() : identifier_;
 }
 
 template <typename T>
 boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
-    ScopedWriteLock lock(this->projectMutex());
-    if (!extras().identAttribute)
-        extras().identAttribute.reset(new Attribute<std::string>("ident", identifier_, this->projectMutex()));
-    return extras().identAttribute;
+    ScopedReadLock lock(this->projectMutex());
+    return extras().identAttribute.getOrMake([this] {
+        return new boost::shared_ptr<Attribute<std::string>>(
+            new Attribute<std::string>("ident", identifier_, this->projectMutex()));
+    });
 }
 
 template <typename T>
 bool ParameterImpl<T>::hasValueBounds() const {
     ScopedReadLock lock(this->projectMutex());
-    return extras_ && extras_->bounds;
+    const Extras* e = extras_.get();
+    return e && e->bounds;
 }
 
 template <typename T>
 bool ParameterImpl<T>::hasUIHints() const {
     ScopedReadLock lock(this->projectMutex());
-    return extras_ && extras_->hints;
+    const Extras* e = extras_.get();
+    return e && e->hints;
 }
 
 template <typename T>
 boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
     ScopedReadLock lock(this->projectMutex());
-    return extras_ ? extras_->bounds : boost::none;
+    const Extras* e = extras_.get();
+    return e ? e->bounds : boost::none;
 }
 
 template <typename T>
@@ -70,7 +87,8 @@ void ParameterImpl<T>::setValueBounds(const T& minValue, const T& maxValue, cons
 template <typename T>
 boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
     ScopedReadLock lock(this->projectMutex());
-    return extras_ ? extras_->hints : boost::none;
+    const Extras* e = extras_.get();
+    return e ? e->hints : boost::none;
 }
 
 template <typename T>
@@ -80,16 +98,16 @@ void ParameterImpl<T>::setUIHints(const std::string& userInterfaceType, const st
 
 template <typename T>
 MetaDatable* ParameterImpl<T>::metaDataPtr() {
-    ScopedWriteLock lock(this->projectMutex());
-    if (!extras().metadata) extras().metadata.reset(new MetaDatable(this->projectMutex()));
-    return extras().metadata.get();
+    ScopedReadLock lock(this->projectMutex());
+    return &metadata();
 }
 
 template <typename T>
 std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
     ScopedReadLock lock(this->projectMutex());
-    if (!extras_ || !extras_->metadata) return std::map<std::string, std::string>();
-    return extras_->metadata->metaDataCopy();
+    const Extras* e = extras_.get();
+    const MetaDatable* metadata = e ? e->metadata.get() : nullptr;
+    return metadata ? metadata->metaDataCopy() : std::map<std::string, std::string>();
 }
 
 template <typename T>
@@ -217,6 +235,25 @@ ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) cons
     return keyframe ? segmentInterpolater(*keyframe) : defaultInterpolater();
 }
 
+namespace ParameterComparison {
+
+template <typename T>
+bool sameInterpolater(const boost::shared_ptr<Interpolater<T>>& a,
+                      const boost::shared_ptr<Interpolater<T>>& b) {
+    return a == b || (a && b && a->sameAs(*b));
+}
+
+/// Value, lead-in and metadata; the time is the one both were found at.
+template <typename T>
+bool sameKeyFrame(const KeyFrame<T>& a, const KeyFrame<T>& b) {
+    return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() &&
+           a.metaDataCopy() == b.metaDataCopy();
+}
+
+} // namespace ParameterComparison
+
+// Whole keyframes: time, value, lead-in, metadata and the interpolater that
+// shapes the segment each one ends, compared by what it does.
 template <typename T>
 bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
     if (this == &other) return true;
@@ -225,9 +262,9 @@ bool ParameterImpl<T>::operator==(const Parameter<T>& other) const {
     const boost::shared_ptr<std::vector<RationalTime>> times = keyframeTimes();
     for (const RationalTime& time : *times) {
         const ConstKeyFramePtr mine = keyframeAtTime(time), theirs = other.keyframeAtTime(time);
-        if (!theirs || !Similarity::same(mine->value(), theirs->value()) ||
-            mine->duration() != theirs->duration() ||
-            interpolaterForKeyFrame(mine)->name() != other.interpolaterForKeyFrame(theirs)->name())
+        if (!mine || !theirs || !ParameterComparison::sameKeyFrame(*mine, *theirs) ||
+            !ParameterComparison::sameInterpolater(interpolaterForKeyFrame(mine),
+                                                   other.interpolaterForKeyFrame(theirs)))
             return false;
     }
     return true;

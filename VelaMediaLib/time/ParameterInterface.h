@@ -73,10 +73,17 @@ public:
     /// parameterTypeString() (and then the parameter is never written bare).
     virtual void toJSON(XMLOptions& options, int indent, const std::string& name,
                         const std::string& typeName = std::string()) const = 0;
-    /// Reads a bare value or a parameter object; all or nothing.
+    /// Reads a bare value or a parameter object into this parameter, all or
+    /// nothing. Each "keyframes" entry at an existing keyframe's time replaces
+    /// its value; other entries add keyframes (a bare value makes the
+    /// parameter constant).
     virtual void readFromJSON(const Json::Value& value) = 0;
+    /// Reads a document value as the whole parameter: its entries are read
+    /// into a curve without keyframes, so a parameter reads back what this
+    /// library wrote of it. All or nothing.
+    virtual void replaceFromJSON(const Json::Value& value) = 0;
 
-    /// The parameter's own metadata (made on first use).
+    /// The parameter's own metadata (made on first use, taking the read lock only).
     virtual MetaDatable* metaDataPtr() = 0;
     virtual std::map<std::string, std::string> generateMetaDataMap() const = 0;
 };

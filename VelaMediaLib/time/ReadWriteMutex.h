@@ -32,6 +32,8 @@ public:
     void unlockRead();
     void lockWrite();
     void unlockWrite();
+    /// Whether a writer holds the lock or waits for it (for diagnostics and tests).
+    bool hasWriter() const { return writer_.load(std::memory_order_acquire); }
 
     /// Guards that take the lock for their lifetime. The token forms lock the
     /// project's mutex while the project lives, and nothing once it has gone.

@@ -18,6 +18,11 @@ public:
 
     double ease(double u) const override { return spring_.weight(u); }
     const SpringResponse& spring() const { return spring_; }
+    bool sameAs(const Interpolater<T>& other) const override {
+        if (!TweenableInterpolater<T>::sameAs(other)) return false;
+        const SpringResponse& theirs = static_cast<const SpringInterpolater&>(other).spring_;
+        return theirs.damping() == spring_.damping() && theirs.stiffness() == spring_.stiffness();
+    }
 
 private:
     friend class SharedInterpolaterInstance<SpringInterpolater<T>>;

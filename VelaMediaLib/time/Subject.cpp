@@ -4,9 +4,25 @@
 #include <VelaMediaLib/time/ThreadSafe.h>
 
 #include <algorithm>
+#include <cstdint>
+#include <mutex>
 
 namespace VelaMediaLib {
 namespace {
+
+// The observer lists' mutexes: a process-wide table, so that the many
+// subjects (keyframes, attributes, parameters) carry none of their own. The
+// mutexes are constant-initialised and never torn down early.
+struct alignas(64) ListMutex {
+    std::mutex mutex;
+};
+const std::uintptr_t kListMutexes = 64;
+ListMutex listMutexes[kListMutexes];
+
+std::mutex& listMutex(const Subject* subject) {
+    const std::uintptr_t address = reinterpret_cast<std::uintptr_t>(subject);
+    return listMutexes[((address >> 4) * 0x9E3779B97F4A7C15ull >> 58) % kListMutexes].mutex;
+}
 
 void removeFrom(std::vector<Observer*>& list, Observer* observer) {
     list.erase(std::remove(list.begin(), list.end(), observer), list.end());
@@ -24,66 +40,97 @@ bool contains(const std::vector<Observer*>& list, Observer* observer) {
 
 Subject::Subject(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
 
-Subject::~Subject() { NotifyDelay::removeSubject(this); }
-
-Subject::Lists& Subject::lists() {
-    if (!lists_) lists_.reset(new Lists);
-    return *lists_;
+// A subject whose project has gone has nothing to leave: the held-back
+// subjects went with the project.
+Subject::~Subject() {
+    if (parked_.load())
+        if (const boost::shared_ptr<const ThreadSafe> project = token_.lock())
+            NotifyDelay::removeSubject(this, project);
+    delete lists_.load(std::memory_order_acquire);
 }
 
-void Subject::attach(Observer* observer) {
-    auto guard = lockLists();
-    removeFrom(lists().withoutDelay, observer);
-    addTo(lists().ordinary, observer);
+// A notification held back by the old project moves with the subject: it is
+// held back by the new one's delay, or told now.
+void Subject::setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
+    const bool wasParked = parked_.load();
+    if (wasParked)
+        if (const boost::shared_ptr<const ThreadSafe> old = token_.lock())
+            NotifyDelay::removeSubject(this, old);
+    parked_.store(false);
+    token_ = token;
+    if (wasParked) notify();
 }
 
-void Subject::attachWithoutNotifyDelay(Observer* observer) {
-    auto guard = lockLists();
-    removeFrom(lists().ordinary, observer);
-    addTo(lists().withoutDelay, observer);
+void Subject::add(ListKind kind, Observer* observer) {
+    std::lock_guard<std::mutex> lock(listMutex(this));
+    Lists* lists = lists_.load(std::memory_order_relaxed);
+    if (!lists) {
+        lists = new Lists;
+        lists_.store(lists, std::memory_order_release);
+    }
+    removeFrom(lists->of(kind == Ordinary ? WithoutDelay : Ordinary), observer);
+    addTo(lists->of(kind), observer);
 }
+
+void Subject::attach(Observer* observer) { add(Ordinary, observer); }
+
+void Subject::attachWithoutNotifyDelay(Observer* observer) { add(WithoutDelay, observer); }
 
 void Subject::detach(Observer* observer) {
-    auto guard = lockLists();
-    if (!lists_) return;
-    removeFrom(lists_->ordinary, observer);
-    removeFrom(lists_->withoutDelay, observer);
+    std::lock_guard<std::mutex> lock(listMutex(this));
+    Lists* lists = lists_.load(std::memory_order_relaxed);
+    if (!lists) return;
+    removeFrom(lists->ordinary, observer);
+    removeFrom(lists->withoutDelay, observer);
 }
 
-// Walks a snapshot, skipping observers detached meanwhile and observers
-// already told in this notification.
-void Subject::tell(const std::vector<Observer*>& list, std::vector<Observer*>& told) {
-    const std::vector<Observer*> snapshot = list;
-    for (Observer* observer : snapshot) {
-        if (!contains(list, observer) || contains(told, observer)) continue;
+std::vector<Observer*> Subject::snapshot(ListKind kind) const {
+    std::lock_guard<std::mutex> lock(listMutex(this));
+    Lists* lists = lists_.load(std::memory_order_relaxed);
+    return lists ? lists->of(kind) : std::vector<Observer*>();
+}
+
+bool Subject::stillIn(ListKind kind, Observer* observer) const {
+    std::lock_guard<std::mutex> lock(listMutex(this));
+    Lists* lists = lists_.load(std::memory_order_relaxed);
+    return lists && contains(lists->of(kind), observer);
+}
+
+// Skips observers detached meanwhile and observers already told in this notification.
+void Subject::tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
+                   bool dropFailures) {
+    for (Observer* observer : observers) {
+        if (contains(told, observer) || !stillIn(kind, observer)) continue;
         told.push_back(observer);
-        observer->update(owner());
+        if (!dropFailures) {
+            observer->update(owner());
+            continue;
+        }
+        try {
+            observer->update(owner());
+        } catch (...) {
+            // Delayed delivery has no caller to hand this to; the others still hear.
+        }
     }
 }
 
 void Subject::notify() {
     ScopedReadLock lock(token_);
-    if (!notifiesEnabled()) return;
-    auto guard = lockLists();
-    if (!lists_) return;
+    if (!notifiesEnabled() || !lists_.load(std::memory_order_acquire)) return;
     std::vector<Observer*> told;
-    if (!lists_->withoutDelay.empty()) tell(lists_->withoutDelay, told);
-    if (lists_->ordinary.empty()) return;
+    tell(WithoutDelay, snapshot(WithoutDelay), told, false);
+    const std::vector<Observer*> ordinary = snapshot(Ordinary);
+    if (ordinary.empty()) return;
     const boost::shared_ptr<const ThreadSafe> token = token_.lock();
-    if (token && NotifyDelay::isActive(token)) {
-        NotifyDelay::addSubject(this, token);
-        return;
-    }
-    tell(lists_->ordinary, told);
+    if (token && NotifyDelay::addSubject(this, token)) return;
+    tell(Ordinary, ordinary, told, false);
 }
 
-void Subject::tellOrdinaryObservers() {
+void Subject::tellHeldBackObservers() {
     ScopedReadLock lock(token_);
-    if (!notifiesEnabled()) return;
-    auto guard = lockLists();
-    if (!lists_) return;
+    if (!notifiesEnabled() || !lists_.load(std::memory_order_acquire)) return;
     std::vector<Observer*> told;
-    tell(lists_->ordinary, told);
+    tell(Ordinary, snapshot(Ordinary), told, true);
 }
 
 Subject::NotifyDisabler::NotifyDisabler(Subject& subject) : subject_(subject) { ++subject_.disableCount_; }

@@ -3,9 +3,7 @@
 #include <VelaMediaLib/time/Observable.h>
 
 #include <atomic>
-#include <memory>
 #include <boost/weak_ptr.hpp>
-#include <mutex>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -16,6 +14,14 @@ class NotifyDelay;
 /// A subject of one project: two observer lists (ordinary ones, which a
 /// NotifyDelay holds back, and ones that are always told at once), a disable
 /// counter and the project's token. An observer sits in one list at a time.
+///
+/// Every subject guards its lists the same way: list changes and the copies
+/// that walks take hold a small mutex from a process-wide table (chosen by the
+/// subject's address), so attach and detach are safe while another thread
+/// notifies, and a subject costs no mutex of its own. Observers are never
+/// called under that mutex: a walk tells a snapshot and skips observers
+/// detached meanwhile. Notifications run under the project's read lock, so an
+/// observer detached under the write lock is certain not to be called any more.
 class Subject : public Observable {
 public:
     explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
@@ -51,30 +57,34 @@ public:
     Observable* owner() { return owner_ ? owner_ : this; }
 
     const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
-    void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) { token_ = token; }
-
-protected:
-    /// SubjectWithMutex guards the lists with a mutex of its own.
-    virtual std::unique_lock<std::recursive_mutex> lockLists() const {
-        return std::unique_lock<std::recursive_mutex>();
-    }
+    /// Set before the subject is shared with other threads. A notification
+    /// the old project's delay holds back moves to the new project (held back
+    /// by its delay, or told at once).
+    void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
 
 private:
     friend class NotifyDelay;
-    // Most subjects (keyframes, parameters) never have observers: the lists
-    // are allocated with the first one.
+    enum ListKind { Ordinary, WithoutDelay };
+    // Most subjects (keyframes, parameters, attributes) never have observers:
+    // the lists are allocated with the first one.
     struct Lists {
         std::vector<Observer*> ordinary;
         std::vector<Observer*> withoutDelay;
+        std::vector<Observer*>& of(ListKind kind) { return kind == Ordinary ? ordinary : withoutDelay; }
     };
-    Lists& lists();
-    void tell(const std::vector<Observer*>& list, std::vector<Observer*>& told);
-    void tellOrdinaryObservers();
+    void add(ListKind kind, Observer* observer);
+    std::vector<Observer*> snapshot(ListKind kind) const;
+    bool stillIn(ListKind kind, Observer* observer) const;
+    void tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
+              bool dropFailures);
+    /// The ordinary observers at the end of a delay; one that throws does not
+    /// keep the others from hearing.
+    void tellHeldBackObservers();
 
-    std::unique_ptr<Lists> lists_;
+    std::atomic<Lists*> lists_{nullptr};
     std::atomic<int> disableCount_{0};
+    std::atomic<bool> parked_{false}; // held back by its project's delay; written under that delay's mutex
     Observable* owner_ = nullptr;
-    bool pendingInDelay_ = false; // guarded by the NotifyDelay registry mutex
     boost::weak_ptr<const ThreadSafe> token_;
 };
 

@@ -5,18 +5,11 @@
 namespace VelaMediaLib {
 
 /// A subject attached to and detached from on several threads (the command
-/// history, the edit rate): its own mutex guards list changes and walks.
+/// history, the edit rate). Every subject now guards its lists alike, so this
+/// is a plain subject under the name its users know.
 class SubjectWithMutex : public Subject {
 public:
     using Subject::Subject;
-
-protected:
-    std::unique_lock<std::recursive_mutex> lockLists() const override {
-        return std::unique_lock<std::recursive_mutex>(mutex_);
-    }
-
-private:
-    mutable std::recursive_mutex mutex_;
 };
 
 } // namespace VelaMediaLib

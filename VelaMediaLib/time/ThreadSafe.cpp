@@ -1,9 +1,9 @@
 #include <VelaMediaLib/time/ThreadSafe.h>
 
-#include <VelaMediaLib/time/NotifyDelay.h>
-
 namespace VelaMediaLib {
 
-ThreadSafe::~ThreadSafe() { NotifyDelay::removeMappingForThreadSafe(this); }
+// The delay state goes with the project; subjects still held back are not
+// touched, since they may be going away on other threads at the same time.
+ThreadSafe::~ThreadSafe() = default;
 
 } // namespace VelaMediaLib

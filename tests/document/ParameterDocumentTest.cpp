@@ -87,11 +87,18 @@ TEST(ParameterDocument, AnObjectParameterIsWrittenMemberByMemberInItsOrder) {
 
 TEST(ParameterDocument, ReadingKeyFramesFollowsItsSteps) {
     auto parameter = ParameterImpl<double>::create(project, "x", 0.0);
+    parameter->addKeyFrame(RationalTime(10), 10.0, RationalTime(4));
     parameter->readFromJSON(VelaMediaLib::testing::parseJson(R"({"keyframes": [
         {"time": 1, "duration": 2, "value": 4.0},
         {"endTime": "7/2", "value": 8.0, "interp": "esIn", "metadata": {"k": "v"}},
-        {"endTime": 3, "duration": 2, "value": 5.0}]})"));
-    EXPECT_EQ(*parameter->keyframeTimes(), (std::vector<RationalTime>{RationalTime(3), RationalTime(7, 2)}));
+        {"endTime": 3, "duration": 2, "value": 5.0},
+        {"endTime": 10, "duration": 1, "value": 11.0}]})"));
+    // The keyframes there were stay: entries at their times replace only the value.
+    EXPECT_EQ(*parameter->keyframeTimes(), (std::vector<RationalTime>{RationalTime(0), RationalTime(3),
+                                                                      RationalTime(7, 2), RationalTime(10)}));
+    EXPECT_EQ(parameter->valueAtTime(RationalTime(0)), 0.0);
+    EXPECT_EQ(parameter->keyframeAtTime(RationalTime(10))->value(), 11.0);
+    EXPECT_EQ(parameter->keyframeAtTime(RationalTime(10))->duration(), RationalTime(4));
     EXPECT_EQ(parameter->keyframeAtTime(RationalTime(3))->value(), 5.0); // the later entry replaced the value
     EXPECT_EQ(parameter->keyframeAtTime(RationalTime(3))->duration(), RationalTime(2));
     EXPECT_EQ(parameter->keyframeAtTime(RationalTime(7, 2))->interpolaterName(), "esIn");
@@ -134,6 +141,85 @@ TEST(ParameterDocument, AnAnimationTakesLeadInlessValuesWithoutNewKeyFrames) {
     EXPECT_EQ(parameter->valueAtTime(RationalTime(30)), 3.0);
     ASSERT_EQ(parameter->animations().size(), 1u);
     EXPECT_EQ(parameter->animations()[0].span, Range<RationalTime>(RationalTime(20), RationalTime(10)));
+
+    auto constant = AnimationParam<double>::create(project, "scale", 4.0);
+    constant->readFromJSON(
+        VelaMediaLib::testing::parseJson(R"({"keyframes": [{"endTime": 5, "duration": 0, "value": 3}]})"));
+    EXPECT_EQ(*constant->keyframeTimes(), std::vector<RationalTime>{RationalTime(0)});
+    EXPECT_EQ(constant->valueAtTime(RationalTime(0)), 3.0);
+    EXPECT_TRUE(constant->animations().empty());
+}
+
+// Asking for the identifier attribute or the metadata, sharing a clone's
+// setup and copying make storage that may stay empty: it does not count.
+TEST(ParameterDocument, AConstantParameterKeepsItsBareFormWhateverEmptyStorageItHas) {
+    auto asked = ParameterImpl<double>::create(project, "opacity", 1.0);
+    asked->identAttribute();
+    EXPECT_EQ(written(*asked, "opacity"), "\"opacity\" : 1.0");
+    asked->metaDataPtr();
+    EXPECT_EQ(written(*asked, "opacity"), "\"opacity\" : 1.0");
+    asked->metaDataPtr()->addMetaData("note", "x");
+    EXPECT_NE(written(*asked, "opacity"), "\"opacity\" : 1.0");
+    asked->metaDataPtr()->removeMetaData("note");
+    EXPECT_EQ(written(*asked->clone(), "opacity"), "\"opacity\" : 1.0");
+
+    auto target = ParameterImpl<double>::create(project, "opacity", 1.0);
+    ParameterImpl<double>::create(project, "opacity", 0.5)->setupSharedClone(target);
+    EXPECT_EQ(written(*target, "opacity"), "\"opacity\" : 1.0");
+    EXPECT_EQ(written(*target->clone(), "opacity"), "\"opacity\" : 1.0");
+}
+
+namespace {
+
+// Writes the parameter and reads it as a whole into a fresh one of its kind.
+template <typename Kind>
+boost::shared_ptr<Kind> readBack(const boost::shared_ptr<Kind>& parameter) {
+    const auto fresh = boost::static_pointer_cast<Kind>(parameter->clone());
+    fresh->setDefaultValue(typename Kind::ValueType()); // differs before reading
+    fresh->replaceFromJSON(member(*parameter));
+    return fresh;
+}
+
+} // namespace
+
+TEST(ParameterDocument, ReadingAWholeParameterGivesBackTheWrittenCurve) {
+    auto plain = ParameterImpl<double>::create(project, "x", 1.0);
+    plain->addKeyFrame(RationalTime(5), 2.0, RationalTime(0));
+    plain->addKeyFrame(RationalTime(10), 3.0, RationalTime(3));
+    plain->removeKeyFrame(RationalTime(0)); // no keyframe at 0 in the document
+    plain->keyframeAtTime(RationalTime(10))->addMetaData("k", "v");
+    EXPECT_TRUE(*readBack(plain) == *plain);
+    EXPECT_EQ(*readBack(plain)->keyframeTimes(),
+              (std::vector<RationalTime>{RationalTime(5), RationalTime(10)}));
+
+    auto animated = AnimationParam<double>::create(project, "scale", 1.0);
+    animated->addKeyFrame(RationalTime(30), 2.0, RationalTime(10));
+    animated->addKeyFrame(RationalTime(50), 0.5, RationalTime(5));
+    const auto portion = animated->copyPortion(Range<RationalTime>(RationalTime(25), RationalTime(20)));
+    EXPECT_TRUE(*readBack(animated) == *animated);
+    EXPECT_TRUE(*readBack(boost::static_pointer_cast<AnimationParam<double>>(portion)) == *portion);
+    EXPECT_EQ(readBack(animated)->animations().size(), 2u);
+
+    auto withMetadata = ParameterImpl<double>::create(project, "y", 1.0);
+    withMetadata->metaDataPtr()->addMetaData("a", "1");
+    auto stale = withMetadata->clone();
+    stale->metaDataPtr()->addMetaData("b", "2");
+    MetaDatable* kept = stale->metaDataPtr();
+    stale->replaceFromJSON(member(*withMetadata));
+    EXPECT_EQ(stale->generateMetaDataMap(), (std::map<std::string, std::string>{{"a", "1"}}));
+    EXPECT_EQ(stale->metaDataPtr(), kept); // the same metadata object, its entries replaced
+}
+
+// A keyframe without lead-in after the first would be read as a value for the
+// keyframe in force, so an animation refuses it.
+TEST(ParameterDocument, AnAnimationsLaterKeyFramesNeedALeadIn) {
+    auto animated = AnimationParam<double>::create(project, "scale", 1.0);
+    EXPECT_THROW(animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(0)), KeyFrameException);
+    EXPECT_THROW(animated->addKeyFrame(RationalTime(-10), 2.0, RationalTime(1)), KeyFrameException);
+    animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(4));
+    animated->addKeyFrame(RationalTime(0), 3.0, RationalTime(0)); // the first may have none
+    EXPECT_THROW(animated->changeKeyFrameLeadInLength(RationalTime(10), RationalTime(0)), KeyFrameException);
+    EXPECT_EQ(animated->numKeyFrames(), 2u);
 }
 
 namespace {

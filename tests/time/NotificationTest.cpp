@@ -118,6 +118,70 @@ TEST_F(Notification, ASubjectDestroyedWhileHeldBackIsForgotten) {
     EXPECT_EQ(observer.last, subject.get());
 }
 
+// Checking for an open delay and parking are one step: a subject is never
+// parked where no delay will deliver it.
+TEST_F(Notification, ASubjectIsHeldBackOnlyWhileADelayIsOpen) {
+    subject->attach(&observer);
+    EXPECT_FALSE(NotifyDelay::addSubject(subject.get(), project));
+    { NotifyDelay unrelated(project); }
+    EXPECT_EQ(observer.count, 0);
+    {
+        NotifyDelay delay(project);
+        EXPECT_TRUE(NotifyDelay::addSubject(subject.get(), project));
+        EXPECT_TRUE(NotifyDelay::addSubject(subject.get(), project)); // held back once
+    }
+    EXPECT_EQ(observer.count, 1);
+}
+
+TEST_F(Notification, AnObserverThatThrowsDuringDelayedDeliveryDoesNotSilenceTheOthers) {
+    struct Throwing : Observer {
+        void update(Observable*) override { throw VelaMediaLibException("observer failed"); }
+    } throwing;
+    subject->attach(&throwing);
+    subject->attach(&observer);
+    {
+        NotifyDelay delay(project);
+        subject->notify();
+    } // the failure is dropped: the edit has finished
+    EXPECT_EQ(observer.count, 1);
+    EXPECT_FALSE(NotifyDelay::isNotifying(project));
+    EXPECT_THROW(subject->notify(), VelaMediaLibException); // told at once, the caller hears of it
+    subject->detach(&throwing);
+}
+
+TEST_F(Notification, ObserversMayChangeTheListsFromInsideTheirUpdate) {
+    struct Rearranging : Observer {
+        Subject* subject = nullptr;
+        Observer* other = nullptr;
+        int count = 0;
+        void update(Observable*) override {
+            ++count;
+            subject->detach(this);
+            subject->attach(other);
+        }
+    } rearranging;
+    rearranging.subject = subject.get();
+    rearranging.other = &observer;
+    subject->attach(&rearranging);
+    subject->notify();
+    subject->notify();
+    EXPECT_EQ(rearranging.count, 1);
+    EXPECT_EQ(observer.count, 1); // attached during the first walk, told from the second on
+}
+
+TEST_F(Notification, AHeldBackNotificationMovesWithItsSubject) {
+    const auto other = boost::make_shared<ThreadSafe>();
+    subject->attach(&observer);
+    NotifyDelay delay(project);
+    subject->notify();
+    {
+        NotifyDelay otherDelay(other);
+        subject->setProjectMutex(other);
+        EXPECT_EQ(observer.count, 0);
+    }
+    EXPECT_EQ(observer.count, 1);
+}
+
 TEST_F(Notification, ASubjectOutlivingItsProjectStillNotifies) {
     subject->attach(&observer);
     project.reset();

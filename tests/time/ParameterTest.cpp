@@ -184,3 +184,64 @@ TEST_F(ParameterTest, KindsStepInterpolateAndDiffer) {
     diff->setIgnoreSource(true);
     EXPECT_EQ(diff->numKeyFrames(), 1u);
 }
+
+// No curve ever holds a lead-in reaching back before the previous keyframe.
+TEST_F(ParameterTest, MovesAndDifferencesKeepEveryLeadInWithinItsSegment) {
+    auto parameter = ramp();
+    parameter->addKeyFrame(RationalTime(20), 5.0, RationalTime(8)); // its transition starts at 12
+    const auto before = parameter->clone();
+    Counter observer;
+    parameter->attach(&observer);
+    EXPECT_THROW(
+        parameter->moveKeyframes(RationalTime(5), [](RationalTime t) { return t == RationalTime(10); }),
+        KeyFrameException);
+    EXPECT_TRUE(*parameter == *before);
+    EXPECT_EQ(parameter->keyframeAtTime(RationalTime(10))->endTime(), RationalTime(10));
+    EXPECT_EQ(observer.count, 0);
+    parameter->moveKeyframes(RationalTime(2), [](RationalTime t) { return t == RationalTime(10); });
+    EXPECT_EQ(observer.count, 1);
+    parameter->detach(&observer);
+
+    // A source keyframe arriving inside an edit's lead-in cuts that lead-in
+    // to start at it: the values stay, and the curve may stand as it is.
+    auto source = ramp();
+    auto diff = DiffParameter<double>::create(project, "diff", source);
+    diff->addKeyFrame(RationalTime(20), 0.0, RationalTime(8));
+    const double halfway = diff->valueAtTime(RationalTime(16));
+    source->addKeyFrame(RationalTime(15), 10.0, RationalTime(0));
+    EXPECT_EQ(diff->keyframeAtTime(RationalTime(20))->duration(), RationalTime(5));
+    EXPECT_EQ(diff->valueAtTime(RationalTime(16)), 8.0); // the transition now runs from 15
+    EXPECT_NE(diff->valueAtTime(RationalTime(16)), halfway);
+    EXPECT_NO_THROW(diff->changeKeyFrameLeadInLength(RationalTime(20), RationalTime(5)));
+}
+
+// Equal parameters hold the same keyframes through and through.
+TEST_F(ParameterTest, EqualityComparesWholeKeyFrames) {
+    auto a = ramp(), b = ramp();
+    EXPECT_TRUE(*a == *b);
+    b->keyframeAtTime(RationalTime(10))->addMetaData("note", "x");
+    EXPECT_FALSE(*a == *b);
+    b = ramp();
+    b->changeKeyFrameLeadInLength(RationalTime(10), RationalTime(2));
+    EXPECT_FALSE(*a == *b);
+    b = ramp();
+    b->keyframeAtTime(RationalTime(10))->setInterpolater(LinearInterpolater<double>::getInstance());
+    EXPECT_TRUE(*a == *b); // the same curve: linear is what the keyframe followed
+    b->keyframeAtTime(RationalTime(10))->setInterpolater(EaseInInterpolater<double>::getInstance());
+    EXPECT_FALSE(*a == *b);
+
+    typedef boost::shared_ptr<Interpolater<Point3d>> PointInterpolater;
+    auto curve = [&](const PointInterpolater& interpolater) {
+        auto parameter = ParameterImpl<Point3d>::create(project, "p", Point3d(0, 0, 0));
+        parameter->addKeyFrame(RationalTime(10), Point3d(10, 0, 0), RationalTime(0));
+        parameter->keyframeAtTime(RationalTime(10))->setInterpolater(interpolater);
+        return parameter;
+    };
+    const PointInterpolater bezier(new BezierInterpolater(Point3d(1, 2, 3), Point3d(4, 5, 6), "linr"));
+    EXPECT_TRUE(*curve(bezier) == *curve(PointInterpolater(
+                                      new BezierInterpolater(Point3d(1, 2, 3), Point3d(4, 5, 6), "linr"))));
+    EXPECT_FALSE(*curve(bezier) == *curve(PointInterpolater(
+                                       new BezierInterpolater(Point3d(1, 2, 3), Point3d(4, 5, 7), "linr"))));
+    EXPECT_FALSE(*curve(bezier) == *curve(PointInterpolater(
+                                       new BezierInterpolater(Point3d(1, 2, 3), Point3d(4, 5, 6), "esIn"))));
+}
