@@ -1,3 +1,5 @@
+#include "../TestDeadline.h"
+
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 #include <VelaMediaLib/model/InternalProject.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
@@ -13,6 +15,7 @@ using namespace VelaMediaLib;
 // reader's answers agree: two clips at a tick touch there, and values stay
 // within their curves.
 TEST(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
+    VelaMediaLib::testing::Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
     const auto mixer = project->newMixer("main");
     const auto track = project->timeline()->newTrack();

@@ -1,3 +1,5 @@
+#include "../TestDeadline.h"
+
 // Readers inside a snapshot take no write lock, and timeline walks never
 // meet a mixer half gone. Each test carries its own deadline.
 #include "MediaTestSupport.h"
@@ -22,6 +24,7 @@ const auto kDeadline = std::chrono::seconds(20);
 } // namespace
 
 TEST(MediaConcurrency, TheOlderEditorIsMadeInsideAReadersSnapshotWithoutTheWriteLock) {
+    VelaMediaLib::testing::Deadline watchdog;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const auto media = PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 100);
     std::mutex mutex;
@@ -58,6 +61,7 @@ TEST(MediaConcurrency, TheOlderEditorIsMadeInsideAReadersSnapshotWithoutTheWrite
 }
 
 TEST(MediaConcurrency, ThreadsMakingTheOlderEditorAtOnceShareOne) {
+    VelaMediaLib::testing::Deadline watchdog;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const auto media = PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 100);
     std::atomic<MediaEditor*> seen[2] = {{nullptr}, {nullptr}};
@@ -68,6 +72,7 @@ TEST(MediaConcurrency, ThreadsMakingTheOlderEditorAtOnceShareOne) {
 }
 
 TEST(TimelineConcurrency, WalksOverMixersSurviveMixersComingAndGoing) {
+    VelaMediaLib::testing::Deadline watchdog;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const TimelinePtr timeline = Timeline::create(project);
     const boost::weak_ptr<ProjectEditRate> noRate;

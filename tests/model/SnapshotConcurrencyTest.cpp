@@ -36,7 +36,7 @@ std::vector<Placed> placement(const Track& track) {
 // and metadata inside it must not let the editing thread in, while another
 // thread attaches and detaches observers on the same clips.
 TEST(SnapshotConcurrency, FirstUseInsideASnapshotKeepsItWhole) {
-    VelaMediaLib::testing::TestDeadline deadline("SnapshotConcurrency");
+    VelaMediaLib::testing::Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
     const auto track = project->timeline()->newTrack();
     project->timeline()->addTrack(project->newMixer("main"), track);

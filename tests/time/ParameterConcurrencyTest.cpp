@@ -1,3 +1,5 @@
+#include "../TestDeadline.h"
+
 #include <VelaMediaLib/time/InterpolatingParam.h>
 #include <VelaMediaLib/time/ThreadSafe.h>
 
@@ -12,6 +14,7 @@ using namespace VelaMediaLib;
 // Readers evaluate while one writer moves, changes, adds and removes
 // keyframes. Every value a reader sees lies between the curve's bounds.
 TEST(ParameterConcurrency, ReadersSeeWholeCurvesWhileAWriterEdits) {
+    VelaMediaLib::testing::Deadline deadline;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     auto parameter = InterpolatingParam<double>::create(project, "x", 0.0);
     parameter->addKeyFrame(RationalTime(100), 100.0, RationalTime(0));

@@ -1,3 +1,5 @@
+#include "../TestDeadline.h"
+
 #include <VelaMediaLib/time/ThreadSafe.h>
 
 #include <atomic>
@@ -11,6 +13,7 @@
 using namespace VelaMediaLib;
 
 TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
+    VelaMediaLib::testing::Deadline watchdog;
     ReadWriteMutex mutex;
     std::atomic<int> inside{0};
     // Each reader waits, holding the lock, until the other is inside too:
@@ -85,6 +88,7 @@ TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) { runMixedLoad(4
 TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElseBeyondTheOwnedSlots) { runMixedLoad(72, 200); }
 
 TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
+    VelaMediaLib::testing::Deadline watchdog;
     ReadWriteMutex mutex;
     {
         ScopedWriteLock write(mutex);
@@ -105,6 +109,7 @@ TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
 }
 
 TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
+    VelaMediaLib::testing::Deadline watchdog;
     ReadWriteMutex mutex;
     mutex.lockWrite();
     mutex.lockRead();
@@ -122,6 +127,7 @@ TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
 }
 
 TEST(ReadWriteMutexConcurrency, TokenLocksTakeNothingOnceTheProjectIsGone) {
+    VelaMediaLib::testing::Deadline watchdog;
     boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const boost::weak_ptr<const ThreadSafe> token = project;
     {

@@ -1,17 +1,12 @@
 #pragma once
-// Helpers for the time and document tests: a small parametric kind and a
+// Helpers for the time and document tests: a small parametric kind, and the
 // deadline for tests that run threads.
+
+#include "../TestDeadline.h"
 
 #include <VelaMediaLib/model/Attributable.h>
 #include <VelaMediaLib/model/Parametric.h>
 #include <VelaMediaLib/time/InterpolatingParam.h>
-
-#include <chrono>
-#include <condition_variable>
-#include <cstdio>
-#include <cstdlib>
-#include <mutex>
-#include <thread>
 
 namespace VelaMediaLib {
 namespace testing {
@@ -29,36 +24,6 @@ protected:
         return Parametric::createDefaultParameter(name);
     }
     std::vector<std::string> defaultParameterNames() const override { return {"level", "pan"}; }
-};
-
-/// Ends the test program when a test that runs threads has not finished in
-/// time, so that a deadlock fails the run instead of hanging it.
-class Deadline {
-public:
-    explicit Deadline(std::chrono::seconds limit)
-        : watcher_([this, limit] {
-              std::unique_lock<std::mutex> lock(mutex_);
-              if (!finished_.wait_for(lock, limit, [this] { return done_; })) {
-                  std::fprintf(stderr, "the test passed its deadline\n");
-                  std::abort();
-              }
-          }) {}
-    ~Deadline() {
-        {
-            std::lock_guard<std::mutex> lock(mutex_);
-            done_ = true;
-        }
-        finished_.notify_all();
-        watcher_.join();
-    }
-    Deadline(const Deadline&) = delete;
-    Deadline& operator=(const Deadline&) = delete;
-
-private:
-    std::mutex mutex_;
-    std::condition_variable finished_;
-    bool done_ = false;
-    std::thread watcher_;
 };
 
 } // namespace testing
