@@ -337,8 +337,8 @@ TEST_F(MediaTiming, ExtendingTheEndNeverPlaysPastTheMedia) {
     auto rounded = clip(timing(0, 8, 1, SafeRational(45, 2), SafeRational(1, 3), 0, 30));
     EXPECT_EQ(rounded->trimEndLimit(), -2);
     EXPECT_FALSE(rounded->validTrimEnd(-2));
-    expectRefused<InvalidTrimRangeException>(*rounded, [&] { rounded->trimEnd(-2); },
-                                             "invalid media trim end offset");
+    expectRefused<InvalidTrimRangeException>(
+        *rounded, [&] { rounded->trimEnd(-2); }, "invalid media trim end offset");
     rounded->trimEnd(-1);
     EXPECT_LE(rounded->state().mediaEnd(), SafeRational(30));
 }

@@ -1,3 +1,5 @@
+#include "../TestDeadline.h"
+
 // Membership (a clip on one track, a track in one mixer, a mixer on one
 // timeline) and the path of a placed clip's edits through its track.
 #include "MediaTestSupport.h"
@@ -163,6 +165,7 @@ TEST_F(TrackEditPath, MapIteratorsWalkTheTrackUnderTheCallersLock) {
 }
 
 TEST(TrackConcurrency, EditsRacingForTheSameGapNeverOverlap) {
+    VelaMediaLib::testing::Deadline watchdog;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const auto track = GenericTrack::create(project);
     const boost::weak_ptr<ProjectEditRate> noRate;
