@@ -13,14 +13,15 @@ SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp
 deps:
 	@scripts/install-deps
 
-build/build.ninja: deps
+# Configured once; after that Ninja re-runs CMake itself when a CMakeLists changes.
+build/build.ninja: | deps
 	$(CONFIGURE)=Debug -B build $(CMAKE_FLAGS)
 
-demo: deps build/build.ninja
+demo: build/build.ninja
 	cmake --build build --target vela-demo -j $(JOBS)
 	./build/examples/vela-demo
 
-test: deps build/build.ninja
+test: build/build.ninja
 	cmake --build build -j $(JOBS)
 	ctest --test-dir build --output-on-failure -j $(JOBS)
 
@@ -47,10 +48,13 @@ format-check: deps
 	clang-format --dry-run --Werror $(SOURCES)
 
 # Installs into a scratch prefix and builds a small program against the package config.
-install-check: deps build/build.ninja
+install-check: build/build.ninja
 	cmake --build build -j $(JOBS)
 	rm -rf build/prefix build/consumer
 	cmake --install build --prefix $(CURDIR)/build/prefix > /dev/null
 	cmake -G Ninja -S tests/install -B build/consumer -DCMAKE_PREFIX_PATH=$(CURDIR)/build/prefix
 	cmake --build build/consumer
 	./build/consumer/vela-consumer
+	PKG_CONFIG_PATH=$(CURDIR)/build/prefix/lib/pkgconfig $(CXX) tests/install/main.cpp -o build/consumer/vela-consumer-pc \
+	  $$(PKG_CONFIG_PATH=$(CURDIR)/build/prefix/lib/pkgconfig pkg-config --cflags --libs velamedialib) -Wl,-rpath,$(CURDIR)/build/prefix/lib
+	./build/consumer/vela-consumer-pc
