@@ -7,12 +7,25 @@
 
 namespace VelaMediaLib {
 
+namespace {
+
+// A static clip's media follows its track length; a clip given bounded
+// limits still may not play past them.
+bool staysWithinMedia(const MediaState& state, VelaTime duration) {
+    return state.maxUnbounded() ||
+           state.mediaStart + SafeRational(duration) / state.scalar <= state.maxMediaEnd;
+}
+
+} // namespace
+
 bool RationalStaticEditor::validTrimStart(const MediaState& state, VelaTime offset) const {
-    return state.duration - offset - minimumTrackDuration() > 0;
+    return state.duration - offset - minimumTrackDuration() > 0 &&
+           staysWithinMedia(state, state.duration - offset);
 }
 
 bool RationalStaticEditor::validTrimEnd(const MediaState& state, VelaTime offset) const {
-    return state.duration - offset - minimumTrackDuration() > 0;
+    return state.duration - offset - minimumTrackDuration() > 0 &&
+           staysWithinMedia(state, state.duration - offset);
 }
 
 MediaState RationalStaticEditor::trimStart(const MediaState& state, VelaTime offset) const {

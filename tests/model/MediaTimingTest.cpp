@@ -256,9 +256,11 @@ TEST_F(MediaTiming, SeededEditsKeepTheDurationRuleAndRestoreExactly) {
                 case 2:
                     media->move(amount);
                     break;
-                default:
-                    media->rationalStretch(SafeRational(1 + random() % 5, 1 + random() % 5));
+                default: {
+                    const long long numerator = 1 + random() % 5; // drawn in a fixed order
+                    media->rationalStretch(SafeRational(numerator, 1 + random() % 5));
                     break;
+                }
                 }
             } catch (const VelaMediaLibException&) {
                 EXPECT_TRUE(media->state() == before) << "a refused edit changed the clip";
@@ -266,6 +268,8 @@ TEST_F(MediaTiming, SeededEditsKeepTheDurationRuleAndRestoreExactly) {
             const MediaState now = media->state();
             ASSERT_EQ(now.duration, RationalMediaEditor::durationFor(now.mediaDuration, now.scalar))
                 << "step " << step;
+            ASSERT_TRUE(now.mediaStart >= now.minMediaStart && now.mediaEnd() <= now.maxMediaEnd)
+                << "step " << step << " of editor " << kind << " plays outside its media";
             history.push_back(now);
         }
         for (auto state = history.rbegin(); state != history.rend(); ++state) {
