@@ -8,7 +8,7 @@ endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
 SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
-.PHONY: deps demo test bench sanitize tsan format format-check install-check
+.PHONY: deps demo test bench sanitize tsan clang format format-check install-check
 
 deps:
 	@scripts/install-deps
@@ -40,6 +40,14 @@ tsan: deps
 	$(CONFIGURE)=RelWithDebInfo -B build-tsan -DVELA_SANITIZE=thread -DVELA_BUILD_BENCH=OFF -DVELA_BUILD_EXAMPLES=OFF $(CMAKE_FLAGS)
 	cmake --build build-tsan -j $(JOBS)
 	TSAN_OPTIONS=halt_on_error=1 ctest --test-dir build-tsan -R Concurrency --output-on-failure -j $(JOBS)
+
+# The whole suite built with Clang as well, in a tree of its own, with the
+# portable 128-bit arithmetic that compilers without __int128 get.
+clang: deps
+	CXX=clang++ $(CONFIGURE)=Debug -B build-clang -DVELA_BUILD_BENCH=OFF -DVELA_BUILD_EXAMPLES=OFF \
+	  -DCMAKE_CXX_FLAGS=-DVELA_PORTABLE_INT128 $(CMAKE_FLAGS)
+	cmake --build build-clang -j $(JOBS)
+	ctest --test-dir build-clang --output-on-failure -j $(JOBS)
 
 format:
 	clang-format -i $(SOURCES)

@@ -2,10 +2,9 @@
 
 #include <VelaMediaLib/time/ThreadSafe.h>
 #include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/time/detail/Portable.h>
 
 #include <thread>
-
-#define VELA_TLS __attribute__((tls_model("initial-exec")))
 
 namespace VelaMediaLib {
 namespace {
@@ -32,14 +31,14 @@ int claimSlot() {
     (void)releaser;
     unsigned long long used = slotPool.load(std::memory_order_relaxed);
     while (~used != 0) {
-        const int index = __builtin_ctzll(~used);
+        const int index = detail::lowestSetBit(~used);
         if (slotPool.compare_exchange_weak(used, used | (1ULL << index), std::memory_order_acquire))
             return slotOfThread = index;
     }
     return slotOfThread = kSharedSlot;
 }
 
-inline int threadSlot() { return __builtin_expect(slotOfThread >= 0, 1) ? slotOfThread : claimSlot(); }
+inline int threadSlot() { return VELA_LIKELY(slotOfThread >= 0) ? slotOfThread : claimSlot(); }
 inline const void* self() { return &threadMarker; }
 
 // Read depths of the threads on the shared slot, which cannot keep them in it.
@@ -71,7 +70,7 @@ void dropIfFree(Held* entry) {
 class Backoff {
 public:
     void pause() {
-        for (int i = 0; i < spins_; ++i) __builtin_ia32_pause();
+        for (int i = 0; i < spins_; ++i) detail::cpuRelax();
         if (spins_ < 64)
             spins_ *= 2;
         else

@@ -1,5 +1,7 @@
 #include <VelaMediaLib/time/SafeRational.h>
 
+#include <VelaMediaLib/time/detail/Int128.h>
+
 #include <boost/integer/common_factor_rt.hpp>
 #include <cmath>
 #include <cstdio>
@@ -13,7 +15,7 @@ namespace VelaMediaLib {
 namespace {
 
 // 128-bit intermediates keep products of two 64-bit values exact.
-__extension__ typedef __int128 Int128;
+using detail::Int128;
 typedef unsigned long long Bits;
 
 // Plain wrapping 64-bit arithmetic, as the unchecked formulas need, without

@@ -1,6 +1,7 @@
 #include <VelaMediaLib/time/ScaledTime.h>
 
 #include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/time/detail/Int128.h>
 
 #include <ostream>
 
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 namespace {
 
 // 128-bit intermediates keep products of two 64-bit values exact.
-__extension__ typedef __int128 Int128;
+using detail::Int128;
 long long magnitude(long long t) { return t < 0 ? -t : t; }
 long long withSign(long long value, long long signSource) { return signSource < 0 ? -value : value; }
 
