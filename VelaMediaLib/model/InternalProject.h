@@ -49,6 +49,7 @@ public:
     }
     void detach(Observer* observer) override { subject_.detach(observer); }
     void notify() override { subject_.notify(); }
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     // Settings, timeline, clipboard
     void setUndoLimit(int limit) override { history_->setUndoLimit(limit); }

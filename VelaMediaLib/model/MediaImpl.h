@@ -19,6 +19,7 @@ public:
     MediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
               const MediaState& initial, EditorKind editor);
     ~MediaImpl() override;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     // Placement
     VelaTime startTime() const override;

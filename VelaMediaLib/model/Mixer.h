@@ -22,6 +22,7 @@ public:
     explicit Mixer(const boost::weak_ptr<const ThreadSafe>& token)
         : SubTimeline(token), SubTimelineParts(token), addObservers_(token) {}
     ~Mixer() override;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     // Tracks
     TrackPtr trackAtIndex(unsigned index) const;

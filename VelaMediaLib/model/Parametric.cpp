@@ -83,22 +83,34 @@ void Parametric::toJSONParameterList(JSONWriter& writer) const {
     }
 }
 
-// Every member is read into a new parameter first (the kind of the one made,
-// or of the declared default), so a failure leaves the object as it was; the
-// new parameters go in together under one write lock.
+// Every member is read into a copy first (of the kind of the parameter made,
+// or of the declared default), so a failure leaves the object as it was. Under
+// one write lock each parameter made by then takes its copy's state, staying
+// the same object for whoever holds or observes it; the copies of parameters
+// not yet made go in themselves. Observers hear after the lock.
 void Parametric::readParameterList(const Json::Value& parameters) {
     if (!parameters.isObject()) return;
     NamedParameters read;
     for (const std::string& name : parameters.getMemberNames()) {
         const boost::shared_ptr<ParameterInterface> made = madeParameter(name);
-        const boost::shared_ptr<ParameterInterface> fresh =
-            made ? made->cloneParameter() : createDefaultParameter(name);
-        if (!fresh) continue; // a name this object does not have
-        fresh->replaceFromJSON(parameters[name]);
-        read.emplace_back(name, fresh);
+        const boost::shared_ptr<ParameterInterface> kind = made ? made : createDefaultParameter(name);
+        if (!kind) continue; // a name this object does not have
+        read.emplace_back(name, kind->readCopyFromJSON(parameters[name]));
     }
-    ScopedWriteLock lock(parametersToken_);
-    for (const auto& entry : read) parameters_.set(entry.first, entry.second);
+    if (read.empty()) return;
+    std::vector<boost::shared_ptr<ParameterInterface>> changed;
+    {
+        ScopedWriteLock lock(parametersToken_);
+        for (const auto& entry : read) {
+            const boost::shared_ptr<ParameterInterface> existing = parameters_.find(entry.first);
+            if (existing && existing->takeStateOf(*entry.second))
+                changed.push_back(existing);
+            else
+                parameters_.set(entry.first, entry.second); // not made, or replaced by another kind meanwhile
+        }
+    }
+    for (const auto& parameter : changed) parameter->notify();
+    if (Observable* owner = dynamic_cast<Observable*>(this)) owner->notify();
 }
 
 void Parametric::cloneParametersInto(Parametric& other) const {

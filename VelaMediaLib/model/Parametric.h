@@ -48,10 +48,12 @@ public:
     /// Writes the "parameters" member: every parameter made (those not made
     /// hold their defaults, which reading gives back).
     void toJSONParameterList(JSONWriter& writer) const;
-    /// Reads a document's "parameters" object: each member becomes the
-    /// parameter of its name, built from no keyframes (so what was written
-    /// reads back equal) and put in place of the one the object had. All or
-    /// nothing: a member that fails to read leaves every parameter as it was.
+    /// Reads a document's "parameters" object: each member becomes the value
+    /// of the parameter of its name, built from no keyframes (so what was
+    /// written reads back equal). A parameter already made takes the value
+    /// read and stays the same object; it and the object (when observable)
+    /// notify. All or nothing: a member that fails to read leaves every
+    /// parameter as it was.
     void readParameterList(const Json::Value& parameters);
 
     SafeRational timeScale() const override { return SafeRational(1); }

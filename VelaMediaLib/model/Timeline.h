@@ -38,6 +38,7 @@ public:
                                               int width = 1920, int height = 1080);
     ~Timeline() override;
     using SubProject::projectMutex;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     // Mixers
     MixerPtr mixer(const std::string& name) const;

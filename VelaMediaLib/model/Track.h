@@ -49,6 +49,7 @@ public:
 
     explicit Track(const boost::weak_ptr<const ThreadSafe>& token);
     ~Track() override;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     static const char* isLockedMetaDataKey() { return "isLocked"; }
 

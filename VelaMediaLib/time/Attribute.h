@@ -4,15 +4,19 @@
 #include <VelaMediaLib/time/ReadWriteMutex.h>
 #include <VelaMediaLib/time/Subject.h>
 
+#include <boost/enable_shared_from_this.hpp>
 #include <boost/shared_ptr.hpp>
 #include <string>
 
 namespace VelaMediaLib {
 
-/// The type-independent face of an attribute: its name and its value as document text.
-class AttributeInterface : public Subject {
+/// The type-independent face of an attribute: its name and its value as
+/// document text. Attributes are held by shared pointer; that pointer is
+/// their lifeline.
+class AttributeInterface : public Subject, public boost::enable_shared_from_this<AttributeInterface> {
 public:
     using Subject::Subject;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
     virtual const std::string& name() const = 0;
     virtual void writeValue(std::ostream& out) const = 0;
     /// A new attribute with the same name and value, for another object.

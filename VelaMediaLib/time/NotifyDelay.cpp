@@ -33,9 +33,12 @@ NotifyDelay::~NotifyDelay() {
 // Takes the waiting subjects one at a time, so that a subject destroyed by an
 // observer during delivery is simply no longer there. The project's read lock
 // is held from taking a subject to the end of its delivery, so a subject
-// released under the write lock is never caught in between.
+// released under the write lock is never caught in between. The lifeline is
+// locked under the state's mutex, where a destructor removing its subject
+// would wait; it is let go after the read lock, since the owner may end then.
 bool NotifyDelay::deliverNext() {
     NotifyDelayState& s = stateOf(*token_);
+    boost::shared_ptr<const void> keep;
     ScopedReadLock read(token_->mutex());
     Subject* next = nullptr;
     {
@@ -44,18 +47,24 @@ bool NotifyDelay::deliverNext() {
             s.count_ = 0;
             return false;
         }
-        next = s.waiting_.front();
+        const NotifyDelayState::Waiting waiting = s.waiting_.front();
         s.waiting_.pop_front();
+        if (waiting.kept && !(keep = waiting.lifeline.lock())) return true; // its owner is being destroyed
+        next = waiting.subject;
         s.delivering_ = next;
     }
+    bool stillHere = true;
     try {
-        next->tellHeldBackObservers();
+        stillHere = next->tellHeldBackObservers([&] {
+            std::lock_guard<std::mutex> lock(s.mutex_);
+            return s.delivering_ == next;
+        });
     } catch (...) {
         // Nothing to report to: the edit has finished (observers' own failures are dropped inside).
     }
     {
         std::lock_guard<std::mutex> lock(s.mutex_);
-        if (s.delivering_ == next) next->parked_ = false; // else one of its observers destroyed it
+        if (stillHere && s.delivering_ == next) next->parked_ = false; // else an observer destroyed it
         s.delivering_ = nullptr;
     }
     s.delivered_.notify_all();
@@ -82,7 +91,9 @@ bool NotifyDelay::addSubject(Subject* subject, const boost::shared_ptr<const Thr
     std::lock_guard<std::mutex> lock(s.mutex_);
     if (s.count_ <= 0) return false;
     if (!subject->parked_.load(std::memory_order_relaxed)) {
-        s.waiting_.push_back(subject);
+        boost::weak_ptr<const void> lifeline = subject->lifeline();
+        const bool kept = !lifeline.expired();
+        s.waiting_.push_back({subject, std::move(lifeline), kept});
         subject->parked_.store(true, std::memory_order_relaxed);
     }
     return true;
@@ -98,7 +109,9 @@ void NotifyDelay::removeSubject(Subject* subject, const boost::shared_ptr<const 
         else
             s.delivered_.wait(lock, [&] { return s.delivering_ != subject; });
     }
-    s.waiting_.erase(std::remove(s.waiting_.begin(), s.waiting_.end(), subject), s.waiting_.end());
+    s.waiting_.erase(std::remove_if(s.waiting_.begin(), s.waiting_.end(),
+                                    [&](const NotifyDelayState::Waiting& w) { return w.subject == subject; }),
+                     s.waiting_.end());
     subject->parked_.store(false, std::memory_order_relaxed);
 }
 
@@ -108,7 +121,8 @@ void NotifyDelay::removeMappingForThreadSafe(const ThreadSafe* token) {
     if (!token) return;
     NotifyDelayState& s = stateOf(*token);
     std::lock_guard<std::mutex> lock(s.mutex_);
-    for (Subject* subject : s.waiting_) subject->parked_.store(false, std::memory_order_relaxed);
+    for (const NotifyDelayState::Waiting& waiting : s.waiting_)
+        waiting.subject->parked_.store(false, std::memory_order_relaxed);
     s.waiting_.clear();
 }
 

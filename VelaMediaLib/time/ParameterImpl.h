@@ -28,6 +28,7 @@
 #include <set>
 #include <sstream>
 #include <type_traits>
+#include <typeinfo>
 
 namespace VelaMediaLib {
 
@@ -138,6 +139,10 @@ public:
                 const std::string& typeName = std::string()) const override;
     void readFromJSON(const Json::Value& value) override;
     void replaceFromJSON(const Json::Value& value) override;
+    boost::shared_ptr<ParameterInterface> readCopyFromJSON(const Json::Value& value) const override {
+        return readScratch(value, true);
+    }
+    bool takeStateOf(ParameterInterface& copy) override;
     /// Names of parameters that are always written as objects, never bare.
     static std::set<std::string>& namesWrittenInFull() {
         static std::set<std::string> names;
@@ -205,6 +210,9 @@ protected:
     /// Empties a scratch copy's curve and metadata before a whole parameter
     /// is read into it; kinds with a curve of their own empty theirs too.
     virtual void clearForReading();
+    /// A copy of this parameter that has read the document value, from no
+    /// keyframes or from this parameter's curve.
+    boost::shared_ptr<ParameterImpl> readScratch(const Json::Value& json, bool fromNoKeyFrames) const;
     void readDocument(const Json::Value& json, bool fromNoKeyFrames);
     void readInto(const Json::Value& json);
     /// Whether the parameter is written as its bare value: it is written under

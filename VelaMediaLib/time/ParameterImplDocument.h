@@ -91,11 +91,29 @@ void ParameterImpl<T>::replaceFromJSON(const Json::Value& json) {
 }
 
 template <typename T>
-void ParameterImpl<T>::readDocument(const Json::Value& json, bool fromNoKeyFrames) {
+boost::shared_ptr<ParameterImpl<T>> ParameterImpl<T>::readScratch(const Json::Value& json,
+                                                                  bool fromNoKeyFrames) const {
     const boost::shared_ptr<ParameterImpl> scratch = cloneImpl();
     if (fromNoKeyFrames) scratch->clearForReading();
     scratch->readInto(json);
+    return scratch;
+}
+
+template <typename T>
+void ParameterImpl<T>::readDocument(const Json::Value& json, bool fromNoKeyFrames) {
+    const boost::shared_ptr<ParameterImpl> scratch = readScratch(json, fromNoKeyFrames);
     edit([&] { takeStateFrom(*scratch); });
+}
+
+// Kinds with state of their own read it into copies of their own kind, so a
+// copy of the same dynamic type is one whose state this kind can take.
+template <typename T>
+bool ParameterImpl<T>::takeStateOf(ParameterInterface& copy) {
+    if (typeid(copy) != typeid(*this)) return false;
+    ScopedWriteLock lock(this->projectMutex());
+    takeStateFrom(static_cast<ParameterImpl&>(copy));
+    keyframesEdited();
+    return true;
 }
 
 template <typename T>

@@ -7,6 +7,7 @@
 #include <VelaMediaLib/time/Subject.h>
 #include <VelaMediaLib/time/TimeScalable.h>
 
+#include <boost/enable_shared_from_this.hpp>
 #include <functional>
 #include <json/value.h>
 #include <map>
@@ -19,10 +20,12 @@ class XMLOptions;
 /// The type-independent face of a keyframed parameter, through which
 /// documents, commands and dispatchers handle parameters of any value type.
 /// Queries take the project's read lock, edits its write lock; observers are
-/// told after each edit that changed something.
-class ParameterInterface : public Subject {
+/// told after each edit that changed something. Parameters are held by shared
+/// pointer; that pointer is their lifeline.
+class ParameterInterface : public Subject, public boost::enable_shared_from_this<ParameterInterface> {
 public:
     explicit ParameterInterface(const boost::weak_ptr<const ThreadSafe>& token) : Subject(token) {}
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     virtual std::string identifier() const = 0;
     virtual boost::shared_ptr<Attribute<std::string>> identAttribute() = 0;
@@ -82,6 +85,15 @@ public:
     /// into a curve without keyframes, so a parameter reads back what this
     /// library wrote of it. All or nothing.
     virtual void replaceFromJSON(const Json::Value& value) = 0;
+    /// A new parameter of this kind that has read the document value as
+    /// replaceFromJSON would; this parameter does not change. Throws as the
+    /// reading does.
+    virtual boost::shared_ptr<ParameterInterface> readCopyFromJSON(const Json::Value& value) const = 0;
+    /// Takes over what such a copy holds, staying the same object (so whoever
+    /// holds or observes it keeps it). Runs under the write lock and tells
+    /// nobody: the caller notifies. Returns false, changing nothing, when the
+    /// copy is of another kind.
+    virtual bool takeStateOf(ParameterInterface& copy) = 0;
 
     /// The parameter's own metadata (made on first use, taking the read lock only).
     virtual MetaDatable* metaDataPtr() = 0;

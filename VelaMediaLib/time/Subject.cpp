@@ -96,13 +96,15 @@ bool Subject::stillIn(ListKind kind, Observer* observer) const {
     return lists && contains(lists->of(kind), observer);
 }
 
-// Skips observers detached meanwhile and observers already told in this notification.
-void Subject::tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
-                   bool dropFailures) {
+// Skips observers detached meanwhile and observers already told in this
+// notification. Once an observer has destroyed the subject, nothing of it is
+// touched any more.
+bool Subject::tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
+                   const StillHere* stillHere) {
     for (Observer* observer : observers) {
         if (contains(told, observer) || !stillIn(kind, observer)) continue;
         told.push_back(observer);
-        if (!dropFailures) {
+        if (!stillHere) {
             observer->update(owner());
             continue;
         }
@@ -111,26 +113,32 @@ void Subject::tell(ListKind kind, const std::vector<Observer*>& observers, std::
         } catch (...) {
             // Delayed delivery has no caller to hand this to; the others still hear.
         }
+        if (!(*stillHere)()) return false;
     }
+    return true;
 }
 
 void Subject::notify() {
     ScopedReadLock lock(token_);
     if (!notifiesEnabled() || !lists_.load(std::memory_order_acquire)) return;
     std::vector<Observer*> told;
-    tell(WithoutDelay, snapshot(WithoutDelay), told, false);
+    tell(WithoutDelay, snapshot(WithoutDelay), told, nullptr);
     const std::vector<Observer*> ordinary = snapshot(Ordinary);
     if (ordinary.empty()) return;
     const boost::shared_ptr<const ThreadSafe> token = token_.lock();
     if (token && NotifyDelay::addSubject(this, token)) return;
-    tell(Ordinary, ordinary, told, false);
+    tell(Ordinary, ordinary, told, nullptr);
 }
 
-void Subject::tellHeldBackObservers() {
+bool Subject::tellHeldBackObservers(const StillHere& stillHere) {
     ScopedReadLock lock(token_);
-    if (!notifiesEnabled() || !lists_.load(std::memory_order_acquire)) return;
+    if (!notifiesEnabled() || !lists_.load(std::memory_order_acquire)) return true;
     std::vector<Observer*> told;
-    tell(Ordinary, snapshot(Ordinary), told, true);
+    return tell(Ordinary, snapshot(Ordinary), told, &stillHere);
+}
+
+boost::weak_ptr<const void> Subject::lifeline() const {
+    return owner_ && owner_ != this ? owner_->lifeline() : Observable::lifeline();
 }
 
 Subject::NotifyDisabler::NotifyDisabler(Subject& subject) : subject_(subject) { ++subject_.disableCount_; }

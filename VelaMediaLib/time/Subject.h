@@ -4,6 +4,7 @@
 
 #include <atomic>
 #include <boost/weak_ptr.hpp>
+#include <functional>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -22,6 +23,14 @@ class NotifyDelay;
 /// called under that mutex: a walk tells a snapshot and skips observers
 /// detached meanwhile. Notifications run under the project's read lock, so an
 /// observer detached under the write lock is certain not to be called any more.
+///
+/// A notification held back by a NotifyDelay is delivered holding the
+/// subject's lifeline (its owner's, when it has one), so neither the owner nor
+/// the subject can be destroyed during that delivery. A subject without a
+/// lifeline that another thread destroys meanwhile waits in its destructor for
+/// the delivery to end (by then the parts of any object it belongs to are
+/// gone: such objects give a lifeline); one destroyed by its own observer
+/// ends its delivery.
 class Subject : public Observable {
 public:
     explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
@@ -55,12 +64,22 @@ public:
     /// observer of several objects can tell them apart.
     void setOwner(Observable* owner) { owner_ = owner; }
     Observable* owner() { return owner_ ? owner_ : this; }
+    /// The owner's lifeline, or none.
+    boost::weak_ptr<const void> lifeline() const override;
 
     const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
     /// Set before the subject is shared with other threads. A notification
     /// the old project's delay holds back moves to the new project (held back
     /// by its delay, or told at once).
     void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
+
+protected:
+    /// Whether the subject still exists, asked after each observer of a
+    /// delayed delivery (an observer may destroy the subject).
+    typedef std::function<bool()> StillHere;
+    /// The ordinary observers at the end of a delay; one that throws does not
+    /// keep the others from hearing. Returns whether the subject is still here.
+    virtual bool tellHeldBackObservers(const StillHere& stillHere);
 
 private:
     friend class NotifyDelay;
@@ -75,11 +94,10 @@ private:
     void add(ListKind kind, Observer* observer);
     std::vector<Observer*> snapshot(ListKind kind) const;
     bool stillIn(ListKind kind, Observer* observer) const;
-    void tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
-              bool dropFailures);
-    /// The ordinary observers at the end of a delay; one that throws does not
-    /// keep the others from hearing.
-    void tellHeldBackObservers();
+    /// Without `stillHere` failures go to the caller; with it (delayed
+    /// delivery) they are dropped. Returns whether the subject is still here.
+    bool tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
+              const StillHere* stillHere);
 
     std::atomic<Lists*> lists_{nullptr};
     std::atomic<int> disableCount_{0};

@@ -1,9 +1,12 @@
 #include "TimeTestSupport.h"
 
+#include <VelaMediaLib/time/Attribute.h>
 #include <VelaMediaLib/time/NotifyDelay.h>
+#include <VelaMediaLib/time/SubjectWithMutex.h>
 #include <VelaMediaLib/time/ThreadSafe.h>
 
 #include <atomic>
+#include <chrono>
 #include <functional>
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
@@ -104,4 +107,114 @@ TEST(NotificationConcurrency, ASubjectDestroyedWhileAnotherThreadDeliversItWaits
     }
     destroyer.join();
     EXPECT_FALSE(destroyedDuringDelivery);
+}
+
+namespace {
+
+/// Waits until the flag is set or the time is up; says whether it was set.
+bool waitFor(const std::atomic<bool>& flag, std::chrono::milliseconds limit) {
+    const auto until = std::chrono::steady_clock::now() + limit;
+    while (!flag.load() && std::chrono::steady_clock::now() < until) std::this_thread::yield();
+    return flag.load();
+}
+
+struct BlockingObserver : Observer {
+    std::function<void(Observable*)> body;
+    void update(Observable* changed) override { body(changed); }
+};
+
+} // namespace
+
+// Another thread lets go of the last reference to an attribute while its
+// held-back notification is delivered: the attribute lives, whole, until its
+// observers have heard, and goes afterwards.
+TEST(NotificationConcurrency, AnAttributeLetGoOfDuringItsDeliveryLivesUntilItsObserversHaveHeard) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    boost::shared_ptr<Attribute<std::string>> attribute(new Attribute<std::string>("name", "a", project));
+    const boost::weak_ptr<Attribute<std::string>> watched = attribute;
+    std::atomic<bool> delivering{false}, letGo{false};
+    bool letGoDuringDelivery = false;
+    std::string seen;
+    BlockingObserver reader;
+    reader.body = [&](Observable* changed) {
+        delivering = true;
+        letGoDuringDelivery = waitFor(letGo, std::chrono::seconds(5));
+        if (letGoDuringDelivery) seen = dynamic_cast<Attribute<std::string>&>(*changed).value();
+    };
+    attribute->attach(&reader);
+    std::thread host([&] {
+        waitFor(delivering, std::chrono::seconds(30));
+        attribute.reset();
+        letGo = true;
+    });
+    {
+        NotifyDelay delay(project);
+        attribute->setValue("b");
+    }
+    host.join();
+    EXPECT_TRUE(letGoDuringDelivery) << "letting go waited for the delivery";
+    EXPECT_EQ(seen, "b");
+    EXPECT_TRUE(watched.expired());
+}
+
+// A SubjectWithMutex holds its own mutex around its walks: once detach has
+// returned on another thread, the observer has finished, whether it was told
+// at once or at the end of a delay.
+TEST(NotificationConcurrency, SubjectWithMutexDetachReturnsOnlyOnceTheObserverHasFinished) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    for (const bool delayed : {false, true}) {
+        SubjectWithMutex subject(delayed ? boost::weak_ptr<const ThreadSafe>(project)
+                                         : boost::weak_ptr<const ThreadSafe>());
+        std::atomic<bool> entered{false}, detached{false};
+        bool detachedWhileRunning = true;
+        BlockingObserver slow;
+        slow.body = [&](Observable*) {
+            entered = true;
+            detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
+        };
+        subject.attach(&slow);
+        std::thread notifier([&] {
+            if (!delayed) return subject.notify();
+            NotifyDelay delay(project);
+            subject.notify();
+        });
+        waitFor(entered, std::chrono::seconds(30));
+        subject.detach(&slow);
+        detached = true;
+        notifier.join();
+        EXPECT_FALSE(detachedWhileRunning) << (delayed ? "delayed" : "at once");
+    }
+}
+
+// Project subjects notify under the project's read lock, so detaching under
+// its write lock waits for a notification running on another thread.
+TEST(NotificationConcurrency, DetachUnderTheWriteLockWaitsForARunningNotification) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    for (const bool delayed : {false, true}) {
+        Subject subject(project);
+        std::atomic<bool> entered{false}, detached{false};
+        bool detachedWhileRunning = true;
+        BlockingObserver slow;
+        slow.body = [&](Observable*) {
+            entered = true;
+            detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
+        };
+        subject.attach(&slow);
+        std::thread notifier([&] {
+            if (!delayed) return subject.notify();
+            NotifyDelay delay(project);
+            subject.notify();
+        });
+        waitFor(entered, std::chrono::seconds(30));
+        {
+            ScopedWriteLock lock(project);
+            subject.detach(&slow);
+        }
+        detached = true;
+        notifier.join();
+        EXPECT_FALSE(detachedWhileRunning) << (delayed ? "delayed" : "at once");
+    }
 }

@@ -258,3 +258,56 @@ TEST(SimpleProjectEditRate, NotifiesAfterStoringTheRate) {
     EXPECT_EQ(rate.editRate(), boost::rational<unsigned long>(30000, 1001));
     rate.detachEditRateObserver(&reader);
 }
+
+// An observer that destroys a subject without a lifeline during delayed
+// delivery ends that subject's delivery; the other held-back subjects are
+// still told.
+TEST_F(Notification, AnObserverThatDestroysItsSubjectEndsItsDelivery) {
+    Subject* doomed = new Subject(project);
+    struct Destroyer : Observer {
+        Subject** doomed = nullptr;
+        void update(Observable*) override {
+            delete *doomed;
+            *doomed = nullptr;
+        }
+    } destroyer;
+    destroyer.doomed = &doomed;
+    CountingObserver afterIt;
+    doomed->attach(&destroyer);
+    doomed->attach(&afterIt);
+    subject->attach(&observer);
+    {
+        NotifyDelay delay(project);
+        doomed->notify();
+        subject->notify();
+    }
+    EXPECT_EQ(doomed, nullptr);
+    EXPECT_EQ(afterIt.count, 0);
+    EXPECT_EQ(observer.count, 1);
+}
+
+// A subject held by shared pointer is kept alive through its delivery: an
+// observer letting go of the last reference leaves the others hearing it whole.
+TEST_F(Notification, AnObserverThatLetsGoOfItsSubjectLeavesTheOthersHearingItWhole) {
+    boost::shared_ptr<Attribute<std::string>> attribute(new Attribute<std::string>("name", "a", project));
+    const boost::weak_ptr<Attribute<std::string>> watched = attribute;
+    struct LettingGo : Observer {
+        boost::shared_ptr<Attribute<std::string>>* held = nullptr;
+        void update(Observable*) override { held->reset(); }
+    } lettingGo;
+    lettingGo.held = &attribute;
+    struct Reading : Observer {
+        std::string seen;
+        void update(Observable* changed) override {
+            seen = dynamic_cast<Attribute<std::string>&>(*changed).value();
+        }
+    } reading;
+    attribute->attach(&lettingGo);
+    attribute->attach(&reading);
+    {
+        NotifyDelay delay(project);
+        attribute->setValue("b");
+    }
+    EXPECT_EQ(reading.seen, "b");
+    EXPECT_TRUE(watched.expired());
+}
