@@ -1,6 +1,78 @@
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 
+#include <algorithm>
+
 namespace VelaMediaLib {
+
+// One read lock, so that the slots and links taken belong together.
+void TransitionSlots::take(const Track& track, const MediaPtr& media,
+                           const std::vector<Range<VelaTime>>& around) {
+    token_ = track.projectMutex();
+    ScopedReadLock lock(token_);
+    std::vector<MediaPtr> clips{media};
+    for (const Range<VelaTime>& range : around)
+        for (const MediaPtr& near :
+             track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media))
+            if (std::find(clips.begin(), clips.end(), near) == clips.end()) clips.push_back(near);
+    const size_t first = clips_.size();
+    bool anyTransition = false;
+    for (const MediaPtr& clip : clips) {
+        clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
+        anyTransition = anyTransition || clips_.back().left || clips_.back().right;
+    }
+    if (!anyTransition) { // nothing an edit could join or part
+        clips_.resize(first);
+        return;
+    }
+    for (size_t i = first; i < clips_.size(); ++i) {
+        addLinks(clips_[i].left);
+        addLinks(clips_[i].right);
+    }
+}
+
+void TransitionSlots::addLinks(const TransitionPtr& transition) {
+    if (!transition) return;
+    for (const Links& links : links_)
+        if (links.transition == transition) return;
+    links_.push_back(Links{transition, transition->leftMedia(), transition->rightMedia()});
+}
+
+// Setting a slot moves links as a side effect, so the links go back last.
+void TransitionSlots::restore() const {
+    if (clips_.empty()) return;
+    for (const Slots& slots : clips_) {
+        const MediaPtr media = slots.media.lock();
+        if (!media) continue;
+        if (media->leftTransition() != slots.left) media->setLeftTransition(slots.left);
+        if (media->rightTransition() != slots.right) media->setRightTransition(slots.right);
+    }
+    ScopedWriteLock lock(token_);
+    for (const Links& links : links_) {
+        links.transition->setLeftMedia(links.left);
+        links.transition->setRightMedia(links.right);
+    }
+}
+
+// What this one took was before both edits; the later one took, of clips
+// this one did not, a state the earlier edit had not changed.
+void TransitionSlots::addLater(const TransitionSlots& later) {
+    if (token_.expired()) token_ = later.token_;
+    for (const Slots& slots : later.clips_) {
+        const bool known = std::any_of(clips_.begin(), clips_.end(), [&](const Slots& mine) {
+            return !mine.media.owner_before(slots.media) && !slots.media.owner_before(mine.media);
+        });
+        if (!known) clips_.push_back(slots);
+    }
+    for (const Links& links : later.links_)
+        if (std::none_of(links_.begin(), links_.end(),
+                         [&](const Links& mine) { return mine.transition == links.transition; }))
+            links_.push_back(links);
+}
+
+CommandHandler& AtomicEditCmd::need(CommandHandler* handler) {
+    if (!handler) throw VelaMediaLibException("no command handler");
+    return *handler;
+}
 
 bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
     if (!result.second) return false;
@@ -9,12 +81,17 @@ bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
     return true;
 }
 
-void AtomicEditCmd::saveState() {
-    if (media_) saved_ = media_->state();
+void AtomicEditCmd::saveState(const Range<VelaTime>& target) {
+    slots_ = TransitionSlots();
+    if (!media_) return;
+    saved_ = media_->state();
+    if (track_) slots_.take(*track_, media_, {saved_.trackRange(), target});
 }
 
 bool AtomicEditCmd::restoreSavedState(CommandHandler* handler) {
-    return bool(handler->restoreMediaState(resultTrack_, resultMedia_, saved_).second);
+    if (!need(handler).restoreMediaState(resultTrack_, resultMedia_, saved_).second) return false;
+    slots_.restore();
+    return true;
 }
 
 boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
@@ -24,7 +101,8 @@ boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr
 }
 
 bool MoveCmd::execute(CommandHandler* handler) {
-    saveState();
+    need(handler);
+    saveState(media_ ? media_->trackRangeWithMove(amount_) : Range<VelaTime>());
     return keep(handler->moveMedia(track_, media_, amount_));
 }
 
@@ -37,6 +115,8 @@ CommandPtr MoveCmd::combine(const CommandPtr& later) {
     both->resultTrack_ = move->resultTrack_;
     both->resultMedia_ = move->resultMedia_;
     both->saved_ = saved_;
+    both->slots_ = slots_;
+    both->slots_.addLater(move->slots_);
     return both;
 }
 
@@ -48,15 +128,17 @@ boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const 
 }
 
 bool AddMediaCmd::execute(CommandHandler* handler) {
-    saveState();
+    need(handler);
+    saveState(media_ ? Range<VelaTime>(amount_, media_->duration()) : Range<VelaTime>());
     return keep(handler->addMedia(track_, media_, amount_));
 }
 
-// Placing a clip changes only its start; off the track again, it takes back
-// the one it had.
+// Placing a clip changes its start and joins transitions; off the track
+// again, it takes back its start, and it and its neighbours their transitions.
 bool AddMediaCmd::unexecute(CommandHandler* handler) {
-    if (!handler->removeMedia(resultTrack_, resultMedia_).second) return false;
+    if (!need(handler).removeMedia(resultTrack_, resultMedia_).second) return false;
     resultMedia_->setTrackStart(saved_.start);
+    slots_.restore();
     return true;
 }
 
@@ -67,13 +149,17 @@ boost::shared_ptr<RemoveMediaCmd> RemoveMediaCmd::create(const TrackPtr& track, 
 }
 
 bool RemoveMediaCmd::execute(CommandHandler* handler) {
+    need(handler);
     if (!media_) return false;
-    amount_ = media_->startTime(); // where it goes back on undo
+    saveState(media_->trackRange());
+    amount_ = saved_.start; // where it goes back on undo
     return keep(handler->removeMedia(track_, media_));
 }
 
 bool RemoveMediaCmd::unexecute(CommandHandler* handler) {
-    return bool(handler->addMedia(resultTrack_, resultMedia_, amount_).second);
+    if (!need(handler).addMedia(resultTrack_, resultMedia_, amount_).second) return false;
+    slots_.restore();
+    return true;
 }
 
 } // namespace VelaMediaLib

@@ -3,13 +3,49 @@
 #include <VelaMediaLib/commands/Command.h>
 #include <VelaMediaLib/commands/CommandHandler.h>
 
+#include <vector>
+
 namespace VelaMediaLib {
+
+/// The transitions of a few clips as they were: each clip's two slots and
+/// the clips each of those transitions named. Placing a clip joins
+/// transitions with its touching neighbours (and placing it back does so
+/// again), so an undo puts back what was taken and transitions come back
+/// exactly. Clips without any transition among them take no room.
+class TransitionSlots {
+public:
+    /// Takes the clip and the clips of the track touching or inside each range.
+    void take(const Track& track, const MediaPtr& media, const std::vector<Range<VelaTime>>& around);
+    /// Puts back every slot, then every link, taken.
+    void restore() const;
+    /// Adds what a later taking holds of clips this one does not (to combine two edits).
+    void addLater(const TransitionSlots& later);
+
+private:
+    struct Slots {
+        boost::weak_ptr<Media> media;
+        TransitionPtr left, right;
+    };
+    struct Links {
+        TransitionPtr transition;
+        boost::weak_ptr<Media> left, right;
+    };
+    void addLinks(const TransitionPtr& transition);
+
+    boost::weak_ptr<const ThreadSafe> token_;
+    std::vector<Slots> clips_;
+    std::vector<Links> links_;
+};
 
 /// An edit of one clip on one track by a tick amount, carried out through the
 /// handler. It keeps the track and clip the handler answered, since an edit
 /// may replace the clip; a refused edit reports false. Timing edits undo by
 /// giving the clip back the state it had before, exactly: the inverse edit
 /// cannot always (a trim back by the same delta may round past the media's end).
+/// Every atomic edit also gives back the transitions of the clip and of its
+/// touching neighbours, where it stood and where the edit put it. Without a
+/// handler (a composite's inner history used between runs) it throws
+/// VelaMediaLibException "no command handler".
 class AtomicEditCmd : public Command {
 public:
     const TrackPtr& track() const { return track_; }
@@ -23,10 +59,13 @@ protected:
         : track_(track), media_(media), amount_(amount), resultTrack_(track), resultMedia_(media) {}
     /// Keeps the handler's answer; true when it placed a clip.
     bool keep(const CommandHandler::TrackAndMedia& result);
-    /// Takes the clip's timing before the edit.
-    void saveState();
-    /// Gives the clip the timing it had before the edit.
+    /// Takes the clip's timing before the edit, and the transitions around
+    /// it and around the range the edit is to give it.
+    void saveState(const Range<VelaTime>& target);
+    /// Gives the clip the timing and transitions it had before the edit.
     bool restoreSavedState(CommandHandler* handler);
+    /// The handler, or VelaMediaLibException "no command handler".
+    static CommandHandler& need(CommandHandler* handler);
 
     TrackPtr track_;
     MediaPtr media_;
@@ -34,6 +73,7 @@ protected:
     TrackPtr resultTrack_;
     MediaPtr resultMedia_;
     MediaState saved_;
+    TransitionSlots slots_;
 };
 
 /// Moves a clip on its track by a tick delta. Two moves of the same clip
@@ -51,7 +91,8 @@ private:
 };
 
 /// Places a clip on a track at a start tick; undone by removing it, the clip
-/// taking back the start it had before.
+/// taking back the start it had before and, with its neighbours there, the
+/// transitions they had before placing joined them.
 class AddMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<AddMediaCmd> create(const TrackPtr& track, const MediaPtr& media,
@@ -64,7 +105,8 @@ private:
         : AtomicEditCmd(track, media, start) {}
 };
 
-/// Takes a clip off its track; undone by placing it back where it was.
+/// Takes a clip off its track; undone by placing it back where it was, with
+/// the transitions it and its neighbours had (placing it back would join them).
 class RemoveMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<RemoveMediaCmd> create(const TrackPtr& track, const MediaPtr& media);

@@ -20,14 +20,22 @@ boost::shared_ptr<StretchCmd> StretchCmd::create(const MediaPtr& media, double s
 // The track is the clip's parent at the time; the handler multiplies the
 // scalar, so the factor is the new scalar over the present one.
 bool StretchCmd::execute(CommandHandler* handler) {
+    need(handler);
     if (!media_) return false;
     track_.reset();
     media_->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
         track_ = boost::dynamic_pointer_cast<Track>(parent);
     });
     if (!track_) return false;
-    saveState();
-    return keep(handler->stretchMedia(track_, media_, scalar_ / saved_.scalar));
+    const SafeRational factor = scalar_ / media_->rationalScalar();
+    Range<VelaTime> target = media_->trackRange();
+    try {
+        target = media_->trackRangeWithRationalStretch(factor);
+    } catch (const std::exception&) {
+        // the stretch itself will refuse
+    }
+    saveState(target);
+    return keep(handler->stretchMedia(track_, media_, factor));
 }
 
 } // namespace VelaMediaLib

@@ -10,7 +10,8 @@ boost::shared_ptr<TrimStartCmd> TrimStartCmd::create(const TrackPtr& track, cons
 }
 
 bool TrimStartCmd::execute(CommandHandler* handler) {
-    saveState();
+    need(handler);
+    saveState(media_ ? media_->trackRangeWithTrimStart(amount_) : Range<VelaTime>());
     return keep(handler->trimMediaStart(track_, media_, amount_));
 }
 
@@ -22,7 +23,8 @@ boost::shared_ptr<TrimEndCmd> TrimEndCmd::create(const TrackPtr& track, const Me
 }
 
 bool TrimEndCmd::execute(CommandHandler* handler) {
-    saveState();
+    need(handler);
+    saveState(media_ ? media_->trackRangeWithTrimEnd(amount_) : Range<VelaTime>());
     return keep(handler->trimMediaEnd(track_, media_, amount_));
 }
 
