@@ -181,12 +181,14 @@ void CommandHistory::dropAnswersSince(uint64_t mark) {
                      followUps_.end());
 }
 
-CommandPtr CommandHistory::nextFollowUp() {
+CommandPtr CommandHistory::nextFollowUp(uint64_t limit) {
     const std::lock_guard<std::mutex> lock(followUpMutex_);
-    if (followUps_.empty()) return CommandPtr();
-    const CommandPtr next = followUps_.front().command;
-    followUps_.pop_front();
-    return next;
+    const auto next = std::find_if(followUps_.begin(), followUps_.end(),
+                                   [&](const FollowUp& f) { return f.number < limit || f.answersStep; });
+    if (next == followUps_.end()) return CommandPtr();
+    const CommandPtr command = next->command;
+    followUps_.erase(next);
+    return command;
 }
 
 void CommandHistory::runFollowUps() {
@@ -196,10 +198,12 @@ void CommandHistory::runFollowUps() {
 
 // Each follow-up is a step of its own; one that refused or threw has rolled
 // itself back (the edit it answered stands), and what it queued is dropped.
-// Others queued meanwhile, on other threads too, run in turn.
+// What other threads queue once the drain has begun waits for the next one,
+// so that threads editing without pause cannot keep it running.
 void CommandHistory::drain(const ProjectHold& project) {
     const Counted draining(draining_);
-    while (const CommandPtr next = nextFollowUp()) {
+    const uint64_t limit = queueMark();
+    while (const CommandPtr next = nextFollowUp(limit)) {
         const uint64_t mark = queueMark();
         bool done = false, threw = false;
         try {

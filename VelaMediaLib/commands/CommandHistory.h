@@ -125,7 +125,8 @@ private:
     /// Drops the follow-ups queued since the mark that answered the step
     /// that refused or threw: the changes they answered were rolled back.
     void dropAnswersSince(uint64_t mark);
-    CommandPtr nextFollowUp();
+    /// The first follow-up queued before the limit or answering a step here.
+    CommandPtr nextFollowUp(uint64_t limit);
     template <typename Replay>
     bool replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
                 Replay step);
