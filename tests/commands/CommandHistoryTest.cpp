@@ -371,6 +371,31 @@ TEST_F(History, ARefusedCommandDropsOnlyTheFollowUpsItQueued) {
     EXPECT_EQ(counter, 1);
 }
 
+// Threads that keep editing keep queueing; a drain takes only what was
+// queued before it began (and what its own steps queue), so it ends.
+TEST_F(History, ADrainRunsWhatWasQueuedBeforeItBegan) {
+    struct Relay : Command {
+        Relay(CommandHistory& into, int& counted) : history(into), runs(counted) {}
+        bool execute(CommandHandler*) override {
+            if (++runs < 50) // heard on another thread, which queues again
+                std::thread([this] {
+                    history.queueFollowUp(boost::make_shared<Relay>(history, runs));
+                }).join();
+            return true;
+        }
+        bool unexecute(CommandHandler*) override { return true; }
+        CommandHistory& history;
+        int& runs;
+    };
+    int runs = 0;
+    history.queueFollowUp(boost::make_shared<Relay>(history, runs));
+    history.runFollowUps();
+    EXPECT_EQ(runs, 1);
+    EXPECT_EQ(history.numFollowUps(), 1u);
+    history.runFollowUps();
+    EXPECT_EQ(runs, 2);
+}
+
 TEST_F(History, CombiningFoldsTheCommandItWasMeantForNotItsFollowUps) {
     history.execute(add(1));
     history.combineNextCommand();
