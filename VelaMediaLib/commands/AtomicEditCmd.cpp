@@ -5,29 +5,19 @@
 namespace VelaMediaLib {
 
 // One read lock, so that the slots and links taken belong together.
-void TransitionSlots::take(const Track& track, const MediaPtr& media,
-                           const std::vector<Range<VelaTime>>& around) {
+void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range) {
+    *this = TransitionSlots();
     token_ = track.projectMutex();
     ScopedReadLock lock(token_);
-    std::vector<MediaPtr> clips{media};
-    for (const Range<VelaTime>& range : around)
-        for (const MediaPtr& near :
-             track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media))
-            if (std::find(clips.begin(), clips.end(), near) == clips.end()) clips.push_back(near);
-    const size_t first = clips_.size();
-    bool anyTransition = false;
+    std::vector<MediaPtr> clips =
+        track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media);
+    clips.insert(clips.begin(), media);
     for (const MediaPtr& clip : clips) {
         clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
-        anyTransition = anyTransition || clips_.back().left || clips_.back().right;
+        addLinks(clips_.back().left);
+        addLinks(clips_.back().right);
     }
-    if (!anyTransition) { // nothing an edit could join or part
-        clips_.resize(first);
-        return;
-    }
-    for (size_t i = first; i < clips_.size(); ++i) {
-        addLinks(clips_[i].left);
-        addLinks(clips_[i].right);
-    }
+    if (links_.empty()) clips_.clear(); // no transition around: nothing to join
 }
 
 void TransitionSlots::addLinks(const TransitionPtr& transition) {
@@ -53,22 +43,6 @@ void TransitionSlots::restore() const {
     }
 }
 
-// What this one took was before both edits; the later one took, of clips
-// this one did not, a state the earlier edit had not changed.
-void TransitionSlots::addLater(const TransitionSlots& later) {
-    if (token_.expired()) token_ = later.token_;
-    for (const Slots& slots : later.clips_) {
-        const bool known = std::any_of(clips_.begin(), clips_.end(), [&](const Slots& mine) {
-            return !mine.media.owner_before(slots.media) && !slots.media.owner_before(mine.media);
-        });
-        if (!known) clips_.push_back(slots);
-    }
-    for (const Links& links : later.links_)
-        if (std::none_of(links_.begin(), links_.end(),
-                         [&](const Links& mine) { return mine.transition == links.transition; }))
-            links_.push_back(links);
-}
-
 CommandHandler& AtomicEditCmd::need(CommandHandler* handler) {
     if (!handler) throw VelaMediaLibException("no command handler");
     return *handler;
@@ -81,11 +55,15 @@ bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
     return true;
 }
 
-void AtomicEditCmd::saveState(const Range<VelaTime>& target) {
+void AtomicEditCmd::saveState() {
+    if (media_) saved_ = media_->state();
+}
+
+void AtomicEditCmd::saveState(const Range<VelaTime>& placed) {
     slots_ = TransitionSlots();
     if (!media_) return;
     saved_ = media_->state();
-    if (track_) slots_.take(*track_, media_, {saved_.trackRange(), target});
+    if (track_) slots_.takeAround(*track_, media_, placed);
 }
 
 bool AtomicEditCmd::restoreSavedState(CommandHandler* handler) {
@@ -102,7 +80,7 @@ boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr
 
 bool MoveCmd::execute(CommandHandler* handler) {
     need(handler);
-    saveState(media_ ? media_->trackRangeWithMove(amount_) : Range<VelaTime>());
+    saveState();
     return keep(handler->moveMedia(track_, media_, amount_));
 }
 
@@ -115,8 +93,6 @@ CommandPtr MoveCmd::combine(const CommandPtr& later) {
     both->resultTrack_ = move->resultTrack_;
     both->resultMedia_ = move->resultMedia_;
     both->saved_ = saved_;
-    both->slots_ = slots_;
-    both->slots_.addLater(move->slots_);
     return both;
 }
 

@@ -14,12 +14,11 @@ namespace VelaMediaLib {
 /// exactly. Clips without any transition among them take no room.
 class TransitionSlots {
 public:
-    /// Takes the clip and the clips of the track touching or inside each range.
-    void take(const Track& track, const MediaPtr& media, const std::vector<Range<VelaTime>>& around);
+    /// Takes the clip and the clips of the track touching or inside the range
+    /// (where placing the clip joins transitions).
+    void takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range);
     /// Puts back every slot, then every link, taken.
     void restore() const;
-    /// Adds what a later taking holds of clips this one does not (to combine two edits).
-    void addLater(const TransitionSlots& later);
 
 private:
     struct Slots {
@@ -42,8 +41,11 @@ private:
 /// may replace the clip; a refused edit reports false. Timing edits undo by
 /// giving the clip back the state it had before, exactly: the inverse edit
 /// cannot always (a trim back by the same delta may round past the media's end).
-/// Every atomic edit also gives back the transitions of the clip and of its
-/// touching neighbours, where it stood and where the edit put it. Without a
+/// Adding and removing also give back the transitions of the clip and of its
+/// touching neighbours where it is placed, since placing joins them. Timing
+/// edits change no transition slot or link (the track joins transitions only
+/// when placing a clip, and leaves parted clips their slots, returning the
+/// pair it parted), so giving back the timing gives back everything. Without a
 /// handler (a composite's inner history used between runs) it throws
 /// VelaMediaLibException "no command handler".
 class AtomicEditCmd : public Command {
@@ -59,9 +61,11 @@ protected:
         : track_(track), media_(media), amount_(amount), resultTrack_(track), resultMedia_(media) {}
     /// Keeps the handler's answer; true when it placed a clip.
     bool keep(const CommandHandler::TrackAndMedia& result);
-    /// Takes the clip's timing before the edit, and the transitions around
-    /// it and around the range the edit is to give it.
-    void saveState(const Range<VelaTime>& target);
+    /// Takes the clip's timing before a timing edit.
+    void saveState();
+    /// Takes the clip's timing before it is placed at or taken off the range,
+    /// and the transitions of the clips touching the range.
+    void saveState(const Range<VelaTime>& placed);
     /// Gives the clip the timing and transitions it had before the edit.
     bool restoreSavedState(CommandHandler* handler);
     /// The handler, or VelaMediaLibException "no command handler".

@@ -27,15 +27,8 @@ bool StretchCmd::execute(CommandHandler* handler) {
         track_ = boost::dynamic_pointer_cast<Track>(parent);
     });
     if (!track_) return false;
-    const SafeRational factor = scalar_ / media_->rationalScalar();
-    Range<VelaTime> target = media_->trackRange();
-    try {
-        target = media_->trackRangeWithRationalStretch(factor);
-    } catch (const std::exception&) {
-        // the stretch itself will refuse
-    }
-    saveState(target);
-    return keep(handler->stretchMedia(track_, media_, factor));
+    saveState();
+    return keep(handler->stretchMedia(track_, media_, scalar_ / saved_.scalar));
 }
 
 } // namespace VelaMediaLib

@@ -11,7 +11,7 @@ boost::shared_ptr<TrimStartCmd> TrimStartCmd::create(const TrackPtr& track, cons
 
 bool TrimStartCmd::execute(CommandHandler* handler) {
     need(handler);
-    saveState(media_ ? media_->trackRangeWithTrimStart(amount_) : Range<VelaTime>());
+    saveState();
     return keep(handler->trimMediaStart(track_, media_, amount_));
 }
 
@@ -24,7 +24,7 @@ boost::shared_ptr<TrimEndCmd> TrimEndCmd::create(const TrackPtr& track, const Me
 
 bool TrimEndCmd::execute(CommandHandler* handler) {
     need(handler);
-    saveState(media_ ? media_->trackRangeWithTrimEnd(amount_) : Range<VelaTime>());
+    saveState();
     return keep(handler->trimMediaEnd(track_, media_, amount_));
 }
 
