@@ -130,6 +130,11 @@ bool CommandHistory::execute(const CommandPtr& command) {
     if (!command) throw VelaMediaLibException("no command to execute");
     const ProjectHold project = holdProject();
     if (depth_ > 0 || draining_) return record(command, project); // nested: the outer step folds and drains
+    if (inner_) { // a composite's: its follow-ups went to the history running it, which drains them
+        if (!record(command, project)) return false;
+        fold(false);
+        return true;
+    }
     drain(project); // what idle time queued answers earlier changes: it goes first
     const uint64_t mark = queueMark();
     bool done = false;
