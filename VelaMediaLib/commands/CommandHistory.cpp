@@ -305,7 +305,6 @@ void CommandHistory::restoreState(const CommandHistoryState& state) {
 
 boost::shared_ptr<CommandHistory> CommandHistory::clone() const {
     const boost::shared_ptr<CommandHistory> copy(new CommandHistory(handler_, token_));
-    copy->bound_ = bound_;
     copy->state_ = state_;
     copy->undoLimit_ = undoLimit_;
     copy->transactionNumber_ = transactionNumber_;
