@@ -1,6 +1,52 @@
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 
+#include <algorithm>
+
 namespace VelaMediaLib {
+
+// One read lock, so that the slots and links taken belong together.
+void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range) {
+    *this = TransitionSlots();
+    token_ = track.projectMutex();
+    ScopedReadLock lock(token_);
+    std::vector<MediaPtr> clips =
+        track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media);
+    clips.insert(clips.begin(), media);
+    for (const MediaPtr& clip : clips) {
+        clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
+        addLinks(clips_.back().left);
+        addLinks(clips_.back().right);
+    }
+    if (links_.empty()) clips_.clear(); // no transition around: nothing to join
+}
+
+void TransitionSlots::addLinks(const TransitionPtr& transition) {
+    if (!transition) return;
+    for (const Links& links : links_)
+        if (links.transition == transition) return;
+    links_.push_back(Links{transition, transition->leftMedia(), transition->rightMedia()});
+}
+
+// Setting a slot moves links as a side effect, so the links go back last.
+void TransitionSlots::restore() const {
+    if (clips_.empty()) return;
+    for (const Slots& slots : clips_) {
+        const MediaPtr media = slots.media.lock();
+        if (!media) continue;
+        if (media->leftTransition() != slots.left) media->setLeftTransition(slots.left);
+        if (media->rightTransition() != slots.right) media->setRightTransition(slots.right);
+    }
+    ScopedWriteLock lock(token_);
+    for (const Links& links : links_) {
+        links.transition->setLeftMedia(links.left);
+        links.transition->setRightMedia(links.right);
+    }
+}
+
+CommandHandler& AtomicEditCmd::need(CommandHandler* handler) {
+    if (!handler) throw VelaMediaLibException("no command handler");
+    return *handler;
+}
 
 bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {
     if (!result.second) return false;
@@ -13,8 +59,17 @@ void AtomicEditCmd::saveState() {
     if (media_) saved_ = media_->state();
 }
 
+void AtomicEditCmd::saveState(const Range<VelaTime>& placed) {
+    slots_ = TransitionSlots();
+    if (!media_) return;
+    saved_ = media_->state();
+    if (track_) slots_.takeAround(*track_, media_, placed);
+}
+
 bool AtomicEditCmd::restoreSavedState(CommandHandler* handler) {
-    return bool(handler->restoreMediaState(resultTrack_, resultMedia_, saved_).second);
+    if (!need(handler).restoreMediaState(resultTrack_, resultMedia_, saved_).second) return false;
+    slots_.restore();
+    return true;
 }
 
 boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr& media, VelaTime delta) {
@@ -24,6 +79,7 @@ boost::shared_ptr<MoveCmd> MoveCmd::create(const TrackPtr& track, const MediaPtr
 }
 
 bool MoveCmd::execute(CommandHandler* handler) {
+    need(handler);
     saveState();
     return keep(handler->moveMedia(track_, media_, amount_));
 }
@@ -48,15 +104,17 @@ boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const 
 }
 
 bool AddMediaCmd::execute(CommandHandler* handler) {
-    saveState();
+    need(handler);
+    saveState(media_ ? Range<VelaTime>(amount_, media_->duration()) : Range<VelaTime>());
     return keep(handler->addMedia(track_, media_, amount_));
 }
 
-// Placing a clip changes only its start; off the track again, it takes back
-// the one it had.
+// Placing a clip changes its start and joins transitions; off the track
+// again, it takes back its start, and it and its neighbours their transitions.
 bool AddMediaCmd::unexecute(CommandHandler* handler) {
-    if (!handler->removeMedia(resultTrack_, resultMedia_).second) return false;
+    if (!need(handler).removeMedia(resultTrack_, resultMedia_).second) return false;
     resultMedia_->setTrackStart(saved_.start);
+    slots_.restore();
     return true;
 }
 
@@ -67,13 +125,17 @@ boost::shared_ptr<RemoveMediaCmd> RemoveMediaCmd::create(const TrackPtr& track, 
 }
 
 bool RemoveMediaCmd::execute(CommandHandler* handler) {
+    need(handler);
     if (!media_) return false;
-    amount_ = media_->startTime(); // where it goes back on undo
+    saveState(media_->trackRange());
+    amount_ = saved_.start; // where it goes back on undo
     return keep(handler->removeMedia(track_, media_));
 }
 
 bool RemoveMediaCmd::unexecute(CommandHandler* handler) {
-    return bool(handler->addMedia(resultTrack_, resultMedia_, amount_).second);
+    if (!need(handler).addMedia(resultTrack_, resultMedia_, amount_).second) return false;
+    slots_.restore();
+    return true;
 }
 
 } // namespace VelaMediaLib

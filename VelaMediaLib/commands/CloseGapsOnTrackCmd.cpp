@@ -14,9 +14,21 @@ struct Shift {
 
 boost::shared_ptr<CloseGapsOnTrackCmd> CloseGapsOnTrackCmd::create(const TrackPtr& track) {
     if (!track) throw VelaMediaLibException("no track to close gaps on");
-    const boost::shared_ptr<CloseGapsOnTrackCmd> command(new CloseGapsOnTrackCmd(track));
+    const boost::shared_ptr<CloseGapsOnTrackCmd> command(new CloseGapsOnTrackCmd(track, false));
     command->setName("Close Gaps");
     return command;
+}
+
+boost::shared_ptr<CloseGapsOnTrackCmd> CloseGapsOnTrackCmd::createRequest(const TrackPtr& track) {
+    if (!track) throw VelaMediaLibException("no track to close gaps on");
+    const boost::shared_ptr<CloseGapsOnTrackCmd> command(new CloseGapsOnTrackCmd(track, true));
+    command->setName("Close Gaps");
+    return command;
+}
+
+void CloseGapsOnTrackCmd::cancel() {
+    int waiting = Waiting;
+    state_.compare_exchange_strong(waiting, Cancelled);
 }
 
 bool CloseGapsOnTrackCmd::hasGap(const Track& track) {
@@ -30,8 +42,12 @@ bool CloseGapsOnTrackCmd::hasGap(const Track& track) {
     return false;
 }
 
+// Starting and cancelling are one exchange each, so a request is either
+// cancelled before it starts or runs whole.
 bool CloseGapsOnTrackCmd::execute(CommandHandler* handler) {
-    started_ = true;
+    int waiting = Waiting;
+    if (!state_.compare_exchange_strong(waiting, Started) && waiting == Cancelled) return false;
+    if (request_ && !track_->parentTimeline()) return false; // a stale request
     return MultiCommand::execute(handler) && numUndoCommands() > 0;
 }
 

@@ -15,10 +15,12 @@ public:
     /// gaps, a behavior, a script). Observers never edit from inside their
     /// update: they queue here, and the history runs each queued edit after
     /// the command being executed has finished and released its locks, as an
-    /// undo step of its own. A composite passes it on to the history running it.
+    /// undo step of its own. A composite passes it on to the history running
+    /// it. Observers hear on whichever thread edits, so this is safe from any.
     virtual void queueFollowUp(const CommandPtr& command) = 0;
-    /// Whether the executor is undoing or redoing: what changes then is a
-    /// replay of recorded edits, which observers must not answer with new ones.
+    /// Whether the executor is undoing or redoing on the calling thread: what
+    /// changes then is a replay of recorded edits, which observers must not
+    /// answer with new ones.
     virtual bool isReplaying() const { return false; }
 };
 

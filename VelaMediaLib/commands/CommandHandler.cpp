@@ -5,7 +5,10 @@
 namespace VelaMediaLib {
 namespace {
 
-// Runs a track edit; the model's refusals become an empty answer.
+// Runs a track edit; the model's refusals become an empty answer. Every
+// exception caught here is thrown by the model's checks before anything
+// changed: add observers, told after the change, cannot throw into the edit
+// (their failures are their own), so a refusal never hides a half-done edit.
 template <typename Edit>
 CommandHandler::TrackAndMedia attempt(const TrackPtr& track, const MediaPtr& media, Edit edit) {
     if (!track || !media) return CommandHandler::TrackAndMedia();

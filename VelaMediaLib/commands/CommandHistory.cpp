@@ -3,14 +3,28 @@
 #include <VelaMediaLib/time/NotifyDelay.h>
 #include <VelaMediaLib/time/VelaMediaLibException.h>
 
+#include <algorithm>
 #include <memory>
 
 namespace VelaMediaLib {
 namespace {
 
-// The top-level history running a step on this thread; composites pass the
-// follow-ups queued on them to it.
-thread_local CommandHistory* tRunning = nullptr;
+// The steps of histories running on this thread, innermost first: composites
+// pass their follow-ups to the innermost top-level history, and observers ask
+// whether what they hear is a replay.
+struct Frame {
+    CommandHistory* history;
+    bool replaying;
+    bool topLevel;
+    const Frame* outer;
+};
+thread_local const Frame* tFrames = nullptr;
+
+CommandHistory* topLevelRunningHere() {
+    for (const Frame* frame = tFrames; frame; frame = frame->outer)
+        if (frame->topLevel) return frame->history;
+    return nullptr;
+}
 
 // Counts a step in for as long as it lives, whichever way the step ends.
 class Counted {
@@ -24,33 +38,53 @@ private:
     int& count_;
 };
 
+bool isEmpty(const boost::weak_ptr<const ThreadSafe>& token) {
+    const boost::weak_ptr<const ThreadSafe> none;
+    return !token.owner_before(none) && !none.owner_before(token);
+}
+
 } // namespace
 
 class CommandHistory::Running {
 public:
-    explicit Running(CommandHistory& history) : previous_(tRunning), claimed_(!history.inner_) {
-        if (claimed_) tRunning = &history;
+    Running(CommandHistory& history, bool replaying) : frame_{&history, replaying, !history.inner_, tFrames} {
+        tFrames = &frame_;
     }
-    ~Running() {
-        if (claimed_) tRunning = previous_;
-    }
+    ~Running() { tFrames = frame_.outer; }
     Running(const Running&) = delete;
     Running& operator=(const Running&) = delete;
 
 private:
-    CommandHistory* previous_;
-    bool claimed_;
+    Frame frame_;
 };
 
 CommandHistory::CommandHistory(CommandHandler* handler, const boost::weak_ptr<const ThreadSafe>& token)
-    : handler_(handler), token_(token) {}
+    : handler_(handler), token_(token), bound_(!isEmpty(token)) {}
+
+CommandHistory::ProjectHold CommandHistory::holdProject() const {
+    if (!bound_) return ProjectHold();
+    ProjectHold project = token_.lock();
+    if (!project) throw VelaMediaLibException("the project of this command history has gone");
+    return project;
+}
 
 template <typename Step>
-void CommandHistory::delayedNotifications(Step step) {
+void CommandHistory::delayedNotifications(const ProjectHold& project, Step step) {
     std::unique_ptr<NotifyDelay> delay;
-    if (const boost::shared_ptr<const ThreadSafe> project = token_.lock())
-        if (!NotifyDelay::isNotifying(project)) delay.reset(new NotifyDelay(project));
+    if (project && !NotifyDelay::isNotifying(project)) delay.reset(new NotifyDelay(project));
     step();
+}
+
+bool CommandHistory::runsHere() const {
+    for (const Frame* frame = tFrames; frame; frame = frame->outer)
+        if (frame->history == this) return true;
+    return false;
+}
+
+bool CommandHistory::isReplaying() const {
+    for (const Frame* frame = tFrames; frame; frame = frame->outer)
+        if (frame->history == this && frame->replaying) return true;
+    return false;
 }
 
 void CommandHistory::trimToLimit() {
@@ -58,15 +92,15 @@ void CommandHistory::trimToLimit() {
     while (state_.undoStack.size() > size_t(undoLimit_)) state_.undoStack.pop_front();
 }
 
-bool CommandHistory::record(const CommandPtr& command) {
+bool CommandHistory::record(const CommandPtr& command, const ProjectHold& project) {
     const uint32_t transaction = ++transactionNumber_;
     const boost::shared_ptr<CommandHistoryObserver> observer = observer_.lock();
     if (observer) observer->commandWillExecute(command, transaction);
     bool done = false;
     {
-        const Running running(*this);
+        const Running running(*this, false);
         const Counted counted(depth_);
-        delayedNotifications([&] {
+        delayedNotifications(project, [&] {
             done = command->execute(handler_);
             if (!done) return;
             state_.undoStack.push_back(command);
@@ -94,55 +128,99 @@ void CommandHistory::fold(bool followUp) {
 
 bool CommandHistory::execute(const CommandPtr& command) {
     if (!command) throw VelaMediaLibException("no command to execute");
-    if (depth_ > 0 || draining_) return record(command); // a nested step: the outer one folds and drains
-    const size_t queued = followUps_.size();
+    const ProjectHold project = holdProject();
+    if (depth_ > 0 || draining_) return record(command, project); // nested: the outer step folds and drains
+    if (inner_) { // a composite's: its follow-ups went to the history running it, which drains them
+        if (!record(command, project)) return false;
+        fold(false);
+        return true;
+    }
+    drain(project); // what idle time queued answers earlier changes: it goes first
+    const uint64_t mark = queueMark();
     bool done = false;
     try {
-        done = record(command);
+        done = record(command, project);
     } catch (...) {
-        followUps_.resize(queued); // they answered changes that were rolled back
+        dropAnswersSince(mark);
         throw;
     }
     if (!done) {
-        followUps_.resize(queued);
+        dropAnswersSince(mark);
         return false;
     }
     fold(false);
-    runFollowUps();
+    drain(project);
     return true;
 }
 
+// A replay brings back the follow-ups recorded then; only the thread running
+// a step can know that what it queues answers that step.
 void CommandHistory::queueFollowUp(const CommandPtr& command) {
     if (!command) throw VelaMediaLibException("no follow-up to queue");
     if (inner_) {
-        if (!tRunning) throw VelaMediaLibException("no command history runs this composite's follow-up");
-        tRunning->queueFollowUp(command);
+        CommandHistory* const running = topLevelRunningHere();
+        if (!running) throw VelaMediaLibException("no command history runs this composite's follow-up");
+        running->queueFollowUp(command);
         return;
     }
-    if (replaying_ > 0) return; // the replay brings back the follow-ups recorded then
-    followUps_.push_back(command);
+    if (isReplaying()) return;
+    const bool answersStep = runsHere();
+    const std::lock_guard<std::mutex> lock(followUpMutex_);
+    followUps_.push_back(FollowUp{command, followUpCount_++, answersStep});
 }
 
-// Like a host command's, the follow-ups queued by a follow-up that refused or
-// threw answered changes that were rolled back, and are dropped.
+size_t CommandHistory::numFollowUps() const {
+    const std::lock_guard<std::mutex> lock(followUpMutex_);
+    return followUps_.size();
+}
+
+uint64_t CommandHistory::queueMark() const {
+    const std::lock_guard<std::mutex> lock(followUpMutex_);
+    return followUpCount_;
+}
+
+void CommandHistory::dropAnswersSince(uint64_t mark) {
+    const std::lock_guard<std::mutex> lock(followUpMutex_);
+    followUps_.erase(std::remove_if(followUps_.begin(), followUps_.end(),
+                                    [&](const FollowUp& f) { return f.answersStep && f.number >= mark; }),
+                     followUps_.end());
+}
+
+CommandPtr CommandHistory::nextFollowUp(uint64_t limit) {
+    const std::lock_guard<std::mutex> lock(followUpMutex_);
+    const auto next = std::find_if(followUps_.begin(), followUps_.end(),
+                                   [&](const FollowUp& f) { return f.number < limit || f.answersStep; });
+    if (next == followUps_.end()) return CommandPtr();
+    const CommandPtr command = next->command;
+    followUps_.erase(next);
+    return command;
+}
+
 void CommandHistory::runFollowUps() {
-    if (inner_ || draining_ || depth_ > 0 || replaying_ > 0) return;
+    if (inner_ || draining_ || depth_ > 0 || isReplaying()) return;
+    drain(holdProject());
+}
+
+// Each follow-up is a step of its own; one that refused or threw has rolled
+// itself back (the edit it answered stands), and what it queued is dropped.
+// What other threads queue once the drain has begun waits for the next one,
+// so that threads editing without pause cannot keep it running.
+void CommandHistory::drain(const ProjectHold& project) {
     const Counted draining(draining_);
-    while (!followUps_.empty()) {
-        const CommandPtr next = followUps_.front();
-        followUps_.pop_front();
-        const size_t queued = followUps_.size();
+    const uint64_t limit = queueMark();
+    while (const CommandPtr next = nextFollowUp(limit)) {
+        const uint64_t mark = queueMark();
         bool done = false, threw = false;
         try {
-            done = record(next);
+            done = record(next, project);
         } catch (...) {
-            threw = true; // it has rolled itself back; the edit it answered stands
+            threw = true;
         }
         if (done) {
             fold(true);
             continue;
         }
-        followUps_.resize(queued);
+        dropAnswersSince(mark);
         if (threw)
             if (const boost::shared_ptr<CommandHistoryObserver> observer = observer_.lock())
                 observer->commandDidExecute(next, transactionNumber_, false);
@@ -155,14 +233,14 @@ void CommandHistory::runFollowUps() {
 template <typename Replay>
 bool CommandHistory::replay(std::list<CommandPtr>& from, std::list<CommandPtr>& to, const char* emptyMessage,
                             Replay step) {
+    const ProjectHold project = holdProject();
     if (from.empty()) throw VelaMediaLibException(emptyMessage);
     ++transactionNumber_;
     const CommandPtr command = from.back();
     bool done = false;
     {
-        const Running running(*this);
-        const Counted counted(replaying_);
-        delayedNotifications([&] { done = step(*command); });
+        const Running running(*this, true);
+        delayedNotifications(project, [&] { done = step(*command); });
     }
     if (!done) return false;
     from.pop_back();

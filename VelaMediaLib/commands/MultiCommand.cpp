@@ -5,6 +5,24 @@
 #include <exception>
 
 namespace VelaMediaLib {
+namespace {
+
+// The inner history has the handler only while the composite runs: a
+// composite kept in a stack must not keep a handler that may go meanwhile.
+class HandlerFor {
+public:
+    HandlerFor(CommandHistory& history, CommandHandler* handler) : history_(history) {
+        history_.setHandler(handler);
+    }
+    ~HandlerFor() { history_.setHandler(nullptr); }
+    HandlerFor(const HandlerFor&) = delete;
+    HandlerFor& operator=(const HandlerFor&) = delete;
+
+private:
+    CommandHistory& history_;
+};
+
+} // namespace
 
 MultiCommand::MultiCommand() : history_(nullptr) { history_.inner_ = true; }
 
@@ -15,7 +33,7 @@ void MultiCommand::rollBack() {
 }
 
 bool MultiCommand::execute(CommandHandler* handler) {
-    history_.setHandler(handler);
+    const HandlerFor running(history_, handler);
     refused_ = false;
     try {
         executeCommands(handler);
@@ -63,12 +81,12 @@ bool MultiCommand::replayAll(bool backwards) {
 }
 
 bool MultiCommand::unexecute(CommandHandler* handler) {
-    history_.setHandler(handler);
+    const HandlerFor running(history_, handler);
     return replayAll(true);
 }
 
 bool MultiCommand::reexecute(CommandHandler* handler) {
-    history_.setHandler(handler);
+    const HandlerFor running(history_, handler);
     return replayAll(false);
 }
 

@@ -14,7 +14,9 @@ namespace VelaMediaLib {
 /// finished ones are undone and execute reports false; if one of them refuses
 /// to undo or redo, those already replayed are replayed back and unexecute or
 /// reexecute reports false. When even that fails the model cannot be put
-/// back: VelaMediaLibFatalException.
+/// back: VelaMediaLibFatalException. The inner history has the handler only
+/// while the composite runs (none between runs: a composite kept in a stack
+/// holds no pointer to a handler that may have gone).
 class MultiCommand : public Command, public CommandExecutor {
 public:
     typedef boost::function<bool(const CommandPtr&)> ExecuteFunc;

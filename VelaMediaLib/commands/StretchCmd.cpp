@@ -20,6 +20,7 @@ boost::shared_ptr<StretchCmd> StretchCmd::create(const MediaPtr& media, double s
 // The track is the clip's parent at the time; the handler multiplies the
 // scalar, so the factor is the new scalar over the present one.
 bool StretchCmd::execute(CommandHandler* handler) {
+    need(handler);
     if (!media_) return false;
     track_.reset();
     media_->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {

@@ -10,6 +10,7 @@ boost::shared_ptr<TrimStartCmd> TrimStartCmd::create(const TrackPtr& track, cons
 }
 
 bool TrimStartCmd::execute(CommandHandler* handler) {
+    need(handler);
     saveState();
     return keep(handler->trimMediaStart(track_, media_, amount_));
 }
@@ -22,6 +23,7 @@ boost::shared_ptr<TrimEndCmd> TrimEndCmd::create(const TrackPtr& track, const Me
 }
 
 bool TrimEndCmd::execute(CommandHandler* handler) {
+    need(handler);
     saveState();
     return keep(handler->trimMediaEnd(track_, media_, amount_));
 }

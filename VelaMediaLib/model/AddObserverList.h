@@ -9,7 +9,12 @@ namespace VelaMediaLib {
 
 /// The add observers of a track, mixer or timeline: attached once each, told
 /// in the order they came, from a snapshot so that an observer may detach
-/// itself while being told.
+/// itself (or another) while being told; one detached meanwhile is skipped.
+///
+/// Observers are told once the change has been made, so what one throws
+/// cannot undo it: like an observer failing during delayed delivery, its
+/// exception is dropped and the others are still told. The edit that told
+/// them therefore never fails after it has changed the model.
 template <typename ObserverType>
 class AddObserverList {
 public:
@@ -31,10 +36,22 @@ public:
             ScopedReadLock lock(token_);
             snapshot = observers_;
         }
-        for (ObserverType* observer : snapshot) tellOne(*observer);
+        for (ObserverType* observer : snapshot) {
+            if (!stillAttached(observer)) continue;
+            try {
+                tellOne(*observer);
+            } catch (...) {
+                // The change stands; the observer's failure is its own.
+            }
+        }
     }
 
 private:
+    bool stillAttached(ObserverType* observer) const {
+        ScopedReadLock lock(token_);
+        return std::find(observers_.begin(), observers_.end(), observer) != observers_.end();
+    }
+
     boost::weak_ptr<const ThreadSafe> token_;
     std::vector<ObserverType*> observers_;
 };

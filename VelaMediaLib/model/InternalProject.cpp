@@ -55,6 +55,8 @@ void InternalProject::init() {
     sourceBin_.reset(new SourceBin(projectToken));
     timeline_ = Timeline::create(projectToken);
     clipBoard_.reset(new ClipBoard(projectToken));
+    // The project is the history's handler; the history holds it alive
+    // through the token for each step and refuses once it has gone.
     history_.reset(new CommandHistory(this, projectToken));
     commandSubject_.reset(new SubjectWithMutex(projectToken));
     magnetizers_.reset(new TrackMagnetizerAutoAttacher(timeline_, *this));
@@ -102,8 +104,11 @@ VersionInfo InternalProject::authorVersionInfo() const {
 }
 
 // The history folds the command as asked and runs its follow-ups; its
-// stacks are whole whenever it throws, and are put back all the same.
+// stacks are whole whenever it throws, and are put back all the same. The
+// follow-ups waiting from idle time run first, as steps of their own, so the
+// state saved here already holds them.
 bool InternalProject::execute(const CommandPtr& command) {
+    history_->runFollowUps();
     const CommandHistoryState saved = history_->state();
     bool done = false;
     try {

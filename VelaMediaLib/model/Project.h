@@ -32,6 +32,9 @@ public:
     virtual TimelinePtr timeline() const = 0;
     virtual boost::shared_ptr<SourceBin> sourceBin() const = 0;
     virtual boost::shared_ptr<ClipBoard> clipBoard() const = 0;
+    /// The history may be kept past the project: it holds the project only
+    /// through its token, and then refuses every step with
+    /// VelaMediaLibException "the project of this command history has gone".
     virtual boost::shared_ptr<CommandHistory> commandHistory() const = 0;
     /// The project as every object's token.
     virtual boost::weak_ptr<const ThreadSafe> token() const = 0;
@@ -79,7 +82,10 @@ public:
     virtual void addClipping(const MixerPtr& clipping) = 0;
     virtual bool removeClipping(const MixerPtr& clipping) = 0;
 
-    // Commands
+    // Commands. execute (from CommandExecutor) first runs the follow-ups
+    // queued while the history was idle (a host editing a magnetic track
+    // directly), each a step of its own, then the command and its follow-ups.
+
     /// False when the command refused to undo: both stacks stay as they were.
     /// Throws VelaMediaLibException "no commands to undo".
     virtual bool undo() = 0;

@@ -14,6 +14,10 @@ TrackMagnetizer::TrackMagnetizer(const TrackPtr& track, CommandExecutor& executo
 }
 
 TrackMagnetizer::~TrackMagnetizer() {
+    {
+        const std::lock_guard<std::mutex> lock(requestMutex_);
+        if (const boost::shared_ptr<CloseGapsOnTrackCmd> waiting = waiting_.lock()) waiting->cancel();
+    }
     for (const boost::weak_ptr<Media>& held : clips_)
         if (const MediaPtr media = held.lock()) media->detach(this);
     flag_->detach(this);
@@ -50,14 +54,17 @@ void TrackMagnetizer::update(Observable* subject) {
 // Cheap on purpose, as it runs inside every edit of the track's clips: the
 // flag is kept at hand, and closing gaps moves every clip after the gap, each
 // of them heard again; only the first change after a request has started
-// asks for another (which finds no gap and records nothing).
+// asks for another (which finds no gap and records nothing). A request is
+// marked started before it reads the track, so a change heard while it
+// waits is one it will see.
 void TrackMagnetizer::requestClosing() {
-    if (!magnetic_) return;
+    if (!magnetic_.load() || executor_.isReplaying()) return;
+    const std::lock_guard<std::mutex> lock(requestMutex_);
     const boost::shared_ptr<CloseGapsOnTrackCmd> waiting = waiting_.lock();
-    if ((waiting && !waiting->hasStarted()) || executor_.isReplaying()) return;
+    if (waiting && !waiting->hasStarted()) return;
     const TrackPtr track = track_.lock();
     if (!track) return;
-    const boost::shared_ptr<CloseGapsOnTrackCmd> request = CloseGapsOnTrackCmd::create(track);
+    const boost::shared_ptr<CloseGapsOnTrackCmd> request = CloseGapsOnTrackCmd::createRequest(track);
     executor_.queueFollowUp(request);
     waiting_ = request;
 }

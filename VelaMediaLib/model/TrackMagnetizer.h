@@ -4,6 +4,9 @@
 #include <VelaMediaLib/model/Track.h>
 #include <VelaMediaLib/time/Subject.h>
 
+#include <atomic>
+#include <mutex>
+
 namespace VelaMediaLib {
 
 class CloseGapsOnTrackCmd;
@@ -16,6 +19,12 @@ class CloseGapsOnTrackCmd;
 /// track has a gap by then). It hears changes at once (without notify delay)
 /// since all it does is queue; one request waits at a time, however many
 /// changes it hears; while the executor replays, it asks for nothing.
+///
+/// It hears a clip on whichever thread edits it (under the read lock only,
+/// so on several threads at once): the flag it keeps is atomic and the
+/// waiting request is guarded by a small mutex of its own. A request that
+/// has not started when the magnetizer goes (its track left the timeline) is
+/// cancelled, and refuses when it comes to run. The executor must outlive it.
 class TrackMagnetizer : public Observer, public TrackAddObserver {
 public:
     TrackMagnetizer(const TrackPtr& track, CommandExecutor& executor);
@@ -34,8 +43,9 @@ private:
     boost::weak_ptr<Track> track_;
     CommandExecutor& executor_;
     boost::shared_ptr<Attribute<bool>> flag_; // the track's "magnetic" attribute
-    bool magnetic_;
-    std::vector<boost::weak_ptr<Media>> clips_;
+    std::atomic<bool> magnetic_;
+    std::vector<boost::weak_ptr<Media>> clips_; // changed under the write lock only
+    std::mutex requestMutex_;                   // guards waiting_
     boost::weak_ptr<CloseGapsOnTrackCmd> waiting_;
 };
 

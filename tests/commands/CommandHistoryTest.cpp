@@ -8,6 +8,7 @@
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
 #include <stdexcept>
+#include <thread>
 
 using namespace VelaMediaLib;
 
@@ -324,8 +325,10 @@ TEST_F(History, ARefusedOrThrowingFollowUpLeavesTheStacksAndTheOthersRun) {
     EXPECT_EQ(observer->results, (std::vector<bool>{true, false, false, true}));
 }
 
-TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesWaitForTheNext) {
-    history.queueFollowUp(add(5)); // queued while idle: waits
+// Queued while idle (a host editing directly), a follow-up runs before the
+// next command, as a step of its own, so that undo undoes that command.
+TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesRunBeforeTheNext) {
+    history.queueFollowUp(add(5));
     EXPECT_EQ(counter, 0);
     const auto refused = LambdaMultiCommand::create([&](MultiCommand* self) {
         self->queueFollowUp(add(100));
@@ -333,17 +336,64 @@ TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesWaitForTheNext) {
         throw VelaMediaLibException("refused");
     });
     EXPECT_THROW(history.execute(refused), VelaMediaLibException);
-    EXPECT_EQ(history.numFollowUps(), 1u);
-    history.execute(add(1));
-    EXPECT_EQ(counter, 6);
-    EXPECT_EQ(history.undoStack().size(), 2u);
+    EXPECT_EQ(counter, 5); // the idle one ran first; the refused command's was dropped
+    EXPECT_EQ(history.numFollowUps(), 0u);
     history.queueFollowUp(add(20));
-    history.runFollowUps();
+    history.execute(add(1));
     EXPECT_EQ(counter, 26);
+    EXPECT_EQ(history.undoStack().size(), 3u);
+    history.undo(); // the command, not the follow-up before it
+    EXPECT_EQ(counter, 25);
+    history.queueFollowUp(add(40));
+    history.runFollowUps();
+    EXPECT_EQ(counter, 65);
 
     const auto loose = LambdaMultiCommand::create([&](MultiCommand* self) { self->queueFollowUp(add(1)); });
     EXPECT_THROW(loose->execute(static_cast<CommandHandler*>(nullptr)),
                  VelaMediaLibException); // no history runs it
+}
+
+// Only what the refused step queued on its own thread answered it; a host
+// edit heard on another thread meanwhile still gets its follow-up.
+TEST_F(History, ARefusedCommandDropsOnlyTheFollowUpsItQueued) {
+    int other = 0;
+    const auto refused = LambdaMultiCommand::create([&](MultiCommand* self) {
+        self->queueFollowUp(add(100));
+        std::thread elsewhere([&] { history.queueFollowUp(CountCmd::create(other, 1)); });
+        elsewhere.join();
+        self->executeFunc()(CountCmd::create(counter, 1, false));
+        throw VelaMediaLibException("refused");
+    });
+    EXPECT_THROW(history.execute(refused), VelaMediaLibException);
+    EXPECT_EQ(history.numFollowUps(), 1u);
+    history.execute(add(1));
+    EXPECT_EQ(other, 1);
+    EXPECT_EQ(counter, 1);
+}
+
+// Threads that keep editing keep queueing; a drain takes only what was
+// queued before it began (and what its own steps queue), so it ends.
+TEST_F(History, ADrainRunsWhatWasQueuedBeforeItBegan) {
+    struct Relay : Command {
+        Relay(CommandHistory& into, int& counted) : history(into), runs(counted) {}
+        bool execute(CommandHandler*) override {
+            if (++runs < 50) // heard on another thread, which queues again
+                std::thread([this] {
+                    history.queueFollowUp(boost::make_shared<Relay>(history, runs));
+                }).join();
+            return true;
+        }
+        bool unexecute(CommandHandler*) override { return true; }
+        CommandHistory& history;
+        int& runs;
+    };
+    int runs = 0;
+    history.queueFollowUp(boost::make_shared<Relay>(history, runs));
+    history.runFollowUps();
+    EXPECT_EQ(runs, 1);
+    EXPECT_EQ(history.numFollowUps(), 1u);
+    history.runFollowUps();
+    EXPECT_EQ(runs, 2);
 }
 
 TEST_F(History, CombiningFoldsTheCommandItWasMeantForNotItsFollowUps) {

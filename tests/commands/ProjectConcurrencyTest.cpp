@@ -1,6 +1,7 @@
 #include "../TestDeadline.h"
 
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/model/InternalProject.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
 
@@ -59,4 +60,43 @@ TEST(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
     for (std::thread& reader : readers) reader.join();
     EXPECT_EQ(wrong.load(), 0);
     EXPECT_EQ(clips.back()->startTime(), 190);
+}
+
+// The magnetizer hears a clip on whichever thread edits it: two threads
+// rename clips of a magnetic track (each hearing under the read lock only,
+// so both may be heard at once) while the editing thread makes gaps directly
+// and runs commands that drain the queued closings. ThreadSanitizer sees any
+// unguarded request state; at the end the track has no gap.
+TEST(ProjectConcurrency, AMagnetizerHeardOnSeveralThreadsQueuesSafely) {
+    VelaMediaLib::testing::Deadline deadline;
+    const ProjectPtr project = Project::create(30, 1);
+    const auto mixer = project->newMixer("main");
+    const auto magnetic = project->timeline()->newTrack(), other = project->timeline()->newTrack();
+    project->timeline()->addTrack(mixer, magnetic);
+    project->timeline()->addTrack(mixer, other);
+    magnetic->magneticAttribute()->setValue(true);
+    std::vector<MediaPtr> clips;
+    for (int i = 0; i < 3; ++i) {
+        clips.push_back(PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10));
+        magnetic->addMedia(clips.back(), 10 * i);
+    }
+    const MediaPtr loose = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
+    other->addMedia(loose, 0);
+    std::atomic<bool> done{false};
+    std::vector<std::thread> renamers;
+    for (int which = 0; which < 2; ++which)
+        renamers.emplace_back([&, which] {
+            for (int i = 0; !done.load(); ++i) clips[which]->setIdentifier("c" + std::to_string(i));
+        });
+    for (int i = 0; i < 300; ++i) {
+        try {
+            clips[2]->move(1); // a gap: the closing waits for the next command
+        } catch (const CollisionException&) {}
+        project->execute(MoveCmd::create(other, loose, i % 2 ? -1 : 1));
+    }
+    done = true;
+    for (std::thread& renamer : renamers) renamer.join();
+    project->commandHistory()->runFollowUps();
+    EXPECT_EQ(clips[2]->startTime(), 20);
+    EXPECT_FALSE(CloseGapsOnTrackCmd::hasGap(*magnetic));
 }

@@ -307,3 +307,68 @@ TEST(TrackMagnetizerAutoAttacher, FollowsTracksAndMixersAsTheyComeAndGo) {
     EXPECT_EQ(clip->startTime(), 0);
     EXPECT_EQ(history.undoStack().size(), 1u);
 }
+
+// A host editing a magnetic track directly queues the closing; it runs before
+// the next command, as a step of its own, so that undo still undoes that command.
+TEST_F(ProjectTest, ADirectEditOnAMagneticTrackClosesBeforeTheNextCommand) {
+    track->magneticAttribute()->setValue(true);
+    const auto other = newTrack();
+    const MediaPtr a = clip(10), b = clip(10);
+    track->addMedia(a, 7); // directly: the closing waits
+    other->addMedia(b, 0);
+    ASSERT_TRUE(project->execute(MoveCmd::create(other, b, 5)));
+    EXPECT_EQ(a->startTime(), 0);
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(b->startTime(), 0); // the move, not the closing
+    EXPECT_EQ(a->startTime(), 0);
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(a->startTime(), 7); // then the closing
+}
+
+TEST_F(ProjectTest, AWaitingClosingIsDroppedWhenItsTrackLeavesTheProject) {
+    const auto second = project->newMixer("second");
+    const auto leaving = project->timeline()->newTrack();
+    project->timeline()->addTrack(second, leaving);
+    leaving->magneticAttribute()->setValue(true);
+    const MediaPtr a = clip(10);
+    leaving->addMedia(a, 7); // directly: the closing waits
+    project->removeMixer(second);
+    const MediaPtr b = place(0, 10);
+    EXPECT_EQ(a->startTime(), 7);
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 1u);
+    EXPECT_EQ(project->commandHistory()->numFollowUps(), 0u);
+    EXPECT_EQ(b->startTime(), 0);
+}
+
+// Add observers run after the clip is placed: what they throw is theirs, and
+// neither refuses the edit (half done) nor keeps the other observers from hearing.
+TEST_F(ProjectTest, AnAddObserverThatThrowsNeitherRefusesTheEditNorSilencesTheOthers) {
+    struct Thrower : TrackAddObserver {
+        void onTrackAddMedia(Track&, const MediaPtr&) override {
+            throw AddRemoveException("observer failed");
+        }
+        void onTrackRemoveMedia(Track&, const MediaPtr&) override {
+            throw ValueException<double>("observer failed", 0);
+        }
+    } thrower;
+    struct Counter : TrackAddObserver {
+        int added = 0, removed = 0;
+        void onTrackAddMedia(Track&, const MediaPtr&) override { ++added; }
+        void onTrackRemoveMedia(Track&, const MediaPtr&) override { ++removed; }
+    } counter;
+    track->attachAddObserver(&thrower);
+    track->attachAddObserver(&counter);
+    const MediaPtr media = clip(10);
+    EXPECT_TRUE(project->execute(AddMediaCmd::create(track, media, 0)));
+    EXPECT_TRUE(track->hasMedia(media));
+    EXPECT_TRUE(project->execute(RemoveMediaCmd::create(track, media)));
+    EXPECT_FALSE(track->hasMedia(media));
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 2u);
+    EXPECT_EQ(counter.added, 1);
+    EXPECT_EQ(counter.removed, 1);
+    project->commandHistory()->undoAll();
+    EXPECT_FALSE(track->hasMedia(media));
+    EXPECT_EQ(counter.added, 2);
+    track->detachAddObserver(&thrower);
+    track->detachAddObserver(&counter);
+}

@@ -1,12 +1,15 @@
 // A seeded run of random edits through the project, valid and invalid, on
-// three tracks of which one is magnetic. After every step the model must hold
-// its invariants, a refused edit must have changed nothing, and at the end
+// three tracks of which one is magnetic. Some clips carry transitions, so
+// adds, removes and moves join and part them; every clip has metadata and a
+// keyframed parameter, edited too. After every step the model must hold its
+// invariants, a refused edit must have changed nothing, and at the end
 // undoing everything and redoing everything must give back the exact states.
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/ChangeTrackFlagCmd.h>
 #include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/StretchCmd.h>
 #include <VelaMediaLib/commands/TrimCmd.h>
+#include <VelaMediaLib/document/XMLOptions.h>
 #include <VelaMediaLib/model/InternalProject.h>
 #include <VelaMediaLib/model/PlaceholderMedia.h>
 #include <VelaMediaLib/time/RationalUtil.h>
@@ -22,11 +25,78 @@ using namespace VelaMediaLib;
 
 namespace {
 
-// Everything an edit may change: each clip's timing and track, each track's
-// clips in order and its flags.
+const char* const kNote = "comment";
+
+// Sets (or removes) a clip's "comment" metadata; undo puts back the entry as it was.
+class SetNoteCmd : public Command {
+public:
+    SetNoteCmd(const MediaPtr& clip, const std::string& text, bool remove)
+        : clip_(clip), text_(text), remove_(remove) {}
+    bool execute(CommandHandler*) override {
+        had_ = clip_->hasMetaData(kNote);
+        old_ = clip_->metaDataValue(kNote);
+        if (remove_) return clip_->removeMetaData(kNote);
+        clip_->addMetaData(kNote, text_);
+        return true;
+    }
+    bool unexecute(CommandHandler*) override {
+        if (had_)
+            clip_->addMetaData(kNote, old_);
+        else
+            clip_->removeMetaData(kNote);
+        return true;
+    }
+
+private:
+    MediaPtr clip_;
+    std::string text_;
+    bool remove_;
+    bool had_ = false;
+    std::string old_;
+};
+
+// Sets a clip's opacity at a keyframe time, adding the keyframe if there is
+// none; undo changes it back or removes it.
+class SetOpacityCmd : public Command {
+public:
+    SetOpacityCmd(const MediaPtr& clip, int time, double value)
+        : clip_(clip), time_(RationalTime(time)), value_(value) {}
+    bool execute(CommandHandler*) override {
+        const auto opacity = parameter();
+        had_ = opacity->hasKeyFrameAtTime(time_);
+        if (had_)
+            old_ = opacity->changeKeyFrame(time_, value_);
+        else
+            opacity->addKeyFrame(time_, value_, RationalTime(0));
+        return true;
+    }
+    bool unexecute(CommandHandler*) override {
+        if (had_)
+            parameter()->changeKeyFrame(time_, old_);
+        else
+            parameter()->removeKeyFrame(time_);
+        return true;
+    }
+
+private:
+    boost::shared_ptr<Parameter<double>> parameter() const {
+        return boost::dynamic_pointer_cast<VisualMedia>(clip_)->opacity();
+    }
+    MediaPtr clip_;
+    RationalTime time_;
+    double value_;
+    bool had_ = false;
+    double old_ = 0;
+};
+
+// Everything an edit may change: each clip's timing, track, transitions,
+// metadata and opacity curve, each transition's clips, each track's clips in
+// order and its flags.
 struct Snapshot {
     std::vector<MediaState> states;
     std::vector<const Track*> parents;
+    std::vector<std::string> clipParts;
+    std::vector<std::string> transitionLinks;
     std::vector<std::vector<const Media*>> trackClips;
     std::vector<std::map<std::string, std::string>> trackMetaData;
     std::vector<std::pair<bool, bool>> hiddenAndSolo;
@@ -44,7 +114,13 @@ struct Snapshot {
                     << o.states[c].duration << ") media " << o.states[c].mediaStart.asDouble() << "+"
                     << o.states[c].mediaDuration.asDouble() << " x" << o.states[c].scalar.asDouble() << "; ";
             if (parents[c] != o.parents[c]) out << "clip " << c << " changed track; ";
+            if (clipParts[c] != o.clipParts[c])
+                out << "clip " << c << ": " << clipParts[c] << " vs " << o.clipParts[c] << "; ";
         }
+        for (size_t t = 0; t < transitionLinks.size(); ++t)
+            if (transitionLinks[t] != o.transitionLinks[t])
+                out << "transition " << t << " links " << transitionLinks[t] << " vs " << o.transitionLinks[t]
+                    << "; ";
         for (size_t t = 0; t < trackClips.size(); ++t) {
             if (trackClips[t] != o.trackClips[t]) out << "track " << t << " holds other clips; ";
             if (trackMetaData[t] != o.trackMetaData[t]) out << "track " << t << " metadata differs; ";
@@ -69,12 +145,25 @@ public:
             clips_.push_back(PlaceholderMedia::createFromMediaRange(
                 project_->token(), project_->editRateToken(), 0, SafeRational(i % 3), mediaDurations[i % 4],
                 scalars[(i / 4) % 4]));
+        for (int i = 0; i < 14; ++i) {
+            clips_[i]->addMetaData(kNote, "clip " + std::to_string(i));
+            opacityOf(clips_[i])->addKeyFrame(RationalTime(5), 0.5, RationalTime(0));
+            // Set before placing, so that placing joins them with touching neighbours.
+            if (i % 3 == 0) clips_[i]->setRightTransition(newTransition());
+            if (i % 4 == 1) clips_[i]->setLeftTransition(newTransition());
+        }
         VelaTime packed = 0; // the magnetic track starts without gaps
         for (int i = 0; i < 4; ++i) {
             tracks_[0]->addMedia(clips_[i], packed);
             packed += clips_[i]->duration();
         }
-        for (int i = 4; i < 10; ++i) tracks_[1 + i % 2]->addMedia(clips_[i], (i - 4) * 40);
+        VelaTime ends[2] = {0, 0}; // the others touch, but for a gap before the last
+        for (int i = 4; i < 10; ++i) {
+            VelaTime& end = ends[i % 2];
+            if (i >= 8) end += 10;
+            tracks_[1 + i % 2]->addMedia(clips_[i], end);
+            end += clips_[i]->duration();
+        }
         tracks_[0]->magneticAttribute()->setValue(true);
         project_->commandHistory()->runFollowUps();
     }
@@ -88,7 +177,11 @@ public:
                 parent = dynamic_cast<const Track*>(p.get());
             });
             s.parents.push_back(parent);
+            s.clipParts.push_back(partsOf(clip));
         }
+        for (const TransitionPtr& transition : transitions_)
+            s.transitionLinks.push_back(indexOf(transition->leftMedia()) + ">" +
+                                        indexOf(transition->rightMedia()));
         for (const auto& track : tracks_) {
             std::vector<const Media*> onTrack;
             for (const MediaPtr& clip : track->medias()) onTrack.push_back(clip.get());
@@ -141,6 +234,38 @@ public:
     ProjectPtr project() const { return project_; }
 
 private:
+    static boost::shared_ptr<Parameter<double>> opacityOf(const MediaPtr& clip) {
+        return boost::dynamic_pointer_cast<VisualMedia>(clip)->opacity();
+    }
+
+    TransitionPtr newTransition() {
+        transitions_.emplace_back(new Transition("t" + std::to_string(transitions_.size()), 2));
+        return transitions_.back();
+    }
+
+    template <typename T>
+    static std::string indexIn(const std::vector<boost::shared_ptr<T>>& all,
+                               const boost::shared_ptr<T>& one) {
+        if (!one) return "-";
+        const auto found = std::find(all.begin(), all.end(), one);
+        return found == all.end() ? "?" : std::to_string(found - all.begin());
+    }
+    std::string indexOf(const MediaPtr& clip) const { return indexIn(clips_, clip); }
+
+    // A clip's transitions, metadata and opacity curve (as its document has it).
+    std::string partsOf(const MediaPtr& clip) const {
+        std::ostringstream out;
+        out << "transitions " << indexIn(transitions_, clip->leftTransition()) << "|"
+            << indexIn(transitions_, clip->rightTransition()) << ", note '" << clip->metaDataValue(kNote)
+            << "' " << clip->hasMetaData(kNote) << ", opacity ";
+        std::ostringstream curve;
+        XMLOptions options(curve);
+        opacityOf(clip)->toJSON(options, 0, "opacity");
+        for (const char c : curve.str())
+            if (c != '\n' && c != ' ') out << c;
+        return out.str();
+    }
+
     int pick(int below) { return std::uniform_int_distribution<int>(0, below - 1)(random_); }
     VelaTime delta(int reach) { return std::uniform_int_distribution<VelaTime>(-reach, reach)(random_); }
 
@@ -157,7 +282,7 @@ private:
         const MediaPtr clip = clips_[c];
         const TrackPtr track = trackFor(clip);
         const int t = int(std::find(tracks_.begin(), tracks_.end(), track) - tracks_.begin());
-        switch (pick(9)) {
+        switch (pick(11)) {
         case 0:
             if (!placed(clip)) {
                 const VelaTime start = std::uniform_int_distribution<VelaTime>(-50, 250)(random_);
@@ -200,6 +325,17 @@ private:
         case 7:
             what << "close gaps on track " << t;
             return CloseGapsOnTrackCmd::create(tracks_[t]);
+        case 8: {
+            const bool remove = pick(3) == 0;
+            what << (remove ? "remove the note of clip " : "set the note of clip ") << c;
+            return CommandPtr(new SetNoteCmd(clip, "note " + std::to_string(pick(100)), remove));
+        }
+        case 9: {
+            const int time = pick(4) * 3;
+            const double value = pick(11) / 10.0;
+            what << "set the opacity of clip " << c << " at " << time << " to " << value;
+            return CommandPtr(new SetOpacityCmd(clip, time, value));
+        }
         default: {
             const VelaTime d = delta(300); // far: mostly collisions
             what << "long move of clip " << c << " on track " << t << " by " << d;
@@ -217,6 +353,7 @@ private:
     ProjectPtr project_ = Project::create(30, 1);
     std::vector<boost::shared_ptr<GenericTrack>> tracks_;
     std::vector<MediaPtr> clips_;
+    std::vector<TransitionPtr> transitions_;
     std::mt19937 random_;
 };
 
