@@ -104,16 +104,13 @@ bool Subject::tell(ListKind kind, const std::vector<Observer*>& observers, std::
     for (Observer* observer : observers) {
         if (contains(told, observer) || !stillIn(kind, observer)) continue;
         told.push_back(observer);
-        if (!stillHere) {
-            observer->update(owner());
-            continue;
-        }
         try {
             observer->update(owner());
         } catch (...) {
-            // Delayed delivery has no caller to hand this to; the others still hear.
+            // The change has happened: an observer's failure is its own, and
+            // must neither undo the edit's success nor silence the others.
         }
-        if (!(*stillHere)()) return false;
+        if (stillHere && !(*stillHere)()) return false;
     }
     return true;
 }

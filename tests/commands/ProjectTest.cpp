@@ -372,3 +372,23 @@ TEST_F(ProjectTest, AnAddObserverThatThrowsNeitherRefusesTheEditNorSilencesTheOt
     track->detachAddObserver(&thrower);
     track->detachAddObserver(&counter);
 }
+
+// The same for an observer told at once of a clip's change: the move has
+// happened, so the command succeeds and is recorded.
+TEST_F(ProjectTest, AnImmediateObserverThatThrowsDoesNotTurnAnEditIntoARefusal) {
+    struct Thrower : Observer {
+        int told = 0;
+        void update(Observable*) override {
+            ++told;
+            throw InvalidTrimRangeException("observer failed", 0, Range<VelaTime>(0, 1));
+        }
+    } thrower;
+    const MediaPtr media = clip(10);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, media, 0)));
+    media->attachWithoutNotifyDelay(&thrower);
+    EXPECT_TRUE(project->execute(MoveCmd::create(track, media, 5)));
+    EXPECT_EQ(media->startTime(), 5);
+    EXPECT_GE(thrower.told, 1);
+    EXPECT_EQ(project->commandHistory()->undoStack().size(), 2u);
+    media->detach(&thrower);
+}
