@@ -1,4 +1,4 @@
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/commands/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>

@@ -1,6 +1,6 @@
 // Held-back notifications keep what they deliver alive, and observers of
 // subjects with a mutex of their own are done once detach has returned.
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/commands/CommandHistory.h>
 #include <VelaMediaLib/model/InternalProject.h>
@@ -14,22 +14,9 @@
 #include <thread>
 
 using namespace VelaMediaLib;
+using VelaMediaLib::testing::BlockingObserver;
 using VelaMediaLib::testing::Deadline;
-
-namespace {
-
-bool waitFor(const std::atomic<bool>& flag, std::chrono::milliseconds limit) {
-    const auto until = std::chrono::steady_clock::now() + limit;
-    while (!flag.load() && std::chrono::steady_clock::now() < until) std::this_thread::yield();
-    return flag.load();
-}
-
-struct BlockingObserver : Observer {
-    std::function<void(Observable*)> body;
-    void update(Observable* changed) override { body(changed); }
-};
-
-} // namespace
+using VelaMediaLib::testing::waitFor;
 
 // The host lets go of a clip while its held-back notification is delivered on
 // another thread: the observer, which is told the clip itself, finds it whole,

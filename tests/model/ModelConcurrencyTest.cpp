@@ -1,4 +1,4 @@
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 // Readers inside a snapshot take no write lock, and timeline walks never
 // meet a mixer half gone. Each test carries its own deadline.

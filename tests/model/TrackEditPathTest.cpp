@@ -1,4 +1,4 @@
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 // Membership (a clip on one track, a track in one mixer, a mixer on one
 // timeline) and the path of a placed clip's edits through its track.

@@ -15,7 +15,9 @@
 #include <vector>
 
 using namespace VelaMediaLib;
+using VelaMediaLib::testing::BlockingObserver;
 using VelaMediaLib::testing::Deadline;
+using VelaMediaLib::testing::waitFor;
 
 namespace {
 
@@ -108,22 +110,6 @@ TEST(NotificationConcurrency, ASubjectDestroyedWhileAnotherThreadDeliversItWaits
     destroyer.join();
     EXPECT_FALSE(destroyedDuringDelivery);
 }
-
-namespace {
-
-/// Waits until the flag is set or the time is up; says whether it was set.
-bool waitFor(const std::atomic<bool>& flag, std::chrono::milliseconds limit) {
-    const auto until = std::chrono::steady_clock::now() + limit;
-    while (!flag.load() && std::chrono::steady_clock::now() < until) std::this_thread::yield();
-    return flag.load();
-}
-
-struct BlockingObserver : Observer {
-    std::function<void(Observable*)> body;
-    void update(Observable* changed) override { body(changed); }
-};
-
-} // namespace
 
 // Another thread lets go of the last reference to an attribute while its
 // held-back notification is delivered: the attribute lives, whole, until its

@@ -1,4 +1,4 @@
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/time/InterpolatingParam.h>
 #include <VelaMediaLib/time/ThreadSafe.h>

@@ -2,7 +2,7 @@
 // Helpers for the time and document tests: a small parametric kind, and the
 // deadline for tests that run threads.
 
-#include "../TestDeadline.h"
+#include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/model/Attributable.h>
 #include <VelaMediaLib/model/Parametric.h>

@@ -1,8 +1,13 @@
 #pragma once
-// A deadline for tests whose failure mode is a hang (a broken lock): past it
-// the test program says so and ends, instead of spinning until the runner's
-// own timeout.
+// What tests that run threads share: a deadline for tests whose failure mode
+// is a hang (a broken lock), past which the test program says so and ends
+// instead of spinning until the runner's own timeout; a bounded wait for a
+// flag; and an observer that runs a given body.
 
+#include <VelaMediaLib/time/Observer.h>
+
+#include <atomic>
+#include <functional>
 #include <chrono>
 #include <condition_variable>
 #include <cstdio>
@@ -39,6 +44,18 @@ private:
     std::condition_variable finished_;
     bool done_ = false;
     std::thread watcher_;
+};
+
+/// Waits until the flag is set or the time is up; says whether it was set.
+inline bool waitFor(const std::atomic<bool>& flag, std::chrono::milliseconds limit) {
+    const auto until = std::chrono::steady_clock::now() + limit;
+    while (!flag.load() && std::chrono::steady_clock::now() < until) std::this_thread::yield();
+    return flag.load();
+}
+
+struct BlockingObserver : Observer {
+    std::function<void(Observable*)> body;
+    void update(Observable* changed) override { body(changed); }
 };
 
 } // namespace testing
