@@ -144,6 +144,36 @@ TEST(NotificationConcurrency, AnAttributeLetGoOfDuringItsDeliveryLivesUntilItsOb
     EXPECT_TRUE(watched.expired());
 }
 
+namespace {
+
+// Detaches an observer while another thread is inside its update (told at
+// once or in delayed delivery); says whether detach returned before the
+// observer had finished.
+template <typename Detach>
+bool detachReturnsWhileTheObserverRuns(Subject& subject, const boost::shared_ptr<ThreadSafe>& project,
+                                       bool delayed, Detach detach) {
+    std::atomic<bool> entered{false}, detached{false};
+    bool detachedWhileRunning = true;
+    BlockingObserver slow;
+    slow.body = [&](Observable*) {
+        entered = true;
+        detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
+    };
+    subject.attach(&slow);
+    std::thread notifier([&] {
+        if (!delayed) return subject.notify();
+        NotifyDelay delay(project);
+        subject.notify();
+    });
+    waitFor(entered, std::chrono::seconds(30));
+    detach(&slow);
+    detached = true;
+    notifier.join();
+    return detachedWhileRunning;
+}
+
+} // namespace
+
 // A SubjectWithMutex holds its own mutex around its walks: once detach has
 // returned on another thread, the observer has finished, whether it was told
 // at once or at the end of a delay.
@@ -153,24 +183,9 @@ TEST(NotificationConcurrency, SubjectWithMutexDetachReturnsOnlyOnceTheObserverHa
     for (const bool delayed : {false, true}) {
         SubjectWithMutex subject(delayed ? boost::weak_ptr<const ThreadSafe>(project)
                                          : boost::weak_ptr<const ThreadSafe>());
-        std::atomic<bool> entered{false}, detached{false};
-        bool detachedWhileRunning = true;
-        BlockingObserver slow;
-        slow.body = [&](Observable*) {
-            entered = true;
-            detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
-        };
-        subject.attach(&slow);
-        std::thread notifier([&] {
-            if (!delayed) return subject.notify();
-            NotifyDelay delay(project);
-            subject.notify();
-        });
-        waitFor(entered, std::chrono::seconds(30));
-        subject.detach(&slow);
-        detached = true;
-        notifier.join();
-        EXPECT_FALSE(detachedWhileRunning) << (delayed ? "delayed" : "at once");
+        EXPECT_FALSE(detachReturnsWhileTheObserverRuns(subject, project, delayed, [&](Observer* o) {
+            subject.detach(o);
+        })) << (delayed ? "delayed" : "at once");
     }
 }
 
@@ -181,26 +196,9 @@ TEST(NotificationConcurrency, DetachUnderTheWriteLockWaitsForARunningNotificatio
     const auto project = boost::make_shared<ThreadSafe>();
     for (const bool delayed : {false, true}) {
         Subject subject(project);
-        std::atomic<bool> entered{false}, detached{false};
-        bool detachedWhileRunning = true;
-        BlockingObserver slow;
-        slow.body = [&](Observable*) {
-            entered = true;
-            detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
-        };
-        subject.attach(&slow);
-        std::thread notifier([&] {
-            if (!delayed) return subject.notify();
-            NotifyDelay delay(project);
-            subject.notify();
-        });
-        waitFor(entered, std::chrono::seconds(30));
-        {
+        EXPECT_FALSE(detachReturnsWhileTheObserverRuns(subject, project, delayed, [&](Observer* o) {
             ScopedWriteLock lock(project);
-            subject.detach(&slow);
-        }
-        detached = true;
-        notifier.join();
-        EXPECT_FALSE(detachedWhileRunning) << (delayed ? "delayed" : "at once");
+            subject.detach(o);
+        })) << (delayed ? "delayed" : "at once");
     }
 }
