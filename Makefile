@@ -8,7 +8,7 @@ endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
 SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
-.PHONY: deps demo test bench sanitize tsan clang format format-check install-check
+.PHONY: deps demo test bench sanitize tsan clang header-check format format-check install-check
 
 deps:
 	@scripts/install-deps
@@ -48,6 +48,11 @@ clang: deps
 	  -DCMAKE_CXX_FLAGS=-DVELA_PORTABLE_INT128 $(CMAKE_FLAGS)
 	cmake --build build-clang -j $(JOBS)
 	ctest --test-dir build-clang --output-on-failure -j $(JOBS)
+
+# Every installed header compiles on its own.
+header-check: deps
+	cmake -G Ninja -S tests/headers -B build-headers > /dev/null
+	cmake --build build-headers -j $(JOBS)
 
 format:
 	clang-format -i $(SOURCES)

@@ -113,9 +113,6 @@
 #include <VelaMediaLib/time/Observer.h>
 #include <VelaMediaLib/time/Parameter.h>
 #include <VelaMediaLib/time/ParameterImpl.h>
-#include <VelaMediaLib/time/ParameterImplDocument.h>
-#include <VelaMediaLib/time/ParameterImplEdits.h>
-#include <VelaMediaLib/time/ParameterImplQueries.h>
 #include <VelaMediaLib/time/ParameterInterface.h>
 #include <VelaMediaLib/time/ParameterTraits.h>
 #include <VelaMediaLib/time/ParameterTypes.h>

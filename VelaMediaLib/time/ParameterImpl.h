@@ -278,9 +278,9 @@ private:
 
 } // namespace VelaMediaLib
 
-#include <VelaMediaLib/time/ParameterImplQueries.h>
-#include <VelaMediaLib/time/ParameterImplEdits.h>
-#include <VelaMediaLib/time/ParameterImplDocument.h>
+#include <VelaMediaLib/time/detail/ParameterImplQueries.h>
+#include <VelaMediaLib/time/detail/ParameterImplEdits.h>
+#include <VelaMediaLib/time/detail/ParameterImplDocument.h>
 
 #include <VelaMediaLib/time/ParameterTypes.h>
 
