@@ -8,7 +8,7 @@ endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
 SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
-.PHONY: deps demo test bench sanitize tsan clang header-check format format-check install-check
+.PHONY: deps demo test bench sanitize tsan clang header-check layer-check format format-check install-check
 
 deps:
 	@scripts/install-deps
@@ -48,6 +48,10 @@ clang: deps
 	  -DCMAKE_CXX_FLAGS=-DVELA_PORTABLE_INT128 $(CMAKE_FLAGS)
 	cmake --build build-clang -j $(JOBS)
 	ctest --test-dir build-clang --output-on-failure -j $(JOBS)
+
+# No library file includes a header of a layer above its own.
+layer-check:
+	cmake -DROOT=$(CURDIR) -P cmake/CheckLayers.cmake
 
 # Every installed header compiles on its own.
 header-check: deps

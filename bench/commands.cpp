@@ -1,8 +1,8 @@
 // Edits through the history on a large magnetic track, and queries read
 // while another thread edits.
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <atomic>
 #include <benchmark/benchmark.h>

@@ -1,5 +1,5 @@
 // The project lock against std::shared_mutex, alone and with two readers at once.
-#include <VelaMediaLib/time/ReadWriteMutex.h>
+#include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 
 #include <benchmark/benchmark.h>
 #include <shared_mutex>

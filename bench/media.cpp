@@ -1,8 +1,8 @@
 // What clips cost to make and hold, and how long their timing edits take.
 #include "AllocationCounter.h"
 
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/time/SimpleProjectEditRate.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
 
 #include <benchmark/benchmark.h>
 #include <boost/make_shared.hpp>

@@ -2,8 +2,8 @@
 // parameters and keyframes cost in memory.
 #include "AllocationCounter.h"
 
-#include <VelaMediaLib/time/InterpolatingParam.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <benchmark/benchmark.h>
 #include <boost/make_shared.hpp>

@@ -1,5 +1,5 @@
 // SafeRational's guarded operators against plain boost::rational on the same operands.
-#include <VelaMediaLib/time/SafeRational.h>
+#include <VelaMediaLib/time/rational/SafeRational.h>
 
 #include <benchmark/benchmark.h>
 #include <random>

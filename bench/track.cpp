@@ -1,7 +1,7 @@
 // Track queries and placement against plain maps, and the timeline-wide query.
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
-#include <VelaMediaLib/time/SimpleProjectEditRate.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
 
 #include <benchmark/benchmark.h>
 #include <boost/make_shared.hpp>

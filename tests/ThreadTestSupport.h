@@ -4,7 +4,7 @@
 // instead of spinning until the runner's own timeout; a bounded wait for a
 // flag; and an observer that runs a given body.
 
-#include <VelaMediaLib/time/Observer.h>
+#include <VelaMediaLib/time/sync/Observer.h>
 
 #include <atomic>
 #include <functional>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <VelaMediaLib/model/VelaObject.h>
+#include <VelaMediaLib/base/VelaObject.h>
 
 #include <boost/shared_ptr.hpp>
 #include <string>

@@ -1,6 +1,6 @@
 #include <VelaMediaLib/effects/EffectList.h>
 
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <algorithm>
 

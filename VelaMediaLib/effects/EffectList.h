@@ -1,7 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/effects/Effectable.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 namespace VelaMediaLib {
 

@@ -1,9 +1,9 @@
-#include <VelaMediaLib/commands/BatchCmd.h>
-#include <VelaMediaLib/commands/CommandHistory.h>
-#include <VelaMediaLib/commands/CommandPair.h>
-#include <VelaMediaLib/commands/LambdaMultiCommand.h>
-#include <VelaMediaLib/commands/NullCmd.h>
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/commands/framework/BatchCmd.h>
+#include <VelaMediaLib/commands/framework/CommandHistory.h>
+#include <VelaMediaLib/commands/framework/CommandPair.h>
+#include <VelaMediaLib/commands/framework/LambdaMultiCommand.h>
+#include <VelaMediaLib/commands/framework/NullCmd.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>

@@ -1,10 +1,10 @@
 // A host may keep the project's history, or a composite, past the project.
 // What it keeps then refuses with a clear exception instead of reaching into
 // the project that has gone (AddressSanitizer finds any such read).
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/BatchCmd.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/framework/BatchCmd.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <gtest/gtest.h>
 

@@ -1,12 +1,12 @@
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/BatchCmd.h>
-#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
-#include <VelaMediaLib/commands/LambdaMultiCommand.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/LockData.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/SymbolTable.h>
-#include <VelaMediaLib/time/NotifyDelay.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/framework/BatchCmd.h>
+#include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
+#include <VelaMediaLib/commands/framework/LambdaMultiCommand.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/parameters/SymbolTable.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
 
 #include <algorithm>
 #include <boost/make_shared.hpp>

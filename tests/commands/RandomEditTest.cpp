@@ -4,15 +4,15 @@
 // keyframed parameter, edited too. After every step the model must hold its
 // invariants, a refused edit must have changed nothing, and at the end
 // undoing everything and redoing everything must give back the exact states.
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/ChangeTrackFlagCmd.h>
-#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
-#include <VelaMediaLib/commands/StretchCmd.h>
-#include <VelaMediaLib/commands/TrimCmd.h>
-#include <VelaMediaLib/document/XMLOptions.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/time/RationalUtil.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
+#include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
+#include <VelaMediaLib/commands/edits/StretchCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/document/format/XMLOptions.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/rational/RationalUtil.h>
 
 #include <algorithm>
 #include <gtest/gtest.h>

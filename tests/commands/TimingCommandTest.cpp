@@ -1,9 +1,9 @@
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/CloseGapsOnTrackCmd.h>
-#include <VelaMediaLib/commands/StretchCmd.h>
-#include <VelaMediaLib/commands/TrimCmd.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
+#include <VelaMediaLib/commands/edits/StretchCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <gtest/gtest.h>
 

@@ -1,10 +1,10 @@
 // Adding a clip joins transitions with its touching neighbours; undoing the
 // add, or a removal, must give every clip involved its own slots back, and
 // every transition its own links.
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/TrimCmd.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <gtest/gtest.h>
 #include <sstream>

@@ -1,8 +1,8 @@
-#include <VelaMediaLib/document/XMLOptions.h>
-#include <VelaMediaLib/time/AnimationParam.h>
-#include <VelaMediaLib/time/DiffParameter.h>
-#include <VelaMediaLib/time/InterpolatingParam.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/document/format/XMLOptions.h>
+#include <VelaMediaLib/time/parameters/AnimationParam.h>
+#include <VelaMediaLib/time/parameters/DiffParameter.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
 #include "../JsonTestSupport.h"

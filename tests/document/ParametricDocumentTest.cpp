@@ -1,8 +1,8 @@
 #include "../JsonTestSupport.h"
 #include "../time/TimeTestSupport.h"
 
-#include <VelaMediaLib/document/JSONWriter.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>

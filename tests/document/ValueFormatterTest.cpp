@@ -1,7 +1,7 @@
-#include <VelaMediaLib/document/JSONReader.h>
-#include <VelaMediaLib/document/JSONWriter.h>
-#include <VelaMediaLib/document/ValueFormatter.h>
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
+#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <cmath>
 #include "../JsonTestSupport.h"

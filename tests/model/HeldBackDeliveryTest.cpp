@@ -2,10 +2,10 @@
 // subjects with a mutex of their own are done once detach has returned.
 #include "../ThreadTestSupport.h"
 
-#include <VelaMediaLib/commands/CommandHistory.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/time/NotifyDelay.h>
+#include <VelaMediaLib/commands/framework/CommandHistory.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
 
 #include <atomic>
 #include <chrono>

@@ -3,9 +3,9 @@
 // under AddressSanitizer to see that nothing freed is read).
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/LockData.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
+#include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
 
 #include <gtest/gtest.h>
 

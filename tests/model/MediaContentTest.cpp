@@ -1,11 +1,11 @@
 #include "../JsonTestSupport.h"
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/document/XMLOptions.h>
-#include <VelaMediaLib/model/ColorMedia.h>
-#include <VelaMediaLib/model/MediaTypeFromMediaDispatcher.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/time/ParameterImpl.h>
+#include <VelaMediaLib/document/format/XMLOptions.h>
+#include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/parameters/ParameterImpl.h>
 
 #include <cmath>
 #include <gtest/gtest.h>

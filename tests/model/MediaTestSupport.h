@@ -1,11 +1,11 @@
 #pragma once
 // Clips with any timing state, for the tests of the timing model.
 
-#include <VelaMediaLib/model/AudioMediaImpl.h>
-#include <VelaMediaLib/model/MediaDispatcher.h>
-#include <VelaMediaLib/model/VisualMediaImpl.h>
-#include <VelaMediaLib/time/SimpleProjectEditRate.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/model/media/AudioMediaImpl.h>
+#include <VelaMediaLib/model/media/MediaDispatcher.h>
+#include <VelaMediaLib/model/media/VisualMediaImpl.h>
+#include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
 

@@ -1,10 +1,10 @@
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/ColorMedia.h>
-#include <VelaMediaLib/model/IdentManager.h>
-#include <VelaMediaLib/model/MediaEditor.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/RationalTemporalEditor.h>
+#include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/base/IdentManager.h>
+#include <VelaMediaLib/model/media/MediaEditor.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/media/RationalTemporalEditor.h>
 
 #include <gtest/gtest.h>
 #include <limits>

@@ -4,9 +4,9 @@
 // meet a mixer half gone. Each test carries its own deadline.
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/MediaEditor.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
+#include <VelaMediaLib/model/media/MediaEditor.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
 
 #include <atomic>
 #include <chrono>

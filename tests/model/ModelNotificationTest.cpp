@@ -1,9 +1,9 @@
 // Observers hear the changed object itself, and only of real changes.
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
-#include <VelaMediaLib/time/MultiObjectObserver.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/sync/MultiObjectObserver.h>
 
 #include <gtest/gtest.h>
 

@@ -1,8 +1,8 @@
 // Reading a document's parameter list into a clip keeps its parameter objects.
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/time/InterpolatingParam.h>
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <gtest/gtest.h>
 #include <json/reader.h>

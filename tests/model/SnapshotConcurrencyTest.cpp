@@ -1,9 +1,9 @@
 #include "../ThreadTestSupport.h"
 
-#include <VelaMediaLib/commands/AtomicEditCmd.h>
-#include <VelaMediaLib/model/InternalProject.h>
-#include <VelaMediaLib/model/MediaEditor.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/model/media/MediaEditor.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <atomic>
 #include <gtest/gtest.h>

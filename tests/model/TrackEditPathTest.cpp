@@ -4,9 +4,9 @@
 // timeline) and the path of a placed clip's edits through its track.
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
-#include <VelaMediaLib/time/Observer.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/sync/Observer.h>
 
 #include <atomic>
 #include <boost/function.hpp>

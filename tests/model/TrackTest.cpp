@@ -1,9 +1,9 @@
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/model/ColorMedia.h>
-#include <VelaMediaLib/model/LockData.h>
-#include <VelaMediaLib/model/PlaceholderMedia.h>
-#include <VelaMediaLib/model/Timeline.h>
+#include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
 
 #include <gtest/gtest.h>
 

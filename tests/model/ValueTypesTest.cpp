@@ -1,5 +1,5 @@
-#include <VelaMediaLib/model/TextAttributeList.h>
-#include <VelaMediaLib/model/TransformMatrix.h>
+#include <VelaMediaLib/base/TextAttributeList.h>
+#include <VelaMediaLib/base/TransformMatrix.h>
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-#include <VelaMediaLib/time/InterpolaterFactory.h>
+#include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -1,9 +1,9 @@
 #include "TimeTestSupport.h"
 
-#include <VelaMediaLib/time/Attribute.h>
-#include <VelaMediaLib/time/NotifyDelay.h>
-#include <VelaMediaLib/time/SubjectWithMutex.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/parameters/Attribute.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
+#include <VelaMediaLib/time/sync/SubjectWithMutex.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <atomic>
 #include <chrono>

@@ -1,11 +1,11 @@
-#include <VelaMediaLib/time/Attribute.h>
-#include <VelaMediaLib/time/LambdaObserverWithoutNotifyDelay.h>
-#include <VelaMediaLib/time/MetaDatable.h>
-#include <VelaMediaLib/time/MultiObjectObserver.h>
-#include <VelaMediaLib/time/NotifyDelay.h>
-#include <VelaMediaLib/time/SimpleProjectEditRate.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/time/parameters/Attribute.h>
+#include <VelaMediaLib/time/sync/LambdaObserverWithoutNotifyDelay.h>
+#include <VelaMediaLib/time/parameters/MetaDatable.h>
+#include <VelaMediaLib/time/sync/MultiObjectObserver.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
+#include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 #include "../ThreadTestSupport.h"
 
-#include <VelaMediaLib/time/InterpolatingParam.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <atomic>
 #include <boost/make_shared.hpp>

@@ -1,8 +1,8 @@
-#include <VelaMediaLib/time/AnimationParam.h>
-#include <VelaMediaLib/time/DiffParameter.h>
-#include <VelaMediaLib/time/InterpolatingParam.h>
-#include <VelaMediaLib/time/LeftParameter.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/parameters/AnimationParam.h>
+#include <VelaMediaLib/time/parameters/DiffParameter.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/parameters/LeftParameter.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>

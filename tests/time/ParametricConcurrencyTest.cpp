@@ -1,7 +1,7 @@
 #include "TimeTestSupport.h"
 
-#include <VelaMediaLib/time/NotifyDelay.h>
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <atomic>
 #include <boost/make_shared.hpp>

@@ -1,4 +1,4 @@
-#include <VelaMediaLib/time/detail/Int128.h>
+#include <VelaMediaLib/base/detail/Int128.h>
 
 #include <gtest/gtest.h>
 #include <limits>

@@ -1,6 +1,6 @@
-#include <VelaMediaLib/time/RationalTime.h>
-#include <VelaMediaLib/time/RationalUtil.h>
-#include <VelaMediaLib/time/TimeUtil.h>
+#include <VelaMediaLib/time/rational/RationalTime.h>
+#include <VelaMediaLib/time/rational/RationalUtil.h>
+#include <VelaMediaLib/time/rational/TimeUtil.h>
 
 #include <boost/lexical_cast.hpp>
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
 #include "../ThreadTestSupport.h"
 
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <atomic>
 #include <boost/make_shared.hpp>

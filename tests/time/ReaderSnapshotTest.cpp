@@ -1,6 +1,6 @@
 #include "TimeTestSupport.h"
 
-#include <VelaMediaLib/time/ThreadSafe.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/make_shared.hpp>
 #include <functional>

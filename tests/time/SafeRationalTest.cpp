@@ -1,4 +1,4 @@
-#include <VelaMediaLib/time/SafeRational.h>
+#include <VelaMediaLib/time/rational/SafeRational.h>
 
 #include <boost/lexical_cast.hpp>
 #include <gtest/gtest.h>

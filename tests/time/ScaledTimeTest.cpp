@@ -1,5 +1,5 @@
-#include <VelaMediaLib/time/ScaledTimeRange.h>
-#include <VelaMediaLib/time/VelaMediaLibException.h>
+#include <VelaMediaLib/time/rational/ScaledTimeRange.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <gtest/gtest.h>
 #include <sstream>

@@ -1,4 +1,4 @@
-#include <VelaMediaLib/time/TimeConverter.h>
+#include <VelaMediaLib/time/rational/TimeConverter.h>
 
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>

@@ -4,9 +4,9 @@
 
 #include "../ThreadTestSupport.h"
 
-#include <VelaMediaLib/model/Attributable.h>
-#include <VelaMediaLib/model/Parametric.h>
-#include <VelaMediaLib/time/InterpolatingParam.h>
+#include <VelaMediaLib/time/parameters/Attributable.h>
+#include <VelaMediaLib/time/parameters/Parametric.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 
 namespace VelaMediaLib {
 namespace testing {

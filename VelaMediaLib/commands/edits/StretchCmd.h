@@ -1,0 +1,26 @@
+#pragma once
+
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+
+namespace VelaMediaLib {
+
+/// Gives a clip a new scalar on the track it stands on: the same media range
+/// plays faster or slower, the duration following. Undo gives back the exact
+/// state; a clip on no track, or one the stretch would leave without a tick,
+/// refuses (false).
+class StretchCmd : public AtomicEditCmd {
+public:
+    /// Throws ValueException<double> "a clip's scalar must be above zero".
+    static boost::shared_ptr<StretchCmd> create(const MediaPtr& media, const SafeRational& scalar);
+    static boost::shared_ptr<StretchCmd> create(const MediaPtr& media, double scalar);
+    const SafeRational& scalar() const { return scalar_; }
+    bool execute(CommandHandler* handler) override;
+    bool unexecute(CommandHandler* handler) override { return restoreSavedState(handler); }
+
+private:
+    StretchCmd(const MediaPtr& media, const SafeRational& scalar)
+        : AtomicEditCmd(TrackPtr(), media, 0), scalar_(scalar) {}
+    SafeRational scalar_;
+};
+
+} // namespace VelaMediaLib

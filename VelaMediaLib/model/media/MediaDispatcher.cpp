@@ -1,0 +1,22 @@
+#include <VelaMediaLib/model/media/MediaDispatcher.h>
+
+#include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
+#include <VelaMediaLib/model/media/PlaceholderMedia.h>
+
+namespace VelaMediaLib {
+
+void MediaDispatcher::dispatchPlaceholderMedia(PlaceholderMedia& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchColorMedia(ColorMedia& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchPlaceholderMedia(const PlaceholderMedia& media) {
+    dispatchAnyMedia(media);
+}
+void ConstMediaDispatcher::dispatchColorMedia(const ColorMedia& media) { dispatchAnyMedia(media); }
+
+std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
+    MediaTypeFromMediaDispatcher namer;
+    media.dispatch(namer);
+    return namer.type();
+}
+
+} // namespace VelaMediaLib

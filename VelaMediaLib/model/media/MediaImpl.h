@@ -1,0 +1,144 @@
+#pragma once
+
+#include <VelaMediaLib/model/media/Media.h>
+#include <VelaMediaLib/model/media/RationalMediaEditor.h>
+#include <VelaMediaLib/model/timeline/SubTimelineParts.h>
+
+#include <atomic>
+#include <memory>
+
+namespace VelaMediaLib {
+
+/// The state every clip holds and the operations over it. A clip's parametric
+/// time counts ticks from its start on the track: its parameters' keyframes
+/// move with it and are cut, not shifted, when its start is trimmed.
+class MediaImpl : public SubTimelineParts<Media> {
+public:
+    enum EditorKind { Temporal, Static };
+
+    MediaImpl(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,
+              const MediaState& initial, EditorKind editor);
+    ~MediaImpl() override;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
+
+    // Placement
+    VelaTime startTime() const override;
+    VelaTime endTime() const override;
+    VelaTime duration() const override;
+    Range<VelaTime> timeRange() const override { return trackRange(); }
+
+    // Timing
+    boost::weak_ptr<ProjectEditRate> projectEditRate() const override;
+    void setProjectEditRate(const boost::weak_ptr<ProjectEditRate>& rate) override;
+    Range<VelaTime> trackRangeWithMove(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithTrimStart(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithTrimEnd(VelaTime offset) const override;
+    Range<VelaTime> trackRangeWithStretch(double factor) const override;
+    Range<double> mediaRange() const override;
+    double minMediaStart() const override { return minRationalMediaStart().asDouble(); }
+    double maxMediaEnd() const override { return maxRationalMediaEnd().asDouble(); }
+    Range<VelaTime> trackRange() const override;
+    Range<VelaTime> lockedTrackRange() const override { return state_.trackRange(); }
+    double scalar() const override { return rationalScalar().asDouble(); }
+    SafeRational rationalScalar() const override { return state().scalar; }
+    double findScalar(VelaTime duration) const override { return findRationalScalar(duration).asDouble(); }
+    VelaTime trimEndLimit() const override;
+    VelaTime trimStartLimit() const override;
+    bool validTrimStart(VelaTime offset) const override;
+    bool validTrimEnd(VelaTime offset) const override;
+    Range<SafeRational> rationalMediaRange() const override { return state().mediaRange(); }
+    SafeRational minRationalMediaStart() const override { return state().minMediaStart; }
+    SafeRational maxRationalMediaEnd() const override { return state().maxMediaEnd; }
+    Range<VelaTime> trackRangeWithRationalStretch(const SafeRational& factor) const override;
+    SafeRational findRationalScalar(VelaTime duration) const override;
+    MediaState state() const override;
+    MediaState defaultState() const override;
+    void restoreState(const MediaState& saved, VelaTime tolerance) override;
+    void move(VelaTime offset) override;
+    void trimStart(VelaTime offset) override;
+    void trimEnd(VelaTime offset) override;
+    void setTrackStart(VelaTime start) override;
+    double stretch(double factor) override;
+    SafeRational rationalStretch(const SafeRational& factor) override;
+    long long editingUnit() const override;
+    MediaEditor& mediaEditor() override;
+    const RationalMediaEditor& rationalMediaEditor() const override { return *editor_; }
+
+    // Transitions
+    TransitionPtr leftTransition() override;
+    TransitionPtr leftTransition() const override;
+    TransitionPtr rightTransition() override;
+    TransitionPtr rightTransition() const override;
+    void setLeftTransition(const TransitionPtr& transition) override;
+    void setRightTransition(const TransitionPtr& transition) override;
+    /// Its observers are told the clip itself.
+    Observable& transitionAddRemoveObservable() override { return transitionSubject_; }
+    TransitionPtr transitionAtTime(VelaTime time) const override;
+    TransitionAndNeighbour splitMergeTransitions() const override;
+
+    // Edge modifications
+    void addLeftEdgeModification(const EdgeModificationPtr& modification) override;
+    void addRightEdgeModification(const EdgeModificationPtr& modification) override;
+    bool removeLeftEdgeModification(const EdgeModificationPtr& modification) override;
+    bool removeRightEdgeModification(const EdgeModificationPtr& modification) override;
+    EdgeModifications leftEdgeModifications() const override;
+    EdgeModifications rightEdgeModifications() const override;
+    VelaTime leftEdgeModificationLength() const override;
+    VelaTime rightEdgeModificationLength() const override;
+    void setLeftEdgeModificationLength(VelaTime length) override;
+    void setRightEdgeModificationLength(VelaTime length) override;
+    std::set<std::string> edgeModGroupNames() const override;
+
+    // Time conversion: the clip's parametric time counts from its start.
+    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override;
+    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override;
+    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override;
+    TimeConverterPtr parentTimeConverter() const override { return timeConverterParent(); }
+    TimeConverterPtr timeConverterParent() const override;
+    RationalTime fromGlobalToParametricTime(const RationalTime& time) const override;
+    RationalTime fromParametricToGlobalTime(const RationalTime& time) const override;
+    RationalTime clippingFromGlobalToParametricTime(const RationalTime& time) const override;
+
+    // Parents, parameters, cloning, document
+    boost::weak_ptr<Timeline> parentTimeline() const override;
+    boost::shared_ptr<SubTimeline> parent() const override;
+    void parentVisitor(const ParentVisitor& visitor) const override;
+    void setParent(const boost::weak_ptr<SubTimeline>& parent) override;
+    boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const override;
+    void setupSharedClone(const boost::shared_ptr<Media>& clone) const override;
+    void toJSONTemporalValues(JSONWriter& writer) const override;
+    void toJSON(XMLOptions& options, int indent) const override;
+
+protected:
+    MediaState stateAfter(const TimingEdit& edit) const override;
+    bool takeStateUnnotified(const MediaState& next) override;
+    /// Carries a timing edit out: through the clip's track when it has one,
+    /// on the clip alone otherwise; notifies when something changed.
+    MediaState applyTimingEdit(const TimingEdit& edit);
+
+    /// Gives a clone of this clip everything but its placement on a track:
+    /// name, parameters, attributes, metadata, effects and edge modifications.
+    void copyContentInto(MediaImpl& clone) const;
+    void addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
+    bool removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
+    void setEdgeModificationLength(EdgeModifications& side, VelaTime length);
+    void setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left);
+
+private:
+    /// stateAfter and takeStateUnnotified under the lock the caller holds.
+    MediaState lockedStateAfter(const TimingEdit& edit) const;
+    bool lockedTakeState(const MediaState& next);
+
+    Subject transitionSubject_;
+    MediaState state_;
+    TransitionPtr left_, right_;
+    boost::weak_ptr<ProjectEditRate> editRate_;
+    std::unique_ptr<RationalMediaEditor> editor_;
+    /// Made on first use and published atomically, so that asking for it
+    /// takes no lock (readers ask for it inside their snapshots).
+    std::atomic<MediaEditor*> oldEditor_{nullptr};
+    EdgeModifications leftEdges_, rightEdges_;
+    boost::weak_ptr<SubTimeline> parent_;
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <VelaMediaLib/model/media/MediaDispatcher.h>
+
+#include <string>
+
+namespace VelaMediaLib {
+
+/// Names a clip's kind as the document's "_type" does.
+class MediaTypeFromMediaDispatcher : public ConstMediaDispatcher {
+public:
+    void dispatchPlaceholderMedia(const PlaceholderMedia&) override { type_ = "PlaceholderMedia"; }
+    void dispatchColorMedia(const ColorMedia&) override { type_ = "ColorMedia"; }
+    const std::string& type() const { return type_; }
+
+    static std::string typeOf(const Media& media);
+
+private:
+    std::string type_;
+};
+
+} // namespace VelaMediaLib

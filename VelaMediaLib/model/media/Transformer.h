@@ -1,0 +1,23 @@
+#pragma once
+
+#include <VelaMediaLib/base/TransformMatrix.h>
+#include <VelaMediaLib/time/rational/RationalTime.h>
+
+namespace VelaMediaLib {
+
+/// Something that places content on the canvas with a transform that may
+/// change over its parametric time.
+class Transformer {
+public:
+    virtual ~Transformer() = default;
+    virtual TransformMatrix transformAtTime(const RationalTime& time) const = 0;
+};
+
+/// The transform base of containers that place their content unchanged
+/// unless a kind says otherwise (the timeline).
+class TransformerImpl : public Transformer {
+public:
+    TransformMatrix transformAtTime(const RationalTime&) const override { return TransformMatrix(); }
+};
+
+} // namespace VelaMediaLib

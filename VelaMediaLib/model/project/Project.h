@@ -1,0 +1,118 @@
+#pragma once
+
+#include <VelaMediaLib/commands/framework/CommandExecutor.h>
+#include <VelaMediaLib/commands/framework/CommandHistory.h>
+#include <VelaMediaLib/document/format/VersionInfo.h>
+#include <VelaMediaLib/time/parameters/Attributable.h>
+#include <VelaMediaLib/model/timeline/ClipBoard.h>
+#include <VelaMediaLib/model/project/SourceBin.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/rational/ProjectEditRate.h>
+
+namespace VelaMediaLib {
+
+class CommandHandler;
+
+/// The document: the timeline, the source bin, the clipboard, the command
+/// history and the settings, and the one reader-writer lock of the whole
+/// model (the project is the token every object holds). Edits go through
+/// execute, undo and redo.
+class Project : public XMLable,
+                public ThreadSafe,
+                public ProjectEditRate,
+                public Observable,
+                public CommandExecutor,
+                public MetaDatable,
+                public Attributable {
+public:
+    /// Throws boost::bad_rational for a zero denominator; the rate is reduced.
+    static boost::shared_ptr<Project> create(unsigned long numerator, unsigned long denominator);
+    static boost::shared_ptr<Project> create(const boost::rational<unsigned long>& rate);
+
+    virtual TimelinePtr timeline() const = 0;
+    virtual boost::shared_ptr<SourceBin> sourceBin() const = 0;
+    virtual boost::shared_ptr<ClipBoard> clipBoard() const = 0;
+    /// The history may be kept past the project: it holds the project only
+    /// through its token, and then refuses every step with
+    /// VelaMediaLibException "the project of this command history has gone".
+    virtual boost::shared_ptr<CommandHistory> commandHistory() const = 0;
+    /// The project as every object's token.
+    virtual boost::weak_ptr<const ThreadSafe> token() const = 0;
+    /// The project's edit rate, as clips hold it.
+    virtual boost::weak_ptr<ProjectEditRate> editRateToken() const = 0;
+
+    // Settings
+    virtual void setUndoLimit(int limit) = 0;
+    /// Writes name, platform and version under "authoringClientName:name",
+    /// "authoringClientName:platform" and "authoringClientName:version".
+    virtual void setAuthorVersionInfo(const VersionInfo& info) = 0;
+    virtual VersionInfo authorVersionInfo() const = 0;
+    boost::shared_ptr<Attribute<std::string>> authorAttribute() const {
+        return attribute<std::string>("author");
+    }
+    boost::shared_ptr<Attribute<std::string>> titleAttribute() const {
+        return attribute<std::string>("title");
+    }
+    boost::shared_ptr<Attribute<std::string>> descriptionAttribute() const {
+        return attribute<std::string>("description");
+    }
+    boost::shared_ptr<Attribute<double>> targetLoudnessAttribute() const {
+        return attribute<double>("targetLoudness");
+    }
+    boost::shared_ptr<Attribute<bool>> shouldApplyLoudnessNormalizationAttribute() const {
+        return attribute<bool>("shouldApplyLoudnessNormalization");
+    }
+    boost::shared_ptr<Attribute<bool>> allowSubFrameEditingAttribute() const {
+        return attribute<bool>("allowSubFrameEditing");
+    }
+    boost::shared_ptr<Attribute<int>> videoFormatFrameRateAttribute() const {
+        return attribute<int>("videoFormatFrameRate");
+    }
+    boost::shared_ptr<Attribute<int>> audioFormatSampleRateAttribute() const {
+        return attribute<int>("audioFormatSampleRate");
+    }
+    static const char* voxaneMetaDataKey() { return "voxaneAttribute"; }
+    boost::shared_ptr<Attribute<bool>> voxaneMetaDataAttribute() {
+        return attributeOrAdd<bool>(voxaneMetaDataKey(), false);
+    }
+
+    // Timeline and clipboard
+    virtual boost::shared_ptr<GenericMixer> newMixer(const std::string& name) = 0;
+    virtual void removeMixer(const MixerPtr& mixer) = 0;
+    virtual void addClipping(const MixerPtr& clipping) = 0;
+    virtual bool removeClipping(const MixerPtr& clipping) = 0;
+
+    // Commands. execute (from CommandExecutor) first runs the follow-ups
+    // queued while the history was idle (a host editing a magnetic track
+    // directly), each a step of its own, then the command and its follow-ups.
+
+    /// False when the command refused to undo: both stacks stay as they were.
+    /// Throws VelaMediaLibException "no commands to undo".
+    virtual bool undo() = 0;
+    /// False when the command refused to redo. Throws "no commands to redo".
+    virtual bool redo() = 0;
+    virtual void combineLastCommands() = 0;
+    /// The next command that takes effect is folded into the last step; the
+    /// follow-ups it causes stay steps of their own. Kept by the history.
+    virtual void combineNextCommand() = 0;
+    /// Until the end, every step that takes effect after the first (follow-ups
+    /// included) is folded into one.
+    virtual void beginAutoCommandCombining() = 0;
+    virtual void endAutoCommandCombining() = 0;
+    virtual bool isAutoCommandCombining() const = 0;
+    virtual CommandHistoryState commandState() const = 0;
+    virtual void restoreCommandState(const CommandHistoryState& state) = 0;
+    virtual void setCommandHandler(CommandHandler* handler) = 0;
+    /// Observers told after every execute, undo and redo.
+    virtual void attachCommandObserver(Observer* observer) = 0;
+    virtual void detachCommandObserver(Observer* observer) = 0;
+    virtual CommandHandler& edgeModCommandHandler() = 0;
+
+    /// True while a document is being read into the project.
+    virtual bool parsingProject() const = 0;
+    virtual void setParsingProject(bool parsing) = 0;
+};
+
+typedef boost::shared_ptr<Project> ProjectPtr;
+
+} // namespace VelaMediaLib

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <VelaMediaLib/base/VelaObject.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
+
+#include <boost/shared_ptr.hpp>
+#include <vector>
+
+namespace VelaMediaLib {
+
+class Source;
+
+/// The project's imported sources, in the order they came.
+class SourceBin : public VelaObject {
+public:
+    explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+
+    std::vector<boost::shared_ptr<Source>> sources() const {
+        ScopedReadLock lock(token_);
+        return sources_;
+    }
+    size_t size() const {
+        ScopedReadLock lock(token_);
+        return sources_.size();
+    }
+
+private:
+    boost::weak_ptr<const ThreadSafe> token_;
+    std::vector<boost::shared_ptr<Source>> sources_;
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <VelaMediaLib/model/timeline/Mixer.h>
+
+#include <algorithm>
+
+namespace VelaMediaLib {
+
+/// The project's clipboard: clippings, each a copied portion of tracks.
+class ClipBoard : public VelaObject {
+public:
+    explicit ClipBoard(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+
+    void addClipping(const MixerPtr& clipping) {
+        ScopedWriteLock lock(token_);
+        clippings_.push_back(clipping);
+    }
+    /// Returns whether the clipboard held it.
+    bool removeClipping(const MixerPtr& clipping) {
+        ScopedWriteLock lock(token_);
+        const auto found = std::find(clippings_.begin(), clippings_.end(), clipping);
+        if (found == clippings_.end()) return false;
+        clippings_.erase(found);
+        return true;
+    }
+    std::vector<MixerPtr> clippings() const {
+        ScopedReadLock lock(token_);
+        return clippings_;
+    }
+
+private:
+    boost::weak_ptr<const ThreadSafe> token_;
+    std::vector<MixerPtr> clippings_;
+};
+
+} // namespace VelaMediaLib

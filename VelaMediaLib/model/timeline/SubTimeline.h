@@ -1,0 +1,28 @@
+#pragma once
+
+#include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/time/parameters/Attributable.h>
+#include <VelaMediaLib/base/Identified.h>
+#include <VelaMediaLib/time/parameters/Parametric.h>
+#include <VelaMediaLib/model/project/SubProject.h>
+#include <VelaMediaLib/model/media/Temporal.h>
+#include <VelaMediaLib/time/sync/Observable.h>
+
+namespace VelaMediaLib {
+
+/// What clips, tracks and mixers have in common: they are parts of a project
+/// that can be observed, carry parameters, effects and attributes, stand in
+/// time and have a name.
+class SubTimeline : public SubProject,
+                    public Observable,
+                    public Parametric,
+                    public Effectable,
+                    public Attributable,
+                    public Temporal,
+                    public Identified {
+public:
+    explicit SubTimeline(const boost::weak_ptr<const ThreadSafe>& token)
+        : SubProject(token), Parametric(token), Attributable(token) {}
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,83 @@
+#pragma once
+
+#include <VelaMediaLib/effects/EffectList.h>
+#include <VelaMediaLib/model/timeline/SubTimeline.h>
+#include <VelaMediaLib/time/sync/Subject.h>
+
+namespace VelaMediaLib {
+
+/// What every concrete SubTimeline (clip, track, mixer) implements the same
+/// way: observation through a subject, an ordered effect list, and a name.
+/// Observers are told the object itself (the subject names it its owner).
+/// A change that changes nothing (the same name, an effect swapped with
+/// itself) notifies nobody.
+/// Interface is SubTimeline or an interface derived from it, held as a
+/// virtual base so that clip families can share it.
+template <typename Interface>
+class SubTimelineParts : public virtual Interface {
+public:
+    typedef Effectable::EffectPtr EffectPtr;
+    typedef Effectable::Effects Effects;
+
+    explicit SubTimelineParts(const boost::weak_ptr<const ThreadSafe>& token)
+        : Interface(token), subject_(token), effects_(token) {
+        subject_.setOwner(this);
+    }
+
+    void attach(Observer* observer) override { subject_.attach(observer); }
+    void attachWithoutNotifyDelay(Observer* observer) override {
+        subject_.attachWithoutNotifyDelay(observer);
+    }
+    void detach(Observer* observer) override { subject_.detach(observer); }
+    void notify() override { subject_.notify(); }
+
+    std::string identifier() const override {
+        ScopedReadLock lock(this->projectMutex());
+        return identifier_;
+    }
+    void setIdentifier(const std::string& identifier) override {
+        {
+            ScopedWriteLock lock(this->projectMutex());
+            if (identifier_ == identifier) return;
+            identifier_ = identifier;
+        }
+        notify();
+    }
+
+    void addEffect(const EffectPtr& effect) override {
+        effects_.add(effect);
+        notify();
+    }
+    void insertEffect(const EffectPtr& effect, size_t index) override {
+        effects_.insert(effect, index);
+        notify();
+    }
+    bool removeEffect(const EffectPtr& effect) override {
+        if (!effects_.remove(effect)) return false;
+        notify();
+        return true;
+    }
+    void swapEffectOrder(size_t first, size_t second) override {
+        if (effects_.swap(first, second)) notify();
+    }
+    EffectPtr effectAtIndex(size_t index) const override { return effects_.at(index); }
+    size_t numEffects() const override { return effects_.size(); }
+    Effects allEffects() const override { return effects_.all(); }
+    typename Effects::iterator effectBegin() override { return effects_.begin(); }
+    typename Effects::iterator effectEnd() override { return effects_.end(); }
+    typename Effects::const_iterator effectBegin() const override { return effects_.begin(); }
+    typename Effects::const_iterator effectEnd() const override { return effects_.end(); }
+    Effects effectsWithName(const std::string& name) override { return effects_.withName(name); }
+    Effects effectsWithName(const std::string& name) const override { return effects_.withName(name); }
+
+protected:
+    EffectList& effectList() { return effects_; }
+    const EffectList& effectList() const { return effects_; }
+
+private:
+    Subject subject_;
+    EffectList effects_;
+    std::string identifier_;
+};
+
+} // namespace VelaMediaLib

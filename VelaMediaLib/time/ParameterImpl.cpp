@@ -1,9 +1,0 @@
-#include <VelaMediaLib/time/ParameterImpl.h>
-
-namespace VelaMediaLib {
-
-#define VELA_INSTANTIATE_PARAMETER(Type) template class ParameterImpl<Type>;
-VELA_FOR_EACH_PARAMETER_TYPE(VELA_INSTANTIATE_PARAMETER)
-#undef VELA_INSTANTIATE_PARAMETER
-
-} // namespace VelaMediaLib

@@ -1,9 +1,0 @@
-#include <VelaMediaLib/time/ThreadSafe.h>
-
-namespace VelaMediaLib {
-
-// The delay state goes with the project; subjects still held back are not
-// touched, since they may be going away on other threads at the same time.
-ThreadSafe::~ThreadSafe() = default;
-
-} // namespace VelaMediaLib

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <VelaMediaLib/time/interpolaters/Interpolater.h>
+#include <VelaMediaLib/time/parameters/Tween.h>
+
+namespace VelaMediaLib {
+
+/// The kinds that blend the two values by an easing weight:
+/// u = (t - t0) / (t1 - t0), w = ease(u), value = w*b + (1 - w)*a.
+template <typename T>
+class TweenableInterpolater : public Interpolater<T> {
+public:
+    T doInterpolate(const T& a, const T& b, const RationalTime& t0, const RationalTime& t1,
+                    double t) const override {
+        const double start = t0.asDouble(), end = t1.asDouble();
+        const double u = end == start ? 1.0 : (t - start) / (end - start);
+        return Tween::blend(a, b, this->ease(u));
+    }
+
+protected:
+    using Interpolater<T>::Interpolater;
+};
+
+} // namespace VelaMediaLib

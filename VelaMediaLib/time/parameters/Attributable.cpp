@@ -1,0 +1,40 @@
+#include <VelaMediaLib/time/parameters/Attributable.h>
+
+#include <VelaMediaLib/document/format/JSONWriter.h>
+
+namespace VelaMediaLib {
+
+Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
+    ScopedReadLock lock(attributesToken_);
+    return attributes_.find(name);
+}
+
+Attributable::AttributePtr Attributable::insertAttribute(const AttributePtr& attribute) {
+    ScopedWriteLock lock(attributesToken_);
+    return attributes_.insertIfAbsent(attribute->name(), attribute);
+}
+
+Attributable::AttributePtr Attributable::insertAttributeIfAbsent(const AttributePtr& attribute) {
+    ScopedReadLock lock(attributesToken_);
+    return attributes_.insertIfAbsent(attribute->name(), attribute);
+}
+
+std::vector<std::string> Attributable::attributeNames() const {
+    ScopedReadLock lock(attributesToken_);
+    std::vector<std::string> names;
+    attributes_.forEach([&](const std::string& name, const AttributePtr&) { names.push_back(name); });
+    return names;
+}
+
+void Attributable::writeAttributes(JSONWriter& writer) const {
+    for (const std::string& name : attributeNames()) findAttribute(name)->writeValue(writer.key(name));
+}
+
+void Attributable::copyAttributesTo(Attributable& other) const {
+    ScopedReadLock lock(attributesToken_);
+    attributes_.forEach([&](const std::string& name, const AttributePtr& attribute) {
+        other.attributes_.set(name, attribute->cloneAttribute(other.attributesToken_));
+    });
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,65 @@
+#pragma once
+
+#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/time/sync/ReadWriteMutex.h>
+#include <VelaMediaLib/time/sync/Subject.h>
+
+#include <boost/enable_shared_from_this.hpp>
+#include <boost/shared_ptr.hpp>
+#include <string>
+
+namespace VelaMediaLib {
+
+/// The type-independent face of an attribute: its name and its value as
+/// document text. Attributes are held by shared pointer; that pointer is
+/// their lifeline.
+class AttributeInterface : public Subject, public boost::enable_shared_from_this<AttributeInterface> {
+public:
+    using Subject::Subject;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
+    virtual const std::string& name() const = 0;
+    virtual void writeValue(std::ostream& out) const = 0;
+    /// A new attribute with the same name and value, for another object.
+    virtual boost::shared_ptr<AttributeInterface>
+    cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const = 0;
+};
+
+/// A named value that tells its observers when it changes. Reads take the
+/// project's read lock and writes its write lock; setting the value it
+/// already has changes nothing and tells nobody.
+template <typename T>
+class Attribute : public AttributeInterface {
+public:
+    Attribute(std::string name, T value,
+              const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())
+        : AttributeInterface(token), name_(std::move(name)), value_(std::move(value)) {}
+
+    const std::string& name() const override { return name_; }
+    void writeValue(std::ostream& out) const override { ValueFormatter<T>::write(out, value()); }
+    boost::shared_ptr<AttributeInterface>
+    cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const override {
+        return boost::shared_ptr<AttributeInterface>(new Attribute(name_, value(), token));
+    }
+
+    T value() const {
+        ScopedReadLock lock(projectMutex());
+        return value_;
+    }
+
+    /// Returns whether the value changed.
+    bool setValue(const T& value) {
+        {
+            ScopedWriteLock lock(projectMutex());
+            if (value_ == value) return false;
+            value_ = value;
+        }
+        notify();
+        return true;
+    }
+
+private:
+    const std::string name_;
+    T value_;
+};
+
+} // namespace VelaMediaLib

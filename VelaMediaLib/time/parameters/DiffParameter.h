@@ -1,0 +1,204 @@
+#pragma once
+
+#include <VelaMediaLib/time/parameters/ParameterImpl.h>
+
+#include <set>
+
+namespace VelaMediaLib {
+
+/// A parameter expressed as a difference from a source parameter: its own
+/// keyframes ("edits", which override the source's at the same time), the
+/// source keyframe times it drops ("deletions"), and whether it ignores the
+/// source altogether. Its curve is the source's with the difference applied,
+/// and follows the source when the source changes. Any edit made through the
+/// parameter's operations is kept as a difference.
+template <typename T>
+class DiffParameter : public ParameterImpl<T> {
+public:
+    typedef ParameterImpl<T> Base;
+    typedef typename Base::KeyFrameMap KeyFrameMap;
+    typedef typename Base::MapUtil MapUtil;
+
+    DiffParameter(
+        const boost::weak_ptr<const ThreadSafe>& token, const std::string& identifier,
+        const boost::shared_ptr<Parameter<T>>& source,
+        const boost::shared_ptr<const TimeScalable>& scalable = boost::shared_ptr<const TimeScalable>())
+        : Base(token, identifier, scalable), source_(source), sourceObserver_(*this) {
+        if (source_) source_->attach(&sourceObserver_);
+        rebuild();
+    }
+    DiffParameter(const DiffParameter& other)
+        : Base(other), source_(other.source_), edits_(cloneAll(other.edits_)), deletions_(other.deletions_),
+          ignoreSource_(other.ignoreSource_), sourceObserver_(*this) {
+        if (source_) source_->attach(&sourceObserver_);
+    }
+    ~DiffParameter() override {
+        if (source_) source_->detach(&sourceObserver_);
+    }
+
+    static boost::shared_ptr<DiffParameter> create(const boost::weak_ptr<const ThreadSafe>& token,
+                                                   const std::string& identifier,
+                                                   const boost::shared_ptr<Parameter<T>>& source) {
+        return boost::shared_ptr<DiffParameter>(new DiffParameter(token, identifier, source));
+    }
+
+    boost::shared_ptr<Parameter<T>> source() const { return source_; }
+    bool ignoreSource() const {
+        ScopedReadLock lock(this->projectMutex());
+        return ignoreSource_;
+    }
+    void setIgnoreSource(bool ignore) {
+        this->edit([&] {
+            ignoreSource_ = ignore;
+            rebuild();
+        });
+    }
+    /// Times of this parameter's own keyframes.
+    std::vector<RationalTime> editTimes() const {
+        ScopedReadLock lock(this->projectMutex());
+        std::vector<RationalTime> times;
+        for (const auto& entry : edits_) times.push_back(entry.time);
+        return times;
+    }
+    std::set<RationalTime> deletions() const {
+        ScopedReadLock lock(this->projectMutex());
+        return deletions_;
+    }
+    /// Recomputes the curve from the source; the source's changes call it.
+    void refreshFromSource() {
+        this->edit([&] { rebuild(); });
+    }
+
+protected:
+    boost::shared_ptr<Base> cloneImpl() const override {
+        return boost::shared_ptr<Base>(new DiffParameter(*this));
+    }
+    void keyframesEdited() override { recomputeDifference(); }
+    bool writtenBare(const std::string&, const std::string&) const override { return false; }
+
+    void writeKeyFrames(JSONWriter& object) const override {
+        object.key("edits");
+        {
+            JSONWriter edits(object.options(), object.memberLevel(), JSONWriter::Array);
+            for (const auto& entry : edits_) {
+                edits.element();
+                JSONWriter edit(object.options(), edits.memberLevel());
+                ValueFormatter<RationalTime>::write(edit.key("time"), entry.time);
+                ValueFormatter<T>::write(edit.key("value"), entry.keyframe->value());
+                if (entry.keyframe->duration() != RationalTime(0))
+                    ValueFormatter<RationalTime>::write(edit.key("duration"), entry.keyframe->duration());
+                const std::string interp = entry.keyframe->interpolaterName();
+                if (!interp.empty()) edit.key("interp") << entry.keyframe->interpolater()->asJson();
+            }
+        }
+        object.key("deletions");
+        {
+            JSONWriter deletions(object.options(), object.memberLevel(), JSONWriter::Array);
+            for (const RationalTime& time : deletions_)
+                ValueFormatter<RationalTime>::write(deletions.element(), time);
+        }
+        object.key("ignoreSource") << (ignoreSource_ ? "true" : "false");
+    }
+
+    void readKeyFrames(const Json::Value& json) override {
+        KeyFrameMap edits;
+        for (const Json::Value& entry : json["edits"]) {
+            if (!entry.isObject() || !entry.isMember("time") || !entry.isMember("value"))
+                throw ParserException("Invalid project json - an edit of " + this->identifier() +
+                                      " needs a time and a value");
+            const RationalTime time = JSONReader::jsonValueAsRationalTime(entry["time"]);
+            const RationalTime leadIn = entry.isMember("duration")
+                                            ? JSONReader::jsonValueAsRationalTime(entry["duration"])
+                                            : RationalTime(0);
+            if (leadIn < RationalTime(0))
+                throw ParserException("Invalid project json - an edit of " + this->identifier() +
+                                      " has a negative duration");
+            const typename Base::KeyFramePtr keyframe =
+                this->newKeyFrame(time, ValueFormatter<T>::read(entry["value"]), leadIn);
+            if (entry.isMember("interp"))
+                keyframe->setInterpolater(InterpolaterFactory<T>::byName(
+                    ParameterDocument::requiredString(entry["interp"], "interp")));
+            MapUtil::put(edits, time, keyframe);
+        }
+        std::set<RationalTime> deletions;
+        for (const Json::Value& time : json["deletions"])
+            deletions.insert(JSONReader::jsonValueAsRationalTime(time));
+        edits_.swap(edits);
+        deletions_.swap(deletions);
+        ignoreSource_ = json["ignoreSource"].isBool() && json["ignoreSource"].asBool();
+        rebuild();
+    }
+
+    void takeStateFrom(Base& read) override {
+        Base::takeStateFrom(read);
+        DiffParameter& other = static_cast<DiffParameter&>(read);
+        edits_.swap(other.edits_);
+        deletions_.swap(other.deletions_);
+        ignoreSource_ = other.ignoreSource_;
+    }
+
+private:
+    struct SourceObserver : Observer {
+        explicit SourceObserver(DiffParameter& owner_) : owner(owner_) {}
+        void update(Observable*) override { owner.refreshFromSource(); }
+        DiffParameter& owner;
+    };
+
+    static KeyFrameMap cloneAll(const KeyFrameMap& map) {
+        KeyFrameMap copy;
+        for (const auto& entry : map) copy.push_back({entry.time, entry.keyframe->clone()});
+        return copy;
+    }
+
+    KeyFrameMap sourceKeyFrames() const {
+        KeyFrameMap keyframes;
+        if (!source_ || ignoreSource_) return keyframes;
+        const boost::shared_ptr<std::vector<RationalTime>> times = source_->keyframeTimes();
+        for (const RationalTime& time : *times)
+            keyframes.push_back({time, source_->keyframeAtTime(time)->clone()});
+        return keyframes;
+    }
+
+    // The curve: the source's keyframes less the deletions, with the edits on
+    // top. An edit's lead-in that would now reach back past a keyframe of the
+    // source is cut to start at that keyframe, so the curve keeps to the
+    // placement rule (and reads back as written) with the same values.
+    void rebuild() {
+        KeyFrameMap merged;
+        for (const auto& entry : sourceKeyFrames())
+            if (!deletions_.count(entry.time)) merged.push_back(entry);
+        for (const auto& entry : edits_) MapUtil::put(merged, entry.time, entry.keyframe->clone());
+        Base::cutLeadInsToTheirSegments(merged);
+        this->keyframes_.swap(merged);
+    }
+
+    static bool sameKeyFrame(const KeyFrame<T>& a, const KeyFrame<T>& b) {
+        return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() &&
+               a.interpolaterName() == b.interpolaterName();
+    }
+
+    // After an edit of the curve: what differs from the source becomes the difference.
+    void recomputeDifference() {
+        const KeyFrameMap source = sourceKeyFrames();
+        KeyFrameMap edits;
+        std::set<RationalTime> deletions;
+        for (const auto& entry : this->keyframes_) {
+            const auto match = MapUtil::find(source, entry.time);
+            if (match == source.end() || !sameKeyFrame(*match->keyframe, *entry.keyframe))
+                edits.push_back({entry.time, entry.keyframe->clone()});
+        }
+        for (const auto& entry : source)
+            if (MapUtil::find(this->keyframes_, entry.time) == this->keyframes_.end())
+                deletions.insert(entry.time);
+        edits_.swap(edits);
+        deletions_.swap(deletions);
+    }
+
+    boost::shared_ptr<Parameter<T>> source_;
+    KeyFrameMap edits_;
+    std::set<RationalTime> deletions_;
+    bool ignoreSource_ = false;
+    SourceObserver sourceObserver_;
+};
+
+} // namespace VelaMediaLib

@@ -1,0 +1,90 @@
+#include <VelaMediaLib/time/parameters/MetaDatable.h>
+
+#include <VelaMediaLib/document/format/JSONWriter.h>
+#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
+
+namespace VelaMediaLib {
+
+MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+
+MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const std::string& value) {
+    AttributePtr attribute;
+    {
+        ScopedWriteLock lock(token_);
+        if (!metaData_) metaData_.reset(new Map);
+        AttributePtr& slot = (*metaData_)[key];
+        if (!slot) {
+            slot.reset(new Attribute<std::string>(key, value, token_));
+            return slot;
+        }
+        attribute = slot;
+    }
+    attribute->setValue(value);
+    return attribute;
+}
+
+MetaDatable::AttributePtr MetaDatable::metaDataAttribute(const std::string& key) const {
+    ScopedReadLock lock(token_);
+    if (!metaData_) return AttributePtr();
+    const auto found = metaData_->find(key);
+    return found == metaData_->end() ? AttributePtr() : found->second;
+}
+
+std::string MetaDatable::metaDataValue(const std::string& key) const {
+    const AttributePtr attribute = metaDataAttribute(key);
+    return attribute ? attribute->value() : std::string();
+}
+
+bool MetaDatable::hasMetaData(const std::string& key) const { return bool(metaDataAttribute(key)); }
+
+bool MetaDatable::removeMetaData(const std::string& key) {
+    ScopedWriteLock lock(token_);
+    return metaData_ && metaData_->erase(key) > 0;
+}
+
+std::vector<std::string> MetaDatable::metaDataKeys() const {
+    ScopedReadLock lock(token_);
+    std::vector<std::string> keys;
+    if (metaData_)
+        for (const auto& entry : *metaData_) keys.push_back(entry.first);
+    return keys;
+}
+
+ReadWriteMutex* MetaDatable::metaDataMutex() const {
+    const boost::shared_ptr<const ThreadSafe> project = token_.lock();
+    return project ? &project->mutex() : nullptr;
+}
+
+void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
+    ScopedWriteLock lock(token_);
+    token_ = token;
+    if (metaData_)
+        for (auto& entry : *metaData_) entry.second->setProjectMutex(token);
+}
+
+std::map<std::string, std::string> MetaDatable::metaDataCopy() const {
+    ScopedReadLock lock(token_);
+    std::map<std::string, std::string> copy;
+    if (metaData_)
+        for (const auto& entry : *metaData_) copy[entry.first] = entry.second->value();
+    return copy;
+}
+
+void MetaDatable::toJSON(JSONWriter& writer, const MetaDatable& object) {
+    const std::map<std::string, std::string> entries = object.metaDataCopy();
+    if (entries.empty()) return;
+    writer.key("metadata");
+    JSONWriter members(writer.options(), writer.memberLevel());
+    for (const auto& entry : entries) members.key(entry.first) << quotedJSONString(entry.second);
+}
+
+void MetaDatable::readFromJSON(const Json::Value& value, MetaDatable& object) {
+    const Json::Value& metadata = value["metadata"];
+    if (!metadata.isObject()) return;
+    for (const std::string& key : metadata.getMemberNames())
+        object.addMetaData(key,
+                           metadata[key].isString() ? metadata[key].asString() : compactJSON(metadata[key]));
+}
+
+} // namespace VelaMediaLib

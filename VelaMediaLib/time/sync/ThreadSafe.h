@@ -1,0 +1,27 @@
+#pragma once
+
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
+#include <VelaMediaLib/time/sync/ReadWriteMutex.h>
+
+namespace VelaMediaLib {
+
+/// The thread-safety token: the project derives from it, so the project itself
+/// is the token every model object holds (weakly) to find the project's lock.
+/// It also keeps the project's notify-delay state, so that state goes with it.
+class ThreadSafe {
+public:
+    ThreadSafe() = default;
+    virtual ~ThreadSafe();
+    ThreadSafe(const ThreadSafe&) = delete;
+    ThreadSafe& operator=(const ThreadSafe&) = delete;
+
+    ReadWriteMutex& mutex() const { return mutex_; }
+
+private:
+    friend class NotifyDelay;
+
+    mutable ReadWriteMutex mutex_;
+    mutable NotifyDelayState notifyDelayState_;
+};
+
+} // namespace VelaMediaLib
