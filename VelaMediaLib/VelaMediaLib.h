@@ -35,8 +35,8 @@
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/commands/framework/NullCmd.h>
 #include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
-#include <VelaMediaLib/document/format/ValueFormatter.h>
 #include <VelaMediaLib/document/format/VersionInfo.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/effects/Effect.h>
@@ -90,7 +90,6 @@
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
-#include <VelaMediaLib/time/interpolaters/InterpolaterValueFormatter.h>
 #include <VelaMediaLib/time/interpolaters/LeftInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/LinearInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/SpringInterpolater.h>
@@ -109,11 +108,9 @@
 #include <VelaMediaLib/time/parameters/Parameter.h>
 #include <VelaMediaLib/time/parameters/ParameterImpl.h>
 #include <VelaMediaLib/time/parameters/ParameterInterface.h>
-#include <VelaMediaLib/time/parameters/ParameterTraits.h>
-#include <VelaMediaLib/time/parameters/ParameterTypes.h>
 #include <VelaMediaLib/time/parameters/Parametric.h>
 #include <VelaMediaLib/time/parameters/SymbolTable.h>
-#include <VelaMediaLib/time/parameters/Tween.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 #include <VelaMediaLib/time/parameters/VectorParam.h>
 #include <VelaMediaLib/time/rational/ProjectEditRate.h>
 #include <VelaMediaLib/time/rational/Range.h>

@@ -18,7 +18,7 @@ Json::Value parameterList(const Parametric& object) {
     {
         XMLOptions options(out);
         JSONWriter root(options, 0);
-        object.toJSONParameterList(root);
+        object.toJSONParameterList(options, root.memberLevel());
     }
     return VelaMediaLib::testing::parseJson(out.str())["parameters"];
 }

@@ -1,6 +1,6 @@
 #include <VelaMediaLib/document/format/JSONReader.h>
 
-#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <stdexcept>

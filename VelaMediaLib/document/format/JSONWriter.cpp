@@ -44,34 +44,16 @@ std::string quotedJSONString(const std::string& text) {
 
 std::string keyName(const std::string& key) { return quotedJSONString(key) + " : "; }
 
-JSONWriter::JSONWriter(XMLOptions& options, int level, Kind kind)
-    : options_(options), level_(level), kind_(kind) {
-    options_.stream() << (kind_ == Object ? "{\n" : "[\n");
+JSONWriter::JSONWriter(XMLOptions& options, int level, Kind kind) : options_(options), level_(level) {
+    options_.openContainer(level_, kind == Array);
 }
 
 JSONWriter::~JSONWriter() { close(); }
 
-void JSONWriter::separate() {
-    if (!empty_) options_.stream() << ",\n";
-    empty_ = false;
-    options_.stream() << options_.indentation(level_ + 1);
-}
-
-std::ostream& JSONWriter::key(const std::string& name) {
-    separate();
-    return options_.stream() << keyName(name);
-}
-
-std::ostream& JSONWriter::element() {
-    separate();
-    return options_.stream();
-}
-
 void JSONWriter::close() {
     if (closed_) return;
     closed_ = true;
-    if (!empty_) options_.stream() << "\n";
-    options_.stream() << options_.indentation(level_) << (kind_ == Object ? "}" : "]");
+    options_.closeContainer();
 }
 
 } // namespace VelaMediaLib

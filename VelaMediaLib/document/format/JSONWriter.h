@@ -3,6 +3,15 @@
 // break, members are separated by "," and a line break, a key is written as
 // "\"key\" : ", and closing brackets stand on their own line at the level of
 // the opening key.
+//
+// Every writer has one shape: f(XMLOptions& options, int indent, ...), where
+// indent is the level it writes at. A writer of a whole object or array
+// (Media::toJSON, KeyFrameInterface::toJSON) opens it where the text stands,
+// puts its members at indent + 1 and its closing bracket at indent; a writer
+// of members (toJSONTemporalValues, toJSONParameterList, MetaDatable::toJSON)
+// or of a value writes at indent, the level of the object's members. The
+// options keep the objects and arrays open, so options.key() and
+// options.element() put the separator and the indentation in.
 
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
@@ -15,8 +24,8 @@ std::string keyName(const std::string& key);
 /// The text as a JSON string literal, quotes included.
 std::string quotedJSONString(const std::string& text);
 
-/// Writes one JSON object or array whose members stand at level + 1. The
-/// closing bracket is written by close() or, failing that, the destructor.
+/// Keeps one JSON object or array open, its members at level + 1: opens it on
+/// construction and closes it by close() or, failing that, the destructor.
 class JSONWriter {
 public:
     enum Kind { Object, Array };
@@ -26,22 +35,13 @@ public:
     JSONWriter(const JSONWriter&) = delete;
     JSONWriter& operator=(const JSONWriter&) = delete;
 
-    /// Starts the next object member: separator, indentation and key.
-    std::ostream& key(const std::string& name);
-    /// Starts the next array element: separator and indentation.
-    std::ostream& element();
-    /// The level of the members, for nested writers.
+    /// The level of the members, for the writers of the members.
     int memberLevel() const { return level_ + 1; }
-    XMLOptions& options() { return options_; }
     void close();
 
 private:
-    void separate();
-
     XMLOptions& options_;
     int level_;
-    Kind kind_;
-    bool empty_ = true;
     bool closed_ = false;
 };
 

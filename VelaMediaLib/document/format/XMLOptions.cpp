@@ -1,11 +1,44 @@
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
+#include <VelaMediaLib/document/format/JSONWriter.h>
+
 namespace VelaMediaLib {
 
 XMLOptions::XMLOptions(std::ostream& stream, int indentWidth) : stream_(stream), indentWidth_(indentWidth) {}
 
 std::string XMLOptions::indentation(int level) const {
     return std::string(size_t(level > 0 ? level * indentWidth_ : 0), ' ');
+}
+
+void XMLOptions::separate() {
+    if (open_.empty()) return;
+    Container& innermost = open_.back();
+    if (!innermost.empty) stream_ << ",\n";
+    innermost.empty = false;
+    stream_ << indentation(innermost.level + 1);
+}
+
+std::ostream& XMLOptions::key(const std::string& name) {
+    separate();
+    return stream_ << keyName(name);
+}
+
+std::ostream& XMLOptions::element() {
+    separate();
+    return stream_;
+}
+
+void XMLOptions::openContainer(int level, bool array) {
+    stream_ << (array ? "[\n" : "{\n");
+    open_.push_back(Container{level, array, true});
+}
+
+void XMLOptions::closeContainer() {
+    if (open_.empty()) return;
+    const Container closing = open_.back();
+    open_.pop_back();
+    if (!closing.empty) stream_ << "\n";
+    stream_ << indentation(closing.level) << (closing.array ? "]" : "}");
 }
 
 unsigned XMLOptions::assignNewIdent(const void* object) {

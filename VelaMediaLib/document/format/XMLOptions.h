@@ -4,13 +4,16 @@
 #include <map>
 #include <ostream>
 #include <string>
+#include <vector>
 
 namespace VelaMediaLib {
 
 /// The context of one document write: where the text goes, how deep one
-/// indentation level is, the identity table that gives every written object
-/// a fresh "id" (so references name ids of the same write), and the modifier
-/// applied to every file path written.
+/// indentation level is, the objects and arrays open at the moment (so a
+/// writer knows whether a separator comes before the next member), the
+/// identity table that gives every written object a fresh "id" (so references
+/// name ids of the same write), and the modifier applied to every file path
+/// written.
 class XMLOptions {
 public:
     typedef boost::function<std::string(const std::string&)> PathModifier;
@@ -21,6 +24,17 @@ public:
     int indentWidth() const { return indentWidth_; }
     /// The blanks that open a line at the given level.
     std::string indentation(int level) const;
+
+    /// Starts the next member of the innermost open object: separator,
+    /// indentation and key. With nothing open, the key alone.
+    std::ostream& key(const std::string& name);
+    /// Starts the next element of the innermost open array: separator and
+    /// indentation. With nothing open, nothing.
+    std::ostream& element();
+    /// Opens an object or array whose closing bracket stands at the level;
+    /// JSONWriter does this and closeContainer.
+    void openContainer(int level, bool array);
+    void closeContainer();
 
     /// A fresh identifier for the object, remembered for findIdent. Identifiers
     /// count from 1 within one write.
@@ -33,8 +47,16 @@ public:
     std::string modifyPath(const std::string& path) const;
 
 private:
+    struct Container {
+        int level;
+        bool array;
+        bool empty;
+    };
+    void separate();
+
     std::ostream& stream_;
     int indentWidth_;
+    std::vector<Container> open_;
     unsigned nextIdent_ = 1;
     std::map<const void*, unsigned> idents_;
     PathModifier pathModifier_;

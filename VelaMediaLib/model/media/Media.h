@@ -16,7 +16,6 @@
 namespace VelaMediaLib {
 
 class ConstMediaDispatcher;
-class JSONWriter;
 class MediaDispatcher;
 class MediaEditor;
 class RationalMediaEditor;
@@ -112,9 +111,11 @@ public:
     virtual void mediaSourceChanged() {}
     /// The transition covering the tick, if any.
     virtual TransitionPtr transitionAtTime(VelaTime time) const = 0;
-    virtual void toJSONTemporalValues(JSONWriter& writer) const = 0;
+    /// Writers (see JSONWriter.h): the clip's object, closed at indent; its
+    /// temporal values and its kind's own members, written at indent.
+    virtual void toJSONTemporalValues(XMLOptions& options, int indent) const = 0;
     virtual void toJSON(XMLOptions& options, int indent) const = 0;
-    virtual void toJSONSpecificProperties(JSONWriter&) const {}
+    virtual void toJSONSpecificProperties(XMLOptions&, int) const {}
     /// The right transition and the clip on its other side, which a split or a merge carries over.
     virtual TransitionAndNeighbour splitMergeTransitions() const = 0;
     /// Timing edits. On a track they go through the track, which refuses a

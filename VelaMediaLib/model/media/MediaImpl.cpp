@@ -1,5 +1,6 @@
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/model/media/MediaEditor.h>
@@ -342,29 +343,37 @@ void MediaImpl::setupSharedClone(const boost::shared_ptr<Media>& clone) const {
     }
 }
 
-void MediaImpl::toJSONTemporalValues(JSONWriter& writer) const {
+void MediaImpl::toJSONTemporalValues(XMLOptions& options, int indent) const {
     const MediaState s = state();
-    writer.key("start") << s.start;
-    writer.key("duration") << s.duration;
-    ValueFormatter<SafeRational>::write(writer.key("mediaStart"), s.mediaStart);
-    ValueFormatter<SafeRational>::write(writer.key("mediaDuration"), s.mediaDuration);
-    ValueFormatter<SafeRational>::write(writer.key("scalar"), s.scalar);
+    options.key("start");
+    writeJSONValue(options, indent, s.start);
+    options.key("duration");
+    writeJSONValue(options, indent, s.duration);
+    options.key("mediaStart");
+    writeJSONValue(options, indent, s.mediaStart);
+    options.key("mediaDuration");
+    writeJSONValue(options, indent, s.mediaDuration);
+    options.key("scalar");
+    writeJSONValue(options, indent, s.scalar);
 }
 
 void MediaImpl::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
-    object.key("id") << options.assignNewIdent(this);
-    object.key("_type") << quotedJSONString(MediaTypeFromMediaDispatcher::typeOf(*this));
-    object.key("attributes");
+    const int members = object.memberLevel();
+    options.key("id") << options.assignNewIdent(this);
+    options.key("_type");
+    writeJSONValue(options, members, MediaTypeFromMediaDispatcher::typeOf(*this));
+    options.key("attributes");
     {
-        JSONWriter attributes(options, object.memberLevel());
-        attributes.key("ident") << quotedJSONString(identifier());
-        writeAttributes(attributes);
+        JSONWriter attributes(options, members);
+        options.key("ident");
+        writeJSONValue(options, attributes.memberLevel(), identifier());
+        writeAttributes(options, attributes.memberLevel());
     }
-    toJSONSpecificProperties(object);
-    toJSONTemporalValues(object);
-    toJSONParameterList(object);
-    MetaDatable::toJSON(object, *this);
+    toJSONSpecificProperties(options, members);
+    toJSONTemporalValues(options, members);
+    toJSONParameterList(options, members);
+    MetaDatable::toJSON(options, members, *this);
 }
 
 } // namespace VelaMediaLib

@@ -106,7 +106,7 @@ public:
     void setParent(const boost::weak_ptr<SubTimeline>& parent) override;
     boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const override;
     void setupSharedClone(const boost::shared_ptr<Media>& clone) const override;
-    void toJSONTemporalValues(JSONWriter& writer) const override;
+    void toJSONTemporalValues(XMLOptions& options, int indent) const override;
     void toJSON(XMLOptions& options, int indent) const override;
 
 protected:

@@ -1,6 +1,6 @@
 #include <VelaMediaLib/time/interpolaters/BezierInterpolater.h>
 
-#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 
 #include <charconv>

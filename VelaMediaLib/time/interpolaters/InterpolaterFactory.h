@@ -1,10 +1,6 @@
 #pragma once
 
-#include <VelaMediaLib/base/AudioPosition.h>
-#include <VelaMediaLib/base/Point3d.h>
-#include <VelaMediaLib/base/Rect.h>
-#include <VelaMediaLib/base/TemplatedColor.h>
-#include <VelaMediaLib/base/TransformMatrix.h>
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/time/interpolaters/BezierInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/BounceInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/EaseInInterpolater.h>
@@ -14,30 +10,13 @@
 #include <VelaMediaLib/time/interpolaters/LeftInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/LinearInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/SpringInterpolater.h>
-#include <VelaMediaLib/base/VelaMediaLibException.h>
-
-#include <type_traits>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 
 namespace VelaMediaLib {
 
-/// Which interpolater kinds a value type has: every type steps ("left");
-/// numeric and geometric types tween linearly and with the exponential
-/// eases; some of those also have the in-out, bounce and spring curves.
-template <typename T>
-struct InterpolaterKinds {
-    static constexpr bool linear =
-        std::is_same<T, int>::value || std::is_same<T, float>::value || std::is_same<T, double>::value ||
-        std::is_same<T, long long>::value || std::is_same<T, Rect<float>>::value ||
-        std::is_same<T, TemplatedColor<int>>::value || std::is_same<T, AudioPosition>::value ||
-        std::is_same<T, Point3d>::value || std::is_same<T, TransformMatrix>::value;
-    static constexpr bool inOut = std::is_same<T, int>::value || std::is_same<T, float>::value ||
-                                  std::is_same<T, double>::value || std::is_same<T, Rect<float>>::value ||
-                                  std::is_same<T, TemplatedColor<int>>::value ||
-                                  std::is_same<T, Point3d>::value;
-};
-
-/// The shared interpolater of a name for a value type. A name the type does
-/// not have throws ParserException "trying to read an unknown interpolater".
+/// The shared interpolater of a name for a value type, among the kinds its
+/// ValueTraits<T>::interpolation gives it. A name the type does not have
+/// throws ParserException "trying to read an unknown interpolater".
 template <typename T>
 class InterpolaterFactory {
 public:
@@ -52,12 +31,13 @@ public:
     static Pointer find(const std::string& name) {
         typedef InterpolaterNameConstants N;
         if (name == N::s_leftName) return LeftInterpolater<T>::getInstance();
-        if constexpr (InterpolaterKinds<T>::linear) {
+        constexpr Interpolation kinds = ValueTraits<T>::interpolation;
+        if constexpr (kinds >= Interpolation::Eases) {
             if (name == N::s_linearName) return LinearInterpolater<T>::getInstance();
             if (name == N::s_easeInName) return EaseInInterpolater<T>::getInstance();
             if (name == N::s_easeOutName) return EaseOutInterpolater<T>::getInstance();
         }
-        if constexpr (InterpolaterKinds<T>::inOut) {
+        if constexpr (kinds >= Interpolation::Curves) {
             if (name == N::s_easeInOutSinusoidalName)
                 return EaseInOutSinusoidalInterpolater<T>::getInstance();
             if (name == N::s_easeInOutDoubleExponentialSigmoidName)
@@ -65,7 +45,7 @@ public:
             if (name == N::s_bounceName) return BounceInterpolater<T>::getInstance();
             if (name == N::s_springName) return SpringInterpolater<T>::getInstance();
         }
-        if constexpr (std::is_same<T, Point3d>::value) return BezierInterpolater::fromName(name);
+        if constexpr (kinds == Interpolation::Paths) return BezierInterpolater::fromName(name); // positions
         return Pointer();
     }
 
@@ -77,7 +57,7 @@ public:
 
 private:
     static Pointer makeDefault() {
-        if constexpr (InterpolaterKinds<T>::linear)
+        if constexpr (ValueTraits<T>::interpolation != Interpolation::Step)
             return LinearInterpolater<T>::getInstance();
         else
             return LeftInterpolater<T>::getInstance();

@@ -1,7 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
-#include <VelaMediaLib/time/parameters/Tween.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 
 namespace VelaMediaLib {
 
@@ -9,12 +9,14 @@ namespace VelaMediaLib {
 /// u = (t - t0) / (t1 - t0), w = ease(u), value = w*b + (1 - w)*a.
 template <typename T>
 class TweenableInterpolater : public Interpolater<T> {
+    static_assert(ValueTraits<T>::interpolation != Interpolation::Step, "the value type does not tween");
+
 public:
     T doInterpolate(const T& a, const T& b, const RationalTime& t0, const RationalTime& t1,
                     double t) const override {
         const double start = t0.asDouble(), end = t1.asDouble();
         const double u = end == start ? 1.0 : (t - start) / (end - start);
-        return Tween::blend(a, b, this->ease(u));
+        return ValueTraits<T>::blend(a, b, this->ease(u));
     }
 
 protected:

@@ -26,8 +26,11 @@ std::vector<std::string> Attributable::attributeNames() const {
     return names;
 }
 
-void Attributable::writeAttributes(JSONWriter& writer) const {
-    for (const std::string& name : attributeNames()) findAttribute(name)->writeValue(writer.key(name));
+void Attributable::writeAttributes(XMLOptions& options, int indent) const {
+    for (const std::string& name : attributeNames()) {
+        options.key(name);
+        findAttribute(name)->writeValue(options, indent);
+    }
 }
 
 void Attributable::copyAttributesTo(Attributable& other) const {

@@ -8,7 +8,7 @@
 
 namespace VelaMediaLib {
 
-class JSONWriter;
+class XMLOptions;
 
 /// Named, typed, observable attributes of a model object ("width", "mixToMono",
 /// a track's "solo"). Each name holds one type; asking for it as another type
@@ -56,8 +56,9 @@ public:
 
     bool hasAttribute(const std::string& name) const { return bool(findAttribute(name)); }
     std::vector<std::string> attributeNames() const;
-    /// Writes each attribute as a member of the object being written.
-    void writeAttributes(JSONWriter& writer) const;
+    /// Writes each attribute as a member of the object being written, its
+    /// members at indent.
+    void writeAttributes(XMLOptions& options, int indent) const;
 
 protected:
     /// For an owner that learns its project's token after construction (the project itself).

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 #include <VelaMediaLib/time/sync/Subject.h>
 
@@ -18,7 +18,8 @@ public:
     using Subject::Subject;
     boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
     virtual const std::string& name() const = 0;
-    virtual void writeValue(std::ostream& out) const = 0;
+    /// Writes the value, in its type's document form.
+    virtual void writeValue(XMLOptions& options, int indent) const = 0;
     /// A new attribute with the same name and value, for another object.
     virtual boost::shared_ptr<AttributeInterface>
     cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const = 0;
@@ -35,7 +36,9 @@ public:
         : AttributeInterface(token), name_(std::move(name)), value_(std::move(value)) {}
 
     const std::string& name() const override { return name_; }
-    void writeValue(std::ostream& out) const override { ValueFormatter<T>::write(out, value()); }
+    void writeValue(XMLOptions& options, int indent) const override {
+        ValueTraits<T>::write(options, indent, value());
+    }
     boost::shared_ptr<AttributeInterface>
     cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const override {
         return boost::shared_ptr<AttributeInterface>(new Attribute(name_, value(), token));

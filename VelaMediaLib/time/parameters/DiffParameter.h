@@ -76,28 +76,40 @@ protected:
     void keyframesEdited() override { recomputeDifference(); }
     bool writtenBare(const std::string&, const std::string&) const override { return false; }
 
-    void writeKeyFrames(JSONWriter& object) const override {
-        object.key("edits");
+    void writeKeyFrames(XMLOptions& options, int indent) const override {
+        options.key("edits");
         {
-            JSONWriter edits(object.options(), object.memberLevel(), JSONWriter::Array);
+            JSONWriter edits(options, indent, JSONWriter::Array);
             for (const auto& entry : edits_) {
-                edits.element();
-                JSONWriter edit(object.options(), edits.memberLevel());
-                ValueFormatter<RationalTime>::write(edit.key("time"), entry.time);
-                ValueFormatter<T>::write(edit.key("value"), entry.keyframe->value());
-                if (entry.keyframe->duration() != RationalTime(0))
-                    ValueFormatter<RationalTime>::write(edit.key("duration"), entry.keyframe->duration());
-                const std::string interp = entry.keyframe->interpolaterName();
-                if (!interp.empty()) edit.key("interp") << entry.keyframe->interpolater()->asJson();
+                options.element();
+                writeEdit(options, edits.memberLevel(), entry.time, *entry.keyframe);
             }
         }
-        object.key("deletions");
+        options.key("deletions");
         {
-            JSONWriter deletions(object.options(), object.memberLevel(), JSONWriter::Array);
-            for (const RationalTime& time : deletions_)
-                ValueFormatter<RationalTime>::write(deletions.element(), time);
+            JSONWriter deletions(options, indent, JSONWriter::Array);
+            for (const RationalTime& time : deletions_) {
+                options.element();
+                writeJSONValue(options, deletions.memberLevel(), time);
+            }
         }
-        object.key("ignoreSource") << (ignoreSource_ ? "true" : "false");
+        options.key("ignoreSource");
+        writeJSONValue(options, indent, ignoreSource_);
+    }
+
+    static void writeEdit(XMLOptions& options, int indent, const RationalTime& time,
+                          const KeyFrame<T>& edit) {
+        JSONWriter object(options, indent);
+        const int members = object.memberLevel();
+        options.key("time");
+        writeJSONValue(options, members, time);
+        options.key("value");
+        ValueTraits<T>::write(options, members, edit.value());
+        if (edit.duration() != RationalTime(0)) {
+            options.key("duration");
+            writeJSONValue(options, members, edit.duration());
+        }
+        if (!edit.interpolaterName().empty()) options.key("interp") << edit.interpolater()->asJson();
     }
 
     void readKeyFrames(const Json::Value& json) override {
@@ -114,7 +126,7 @@ protected:
                 throw ParserException("Invalid project json - an edit of " + this->identifier() +
                                       " has a negative duration");
             const typename Base::KeyFramePtr keyframe =
-                this->newKeyFrame(time, ValueFormatter<T>::read(entry["value"]), leadIn);
+                this->newKeyFrame(time, ValueTraits<T>::read(entry["value"]), leadIn);
             if (entry.isMember("interp"))
                 keyframe->setInterpolater(InterpolaterFactory<T>::byName(
                     ParameterDocument::requiredString(entry["interp"], "interp")));
@@ -173,7 +185,7 @@ private:
     }
 
     static bool sameKeyFrame(const KeyFrame<T>& a, const KeyFrame<T>& b) {
-        return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() &&
+        return ValueTraits<T>::same(a.value(), b.value()) && a.duration() == b.duration() &&
                a.interpolaterName() == b.interpolaterName();
     }
 

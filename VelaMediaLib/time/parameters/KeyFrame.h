@@ -1,9 +1,8 @@
 #pragma once
 
-#include <VelaMediaLib/document/format/ValueFormatter.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
 #include <VelaMediaLib/time/parameters/KeyFrameInterface.h>
-#include <VelaMediaLib/time/parameters/ParameterTraits.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 
 namespace VelaMediaLib {
 
@@ -64,10 +63,12 @@ protected:
     /// Whether the value equals the given one within the type's tolerance.
     bool similarToValue(const T& value) const {
         ScopedReadLock lock(metaDataProjectMutex());
-        return Similarity::similar(value_, value);
+        return ValueTraits<T>::similar(value_, value);
     }
 
-    void writeValue(std::ostream& out) const override { ValueFormatter<T>::write(out, value_); }
+    void writeValue(XMLOptions& options, int indent) const override {
+        ValueTraits<T>::write(options, indent, value_);
+    }
     std::string interpolaterJson() const override {
         return interpolater_ ? interpolater_->asJson() : std::string();
     }

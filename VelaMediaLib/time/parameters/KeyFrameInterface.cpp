@@ -1,7 +1,7 @@
 #include <VelaMediaLib/time/parameters/KeyFrameInterface.h>
 
 #include <VelaMediaLib/document/format/JSONWriter.h>
-#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 
 namespace VelaMediaLib {
 
@@ -24,16 +24,21 @@ RationalTime KeyFrameInterface::time() const {
     return RationalTime(endTime_.asRational() - leadIn_.asRational());
 }
 
-void KeyFrameInterface::toJSON(XMLOptions& options, int level) const {
+void KeyFrameInterface::toJSON(XMLOptions& options, int indent) const {
     ScopedReadLock lock(metaDataProjectMutex());
-    JSONWriter object(options, level);
-    ValueFormatter<RationalTime>::write(object.key("time"), time());
-    ValueFormatter<RationalTime>::write(object.key("endTime"), endTime_);
-    writeValue(object.key("value"));
-    ValueFormatter<RationalTime>::write(object.key("duration"), leadIn_);
+    JSONWriter object(options, indent);
+    const int members = object.memberLevel();
+    options.key("time");
+    writeJSONValue(options, members, time());
+    options.key("endTime");
+    writeJSONValue(options, members, endTime_);
+    options.key("value");
+    writeValue(options, members);
+    options.key("duration");
+    writeJSONValue(options, members, leadIn_);
     const std::string interp = interpolaterJson();
-    if (!interp.empty()) object.key("interp") << interp;
-    MetaDatable::toJSON(object, *this);
+    if (!interp.empty()) options.key("interp") << interp;
+    MetaDatable::toJSON(options, members, *this);
 }
 
 } // namespace VelaMediaLib

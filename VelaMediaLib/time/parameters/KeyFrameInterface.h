@@ -4,7 +4,6 @@
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
 #include <boost/shared_ptr.hpp>
-#include <iosfwd>
 #include <string>
 
 namespace VelaMediaLib {
@@ -32,11 +31,11 @@ public:
     virtual boost::shared_ptr<KeyFrameInterface> cloneKeyFrame() const = 0;
 
     /// Writes the keyframe object ("time", "endTime", "value", "duration", then
-    /// "interp" and "metadata" where it has them) with its members at level + 1.
-    void toJSON(XMLOptions& options, int level) const;
+    /// "interp" and "metadata" where it has them) with its members at indent + 1.
+    void toJSON(XMLOptions& options, int indent) const;
 
 protected:
-    virtual void writeValue(std::ostream& out) const = 0;
+    virtual void writeValue(XMLOptions& options, int indent) const = 0;
     /// The interpolater as a JSON value, or empty when there is none.
     virtual std::string interpolaterJson() const = 0;
 

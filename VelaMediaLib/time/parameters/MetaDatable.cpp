@@ -1,7 +1,7 @@
 #include <VelaMediaLib/time/parameters/MetaDatable.h>
 
 #include <VelaMediaLib/document/format/JSONWriter.h>
-#include <VelaMediaLib/document/format/ValueFormatter.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 namespace VelaMediaLib {
@@ -71,12 +71,15 @@ std::map<std::string, std::string> MetaDatable::metaDataCopy() const {
     return copy;
 }
 
-void MetaDatable::toJSON(JSONWriter& writer, const MetaDatable& object) {
+void MetaDatable::toJSON(XMLOptions& options, int indent, const MetaDatable& object) {
     const std::map<std::string, std::string> entries = object.metaDataCopy();
     if (entries.empty()) return;
-    writer.key("metadata");
-    JSONWriter members(writer.options(), writer.memberLevel());
-    for (const auto& entry : entries) members.key(entry.first) << quotedJSONString(entry.second);
+    options.key("metadata");
+    JSONWriter members(options, indent);
+    for (const auto& entry : entries) {
+        options.key(entry.first);
+        writeJSONValue(options, members.memberLevel(), entry.second);
+    }
 }
 
 void MetaDatable::readFromJSON(const Json::Value& value, MetaDatable& object) {

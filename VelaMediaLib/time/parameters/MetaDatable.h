@@ -10,7 +10,7 @@
 
 namespace VelaMediaLib {
 
-class JSONWriter;
+class XMLOptions;
 
 /// String metadata of an object: each key holds an observable attribute.
 /// Reads and writes take the project lock through the object's token.
@@ -39,9 +39,9 @@ public:
     ReadWriteMutex* metaDataMutex() const;
     void setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
 
-    /// Writes the keys as the "metadata" member of the object being written,
-    /// when there are any.
-    static void toJSON(JSONWriter& writer, const MetaDatable& object);
+    /// Writes the keys as the "metadata" member of the object being written
+    /// (whose members stand at indent), when there are any.
+    static void toJSON(XMLOptions& options, int indent, const MetaDatable& object);
     /// Fills the object's metadata from the "metadata" member of the value, if any.
     static void readFromJSON(const Json::Value& value, MetaDatable& object);
     /// A copy of the keys and values, for cloning.

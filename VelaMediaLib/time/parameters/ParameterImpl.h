@@ -19,10 +19,10 @@
 
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
-#include <VelaMediaLib/time/interpolaters/InterpolaterValueFormatter.h>
 #include <VelaMediaLib/time/parameters/KeyFrameMapUtil.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
 #include <VelaMediaLib/time/parameters/Parameter.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 
 #include <boost/optional.hpp>
 #include <memory>
@@ -73,7 +73,7 @@ public:
     std::string identifier() const override;
     /// Made on first use under the read lock only.
     boost::shared_ptr<Attribute<std::string>> identAttribute() override;
-    std::string parameterTypeString() const override { return ParameterTraits<T>::typeName(); }
+    std::string parameterTypeString() const override { return ValueTraits<T>::typeName(); }
     bool isSimpleType() const override {
         return std::is_arithmetic<T>::value || std::is_same<T, std::string>::value;
     }
@@ -220,8 +220,9 @@ protected:
     /// its own type name, its name is not one always written in full, and it
     /// holds nothing but one plain keyframe at time 0 with no bounds or hints.
     virtual bool writtenBare(const std::string& name, const std::string& typeName) const;
-    /// Writes the curve: "keyframes", or what a kind writes in its place.
-    virtual void writeKeyFrames(JSONWriter& object) const;
+    /// Writes the curve: "keyframes", or what a kind writes in its place, as
+    /// members of the parameter's object (which stand at indent).
+    virtual void writeKeyFrames(XMLOptions& options, int indent) const;
     virtual void readKeyFrames(const Json::Value& object);
 
     // Unlocked helpers: callers hold the project lock.
@@ -271,6 +272,7 @@ private:
     MetaDatable& metadata() const;
     /// Whether bounds, hints or metadata entries need the document's object form.
     bool describedBeyondTheCurve() const;
+    static void writeBounds(XMLOptions& options, int indent, const ValueBounds<T>& bounds);
 
     std::string identifier_;
     boost::shared_ptr<const TimeScalable> scalable_;
@@ -283,11 +285,9 @@ private:
 #include <VelaMediaLib/time/parameters/detail/ParameterImplEdits.h>
 #include <VelaMediaLib/time/parameters/detail/ParameterImplDocument.h>
 
-#include <VelaMediaLib/time/parameters/ParameterTypes.h>
-
 // Built once in the library for every value type.
 namespace VelaMediaLib {
 #define VELA_EXTERN_PARAMETER(Type) extern template class ParameterImpl<Type>;
-VELA_FOR_EACH_PARAMETER_TYPE(VELA_EXTERN_PARAMETER)
+VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_EXTERN_PARAMETER)
 #undef VELA_EXTERN_PARAMETER
 } // namespace VelaMediaLib

@@ -72,9 +72,11 @@ public:
     /// bounds and interface hints.
     virtual void setupSharedClone(const boost::shared_ptr<ParameterInterface>& clone) const = 0;
 
-    /// Writes the parameter at the current position of the stream, under its
-    /// name when one is given. A non-empty type name is written instead of
-    /// parameterTypeString() (and then the parameter is never written bare).
+    /// Writes the parameter, under its name when one is given: as the next
+    /// member of the object open in the options (or where the text stands when
+    /// none is), closing its own object at indent. A non-empty type name is
+    /// written instead of parameterTypeString() (and then the parameter is
+    /// never written bare).
     virtual void toJSON(XMLOptions& options, int indent, const std::string& name,
                         const std::string& typeName = std::string()) const = 0;
     /// Reads a bare value or a parameter object into this parameter, all or

@@ -66,7 +66,7 @@ void Parametric::addParameter(const std::string& name,
 
 bool Parametric::hasMadeParameter(const std::string& name) const { return bool(madeParameter(name)); }
 
-void Parametric::toJSONParameterList(JSONWriter& writer) const {
+void Parametric::toJSONParameterList(XMLOptions& options, int indent) const {
     NamedParameters made;
     {
         ScopedReadLock lock(parametersToken_);
@@ -74,13 +74,11 @@ void Parametric::toJSONParameterList(JSONWriter& writer) const {
             made.emplace_back(name, p);
         });
     }
-    writer.key("parameters");
-    JSONWriter members(writer.options(), writer.memberLevel());
-    for (const auto& entry : made) {
-        if (!entry.second->shouldSerialize()) continue;
-        members.element();
-        entry.second->toJSON(writer.options(), members.memberLevel(), entry.first);
-    }
+    options.key("parameters");
+    JSONWriter members(options, indent);
+    for (const auto& entry : made)
+        if (entry.second->shouldSerialize())
+            entry.second->toJSON(options, members.memberLevel(), entry.first);
 }
 
 // Every member is read into a copy first (of the kind of the parameter made,

@@ -9,7 +9,7 @@
 
 namespace VelaMediaLib {
 
-class JSONWriter;
+class XMLOptions;
 
 /// An object with named, keyframed parameters. A kind declares its parameters
 /// and their defaults; each is made when first asked for, so objects pay only
@@ -45,9 +45,10 @@ public:
         return typed ? typed->valueAtTime(time) : fallback;
     }
 
-    /// Writes the "parameters" member: every parameter made (those not made
-    /// hold their defaults, which reading gives back).
-    void toJSONParameterList(JSONWriter& writer) const;
+    /// Writes the "parameters" member of the object being written (whose
+    /// members stand at indent): every parameter made (those not made hold
+    /// their defaults, which reading gives back).
+    void toJSONParameterList(XMLOptions& options, int indent) const;
     /// Reads a document's "parameters" object: each member becomes the value
     /// of the parameter of its name, built from no keyframes (so what was
     /// written reads back equal). A parameter already made takes the value

@@ -42,41 +42,56 @@ template <typename T>
 void ParameterImpl<T>::toJSON(XMLOptions& options, int indent, const std::string& name,
                               const std::string& typeName) const {
     ScopedReadLock lock(this->projectMutex());
-    if (!name.empty()) options.stream() << keyName(name);
+    if (!name.empty()) options.key(name);
     if (writtenBare(name, typeName)) {
-        ValueFormatter<T>::write(options.stream(), keyframes_.front().keyframe->value_);
+        ValueTraits<T>::write(options, indent, keyframes_.front().keyframe->value_);
         return;
     }
     JSONWriter object(options, indent);
+    const int members = object.memberLevel();
     const std::string type = typeName.empty() ? parameterTypeString() : typeName;
-    if (!type.empty()) object.key("type") << quotedJSONString(type);
+    if (!type.empty()) {
+        options.key("type");
+        writeJSONValue(options, members, type);
+    }
     const std::string interp = parameterInterpolaterName();
-    if (!interp.empty()) object.key("interp") << quotedJSONString(interp);
+    if (!interp.empty()) {
+        options.key("interp");
+        writeJSONValue(options, members, interp);
+    }
     const Extras* e = extras_.get();
-    if (e && e->bounds) {
-        object.key("valueBounds");
-        JSONWriter bounds(options, object.memberLevel());
-        ValueFormatter<T>::write(bounds.key("minValue"), e->bounds->minValue);
-        ValueFormatter<T>::write(bounds.key("maxValue"), e->bounds->maxValue);
-        ValueFormatter<T>::write(bounds.key("defaultValue"), e->bounds->defaultValue);
-    }
+    if (e && e->bounds) writeBounds(options, members, *e->bounds);
     if (e && e->hints) {
-        object.key("uiHints");
-        JSONWriter hints(options, object.memberLevel());
-        hints.key("userInterfaceType") << quotedJSONString(e->hints->userInterfaceType);
-        hints.key("unitType") << quotedJSONString(e->hints->unitType);
+        options.key("uiHints");
+        JSONWriter hints(options, members);
+        options.key("userInterfaceType");
+        writeJSONValue(options, hints.memberLevel(), e->hints->userInterfaceType);
+        options.key("unitType");
+        writeJSONValue(options, hints.memberLevel(), e->hints->unitType);
     }
-    writeKeyFrames(object);
-    if (e && e->metadata.get()) MetaDatable::toJSON(object, *e->metadata.get());
+    writeKeyFrames(options, members);
+    if (e && e->metadata.get()) MetaDatable::toJSON(options, members, *e->metadata.get());
 }
 
 template <typename T>
-void ParameterImpl<T>::writeKeyFrames(JSONWriter& object) const {
-    object.key("keyframes");
-    JSONWriter array(object.options(), object.memberLevel(), JSONWriter::Array);
+void ParameterImpl<T>::writeBounds(XMLOptions& options, int indent, const ValueBounds<T>& bounds) {
+    options.key("valueBounds");
+    JSONWriter object(options, indent);
+    options.key("minValue");
+    ValueTraits<T>::write(options, object.memberLevel(), bounds.minValue);
+    options.key("maxValue");
+    ValueTraits<T>::write(options, object.memberLevel(), bounds.maxValue);
+    options.key("defaultValue");
+    ValueTraits<T>::write(options, object.memberLevel(), bounds.defaultValue);
+}
+
+template <typename T>
+void ParameterImpl<T>::writeKeyFrames(XMLOptions& options, int indent) const {
+    options.key("keyframes");
+    JSONWriter array(options, indent, JSONWriter::Array);
     for (const auto& entry : keyframes_) {
-        array.element();
-        entry.keyframe->toJSON(object.options(), array.memberLevel());
+        options.element();
+        entry.keyframe->toJSON(options, array.memberLevel());
     }
 }
 
@@ -125,16 +140,15 @@ void ParameterImpl<T>::clearForReading() {
 template <typename T>
 void ParameterImpl<T>::readInto(const Json::Value& json) {
     if (!ParameterDocument::isParameterObject(json)) {
-        setDefaultValue(ValueFormatter<T>::read(json)); // a bare value is the only keyframe, at time 0
+        setDefaultValue(ValueTraits<T>::read(json)); // a bare value is the only keyframe, at time 0
         return;
     }
     if (json.isMember("interp"))
         readParameterInterpolater(ParameterDocument::requiredString(json["interp"], "interp"));
     if (json.isMember("valueBounds")) {
         const Json::Value& bounds = json["valueBounds"];
-        setValueBounds(ValueFormatter<T>::read(bounds["minValue"]),
-                       ValueFormatter<T>::read(bounds["maxValue"]),
-                       ValueFormatter<T>::read(bounds["defaultValue"]));
+        setValueBounds(ValueTraits<T>::read(bounds["minValue"]), ValueTraits<T>::read(bounds["maxValue"]),
+                       ValueTraits<T>::read(bounds["defaultValue"]));
     }
     if (json.isMember("uiHints")) {
         const Json::Value& hints = json["uiHints"];
@@ -168,7 +182,7 @@ void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
     const RationalTime end = json.isMember("endTime")
                                  ? JSONReader::jsonValueAsRationalTime(json["endTime"])
                                  : JSONReader::jsonValueAsRationalTime(json["time"]) + leadIn;
-    const T value = ValueFormatter<T>::read(json["value"]);
+    const T value = ValueTraits<T>::read(json["value"]);
     InterpolaterPtr interpolater;
     if (json.isMember("interp"))
         interpolater =

@@ -225,7 +225,7 @@ RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) co
 template <typename T>
 bool ParameterImpl<T>::valuesDifferAtTimes(const RationalTime& a, const RationalTime& b) const {
     ScopedReadLock lock(this->projectMutex());
-    return !Similarity::same(valueAtTimeLocked(a), valueAtTimeLocked(b));
+    return !ValueTraits<T>::same(valueAtTimeLocked(a), valueAtTimeLocked(b));
 }
 
 template <typename T>
@@ -246,7 +246,7 @@ bool sameInterpolater(const boost::shared_ptr<Interpolater<T>>& a,
 /// Value, lead-in and metadata; the time is the one both were found at.
 template <typename T>
 bool sameKeyFrame(const KeyFrame<T>& a, const KeyFrame<T>& b) {
-    return Similarity::same(a.value(), b.value()) && a.duration() == b.duration() &&
+    return ValueTraits<T>::same(a.value(), b.value()) && a.duration() == b.duration() &&
            a.metaDataCopy() == b.metaDataCopy();
 }
 

@@ -1,0 +1,220 @@
+#include <VelaMediaLib/base/VelaMediaLibException.h>
+#include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
+#include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
+
+#include <cmath>
+#include "../JsonTestSupport.h"
+
+#include <gtest/gtest.h>
+#include <json/reader.h>
+#include <limits>
+#include <random>
+#include <set>
+#include <sstream>
+
+using namespace VelaMediaLib;
+
+namespace {
+
+template <typename T>
+std::string text(const T& value) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    ValueTraits<T>::write(options, 0, value);
+    return out.str();
+}
+
+std::string primitiveText(const Range<long long>& value) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    writeJSONValue(options, 0, value);
+    return out.str();
+}
+
+template <typename T>
+T readBack(const T& value) {
+    return ValueTraits<T>::read(VelaMediaLib::testing::parseJson(text(value)));
+}
+
+// One value of each type that parameters hold, unlike the type's default.
+int sample(int*) { return -7; }
+float sample(float*) { return 0.1f; }
+double sample(double*) { return 1.0 / 3.0; }
+long long sample(long long*) { return 9000000000LL; }
+std::string sample(std::string*) { return "a \"quoted\" line\n"; }
+Rect<float> sample(Rect<float>*) { return Rect<float>(0.5f, -1, 1e-3f, 2); }
+TemplatedColor<int> sample(TemplatedColor<int>*) { return TemplatedColor<int>(1, 2, 3, 4); }
+std::list<Rect<float>> sample(std::list<Rect<float>>*) { return {Rect<float>(1, 2, 3, 4), Rect<float>()}; }
+AudioPosition sample(AudioPosition*) { return AudioPosition(-0.25, 0.5); }
+CaptionData sample(CaptionData*) { return CaptionData("hello", "en"); }
+KeystrokeData sample(KeystrokeData*) { return KeystrokeData("K", 5); }
+Point3d sample(Point3d*) { return Point3d(1e-20, -2, 3.5); }
+SafeRational sample(SafeRational*) { return SafeRational(-7, 3); }
+TextAttributeList sample(TextAttributeList*) {
+    TextAttributeList list("bold words");
+    list.addRun(0, 4, "fontWeight", "bold");
+    return list;
+}
+TransformMatrix sample(TransformMatrix*) {
+    TransformMatrix::Elements elements;
+    for (size_t i = 0; i < elements.size(); ++i) elements[i] = double(i) / 7.0;
+    return TransformMatrix(elements);
+}
+std::vector<double> sample(std::vector<double>*) { return {0.1, -1e300, 4.0}; }
+template <typename X>
+boost::shared_ptr<Interpolater<X>> sample(boost::shared_ptr<Interpolater<X>>*) {
+    return InterpolaterFactory<X>::byName("esIn");
+}
+
+template <typename T>
+void expectReadBack() {
+    const T value = sample(static_cast<T*>(nullptr));
+    const T read = readBack(value);
+    EXPECT_TRUE(ValueTraits<T>::same(read, value)) << ValueTraits<T>::typeName() << ": " << text(value);
+    EXPECT_TRUE(ValueTraits<T>::similar(read, value)) << ValueTraits<T>::typeName();
+    EXPECT_EQ(text(read), text(value));
+}
+
+} // namespace
+
+TEST(ValueTraits, DoublesReadBackAsTheSameDouble) {
+    std::mt19937_64 random(7);
+    std::uniform_real_distribution<double> spread(-1e6, 1e6);
+    for (int i = 0; i < 2000; ++i) {
+        const double value = spread(random) * std::pow(10.0, double(i % 40) - 20.0);
+        EXPECT_EQ(readBack(value), value) << text(value);
+    }
+    EXPECT_EQ(text(1.0), "1.0");
+    EXPECT_EQ(text(0.1), "0.1");
+    EXPECT_EQ(text(std::numeric_limits<double>::infinity()), "null");
+    EXPECT_TRUE(std::isnan(ValueTraits<double>::read(VelaMediaLib::testing::parseJson("null"))));
+}
+
+TEST(ValueTraits, StringsAreEscapedAsJSONRequires) {
+    const std::string awkward = std::string("a\"b\\c\n\t\x01 \xe2\x82\xac", 12);
+    EXPECT_EQ(text(awkward), "\"a\\\"b\\\\c\\n\\t\\u0001 \xe2\x82\xac\"");
+    EXPECT_EQ(readBack(awkward), awkward);
+}
+
+TEST(ValueTraits, RationalsAndTicks) {
+    EXPECT_EQ(text(SafeRational(60000, 1001)), "\"60000/1001\"");
+    EXPECT_EQ(text(SafeRational(30)), "30");
+    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"60000/1001\"")),
+              SafeRational(60000, 1001));
+    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("30")), SafeRational(30));
+    try {
+        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("1.5"));
+        FAIL();
+    } catch (const ParserException& e) {
+        EXPECT_STREQ(e.what(), "Invalid project json - unsupported json type for VelaRational: 1.5");
+    }
+    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/x\"")),
+                 std::invalid_argument);
+    EXPECT_THROW(
+        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"99999999999999999999/1\"")),
+        std::out_of_range);
+    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/0\"")),
+                 boost::bad_rational);
+    EXPECT_EQ(primitiveText(Range<long long>(10, 25)), "[10, 25]");
+    EXPECT_EQ(jsonValueAsTickRange(VelaMediaLib::testing::parseJson("[10, 25]")), Range<long long>(10, 25));
+}
+
+TEST(ValueTraits, WrongShapesAreRefusedWithTheValue) {
+    EXPECT_THROW(ValueTraits<Point3d>::read(VelaMediaLib::testing::parseJson("[1, 2]")), ParserException);
+    EXPECT_THROW(ValueTraits<TemplatedColor<int>>::read(VelaMediaLib::testing::parseJson("[1, 2, 3, 4.5]")),
+                 ParserException);
+    EXPECT_THROW(ValueTraits<int>::read(VelaMediaLib::testing::parseJson("\"3\"")), ParserException);
+    EXPECT_THROW(ValueTraits<TextAttributeList>::read(VelaMediaLib::testing::parseJson(
+                     R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
+                 ParserException);
+}
+
+// Every type in the instantiation list has a document form that gives its
+// value back; a type added without one does not compile here.
+TEST(ValueTraits, EveryParameterValueTypeReadsBackWhatItWrote) {
+#define VELA_EXPECT_READ_BACK(Type) expectReadBack<Type>();
+    VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_EXPECT_READ_BACK)
+#undef VELA_EXPECT_READ_BACK
+}
+
+TEST(ValueTraits, TypeNamesAreDistinct) {
+    std::multiset<std::string> names;
+#define VELA_COLLECT_NAME(Type) names.insert(ValueTraits<Type>::typeName());
+    VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_COLLECT_NAME)
+#undef VELA_COLLECT_NAME
+    EXPECT_EQ(names.count("interpolater"), 6u); // one per interpolated type
+    names.erase("interpolater");
+    EXPECT_EQ(std::set<std::string>(names.begin(), names.end()).size(), names.size());
+    EXPECT_STREQ(ValueTraits<float>::typeName(), "?");
+    EXPECT_STREQ(ValueTraits<long long>::typeName(), "int64");
+    EXPECT_STREQ(ValueTraits<Rect<float>>::typeName(), "rect");
+    EXPECT_STREQ(ValueTraits<TemplatedColor<int>>::typeName(), "color");
+}
+
+TEST(ValueTraits, SimilarityHasEachMembersTolerance) {
+    EXPECT_TRUE(ValueTraits<float>::similar(1.0f, 1.0000005f));
+    EXPECT_FALSE(ValueTraits<float>::same(1.0f, 1.0000005f));
+    EXPECT_FALSE(ValueTraits<double>::similar(1.0, 1.000001));
+    EXPECT_TRUE(ValueTraits<double>::similar(1e12, 1e12 + 1));
+    EXPECT_TRUE(ValueTraits<Rect<float>>::similar(Rect<float>(1, 1, 1, 1), Rect<float>(1, 1, 1, 1.0000005f)));
+    EXPECT_FALSE(ValueTraits<Point3d>::similar(Point3d(1, 1, 1), Point3d(1, 1, 1.000001)));
+    EXPECT_FALSE(ValueTraits<int>::similar(1000000, 1000001));
+    // Interpolaters are the same when they move values alike, as two Bézier instances of one curve do.
+    const auto curve = InterpolaterFactory<Point3d>::byName("bezr(linr;0,0,0;1,1,1)");
+    EXPECT_NE(curve, InterpolaterFactory<Point3d>::byName("bezr(linr;0,0,0;1,1,1)"));
+    EXPECT_TRUE(ValueTraits<boost::shared_ptr<Interpolater<Point3d>>>::same(
+        curve, InterpolaterFactory<Point3d>::byName("bezr(linr;0,0,0;1,1,1)")));
+    EXPECT_FALSE(ValueTraits<boost::shared_ptr<Interpolater<Point3d>>>::same(curve, nullptr));
+}
+
+// Which "interp" names a document may give each type.
+TEST(ValueTraits, EachTypeHasItsInterpolaterKinds) {
+    EXPECT_TRUE(InterpolaterFactory<int>::find("bnce"));
+    EXPECT_TRUE(InterpolaterFactory<long long>::find("esOt"));
+    EXPECT_FALSE(InterpolaterFactory<long long>::find("sprg"));
+    EXPECT_TRUE(InterpolaterFactory<TransformMatrix>::find("linr"));
+    EXPECT_FALSE(InterpolaterFactory<AudioPosition>::find("eios"));
+    EXPECT_FALSE(InterpolaterFactory<std::string>::find("linr"));
+    EXPECT_FALSE(InterpolaterFactory<Rect<float>>::find("bezr(linr;0,0,0;1,1,1)"));
+    EXPECT_EQ(InterpolaterFactory<CaptionData>::defaultInterpolater()->name(), "left");
+    EXPECT_EQ(InterpolaterFactory<TemplatedColor<int>>::defaultInterpolater()->name(), "linr");
+}
+
+TEST(JSONWriter, IndentsNestedObjectsAndArrays) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    {
+        JSONWriter object(options, 0);
+        options.key("a") << 1;
+        options.key("list");
+        {
+            JSONWriter list(options, object.memberLevel(), JSONWriter::Array);
+            options.element() << 2;
+            options.element() << 3;
+        }
+        options.key("b") << 4; // the separator belongs to the object again
+    }
+    EXPECT_EQ(out.str(), "{\n  \"a\" : 1,\n  \"list\" : [\n    2,\n    3\n  ],\n  \"b\" : 4\n}");
+    options.key("bare") << 5; // with nothing open, the key alone
+    EXPECT_EQ(out.str().substr(out.str().size() - 10), "\"bare\" : 5");
+    std::ostringstream empty;
+    XMLOptions emptyOptions(empty);
+    JSONWriter(emptyOptions, 1).close();
+    EXPECT_EQ(empty.str(), "{\n  }");
+}
+
+TEST(XMLOptions, IdentsAndPaths) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    int a = 0, b = 0;
+    EXPECT_EQ(options.assignNewIdent(&a), 1u);
+    EXPECT_EQ(options.assignNewIdent(&b), 2u);
+    EXPECT_EQ(options.findIdent(&a), 1u);
+    EXPECT_EQ(options.findIdent(&out), 0u);
+    EXPECT_EQ(options.modifyPath("/media/a.mp4"), "/media/a.mp4");
+    options.setPathModifier([](const std::string& path) { return path.substr(path.rfind('/') + 1); });
+    EXPECT_EQ(options.modifyPath("/media/a.mp4"), "a.mp4");
+    EXPECT_EQ(options.indentation(2), "    ");
+}
