@@ -91,3 +91,26 @@ TEST(ProjectToken, TheTransitionSubjectIsHeldBackByTheClipsProject) {
     }
     EXPECT_EQ(heard.count, 1);
 }
+
+// The project's own subject notifies under the project's token: its delay
+// holds it back, and observers hear the project.
+TEST(ProjectToken, TheProjectsOwnSubjectIsHeldBackByItsDelay) {
+    const ProjectPtr project = Project::create(30, 1);
+    struct Last : Counter {
+        Observable* changed = nullptr;
+        void update(Observable* subject) override {
+            Counter::update(subject);
+            changed = subject;
+        }
+    } heard;
+    project->attach(&heard);
+    {
+        NotifyDelay delay(project);
+        project->notify();
+        project->notify();
+        EXPECT_EQ(heard.count, 0);
+    }
+    EXPECT_EQ(heard.count, 1);
+    EXPECT_EQ(heard.changed, static_cast<Observable*>(project.get()));
+    project->detach(&heard);
+}

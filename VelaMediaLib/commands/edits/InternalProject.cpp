@@ -46,9 +46,8 @@ int InternalProject::defaultAudioSampleRate(const boost::rational<unsigned long>
 
 void InternalProject::init() {
     const boost::weak_ptr<const ThreadSafe> projectToken = token();
-    subject_.setProjectMutex(projectToken);
+    setMetaDataProjectMutex(projectToken); // the one token of the project's own parts
     subject_.setOwner(this);
-    setMetaDataProjectMutex(projectToken); // the token of the metadata and the attributes alike
     sourceBin_.reset(new SourceBin(projectToken));
     timeline_ = Timeline::create(projectToken);
     clipBoard_.reset(new ClipBoard(projectToken));

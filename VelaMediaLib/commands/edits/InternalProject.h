@@ -104,7 +104,7 @@ private:
     void init();
 
     SimpleProjectEditRate editRate_;
-    Subject subject_;
+    PartSubject subject_{*this}; // notifies under the project's own token
     boost::shared_ptr<SourceBin> sourceBin_;
     TimelinePtr timeline_;
     boost::shared_ptr<ClipBoard> clipBoard_;
