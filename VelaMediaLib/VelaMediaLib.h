@@ -132,6 +132,8 @@
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 #include <VelaMediaLib/time/sync/Observable.h>
 #include <VelaMediaLib/time/sync/Observer.h>
+#include <VelaMediaLib/time/sync/ObserverList.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 #include <VelaMediaLib/time/sync/Subject.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>

@@ -14,19 +14,19 @@ void EffectList::checkIndex(size_t index, size_t limit) const {
 
 void EffectList::add(const EffectPtr& effect) {
     if (!effect) throw AddRemoveException("no effect to add");
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(owner_.projectMutex());
     effects_.push_back(effect);
 }
 
 void EffectList::insert(const EffectPtr& effect, size_t index) {
     if (!effect) throw AddRemoveException("no effect to insert");
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(owner_.projectMutex());
     checkIndex(index, effects_.size() + 1);
     effects_.insert(effects_.begin() + long(index), effect);
 }
 
 bool EffectList::remove(const EffectPtr& effect) {
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(owner_.projectMutex());
     const auto found = std::find(effects_.begin(), effects_.end(), effect);
     if (found == effects_.end()) return false;
     effects_.erase(found);
@@ -34,7 +34,7 @@ bool EffectList::remove(const EffectPtr& effect) {
 }
 
 bool EffectList::swap(size_t first, size_t second) {
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(owner_.projectMutex());
     checkIndex(first, effects_.size());
     checkIndex(second, effects_.size());
     if (first == second) return false;
@@ -43,23 +43,23 @@ bool EffectList::swap(size_t first, size_t second) {
 }
 
 EffectList::EffectPtr EffectList::at(size_t index) const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(owner_.projectMutex());
     checkIndex(index, effects_.size());
     return effects_[index];
 }
 
 size_t EffectList::size() const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(owner_.projectMutex());
     return effects_.size();
 }
 
 EffectList::Effects EffectList::all() const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(owner_.projectMutex());
     return effects_;
 }
 
 EffectList::Effects EffectList::withName(const std::string& name) const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(owner_.projectMutex());
     Effects named;
     for (const EffectPtr& effect : effects_)
         if (effect->effectName() == name) named.push_back(effect);
@@ -67,14 +67,14 @@ EffectList::Effects EffectList::withName(const std::string& name) const {
 }
 
 EffectList::Effects EffectList::cloned() const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(owner_.projectMutex());
     Effects copies;
     for (const EffectPtr& effect : effects_) copies.push_back(effect->cloneEffect());
     return copies;
 }
 
 void EffectList::replaceAll(const Effects& effects) {
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(owner_.projectMutex());
     effects_ = effects;
 }
 

@@ -1,18 +1,20 @@
 #pragma once
 
 #include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 namespace VelaMediaLib {
 
-/// The ordered effects of one owner, guarded by the project lock. Each
-/// change returns whether it changed anything, so the owner knows to notify.
+/// The ordered effects of one owner, guarded by the project lock it finds
+/// through its owner's token. Each change returns whether it changed
+/// anything, so the owner knows to notify.
 class EffectList {
 public:
     typedef Effectable::EffectPtr EffectPtr;
     typedef Effectable::Effects Effects;
 
-    explicit EffectList(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+    explicit EffectList(const ProjectToken& owner) : owner_(owner) {}
 
     void add(const EffectPtr& effect);
     void insert(const EffectPtr& effect, size_t index);
@@ -34,7 +36,7 @@ public:
 private:
     void checkIndex(size_t index, size_t limit) const;
 
-    boost::weak_ptr<const ThreadSafe> token_;
+    const ProjectToken& owner_;
     Effects effects_;
 };
 

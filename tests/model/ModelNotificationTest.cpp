@@ -46,7 +46,7 @@ TEST_F(ModelNotification, ObserversOfSeveralObjectsHearWhichOneChanged) {
     track->addMedia(a, 0);
     track->addMedia(b, 20);
     for (const boost::shared_ptr<Observable>& subject : std::vector<boost::shared_ptr<Observable>>{
-             a, b, mixer, track, boost::static_pointer_cast<Subject>(timeline)})
+             a, b, mixer, track, boost::static_pointer_cast<ObjectSubject>(timeline)})
         observer.observe(subject);
     b->move(1);
     a->trimEnd(1);
@@ -54,7 +54,7 @@ TEST_F(ModelNotification, ObserversOfSeveralObjectsHearWhichOneChanged) {
     track->setIdentifier("upper");
     timeline->setCaptionAttributes(CaptionAttributes());
     EXPECT_EQ(heard, (std::vector<Observable*>{b.get(), a.get(), mixer.get(), track.get(),
-                                               static_cast<Subject*>(timeline.get())}));
+                                               static_cast<ObjectSubject*>(timeline.get())}));
     observer.stopObservingAll();
 }
 

@@ -1,6 +1,7 @@
 #include "TimeTestSupport.h"
 
 #include <VelaMediaLib/time/parameters/Attribute.h>
+#include <VelaMediaLib/time/sync/AddObserverList.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
@@ -11,6 +12,7 @@
 #include <boost/make_shared.hpp>
 #include <gtest/gtest.h>
 #include <memory>
+#include <stdexcept>
 #include <thread>
 #include <vector>
 
@@ -201,4 +203,114 @@ TEST(NotificationConcurrency, DetachUnderTheWriteLockWaitsForARunningNotificatio
             subject.detach(o);
         })) << (delayed ? "delayed" : "at once");
     }
+}
+
+// Every subject follows one policy: a plain subject, with a project or
+// without, also returns from detach only once the observer has finished.
+TEST(NotificationConcurrency, EverySubjectsDetachReturnsOnlyOnceTheObserverHasFinished) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    for (const bool withProject : {false, true})
+        for (const bool delayed : {false, true}) {
+            if (delayed && !withProject) continue; // only a project holds notifications back
+            Subject subject(withProject ? boost::weak_ptr<const ThreadSafe>(project)
+                                        : boost::weak_ptr<const ThreadSafe>());
+            EXPECT_FALSE(detachReturnsWhileTheObserverRuns(subject, project, delayed,
+                                                           [&](Observer* o) { subject.detach(o); }))
+                << withProject << delayed;
+        }
+}
+
+// A thread holding the project's lock does not wait in detach: the observer
+// it would wait for may itself be waiting for that lock (here it asks for the
+// write lock, which waits for the detaching thread's read share).
+TEST(NotificationConcurrency, DetachUnderTheProjectLockDoesNotWaitForAnObserverWaitingForIt) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    SubjectWithMutex subject(project);
+    std::atomic<bool> entered{false}, reading{false};
+    BlockingObserver writer;
+    writer.body = [&](Observable*) {
+        entered = true;
+        waitFor(reading, std::chrono::seconds(30));
+        ScopedWriteLock lock(project); // waits for the detaching thread's read share
+    };
+    subject.attach(&writer);
+    std::thread notifier([&] { subject.notify(); });
+    waitFor(entered, std::chrono::seconds(30));
+    {
+        ScopedReadLock lock(project);
+        reading = true;
+        subject.detach(&writer);
+    }
+    notifier.join();
+    std::atomic<int> told{0};
+    BlockingObserver later;
+    later.body = [&](Observable*) { ++told; };
+    subject.attach(&later);
+    subject.notify();
+    EXPECT_EQ(told.load(), 1);
+    subject.detach(&later);
+}
+
+// Observers are never called under a lock of the lists, so one may wait for
+// another thread that attaches to (or detaches from) the same subject.
+TEST(NotificationConcurrency, AnObserverMayWaitForAThreadAttachingToItsSubject) {
+    Deadline deadline(std::chrono::seconds(60));
+    const auto project = boost::make_shared<ThreadSafe>();
+    SubjectWithMutex subject(project);
+    AtomicCounter other;
+    BlockingObserver waiting;
+    waiting.body = [&](Observable*) {
+        std::thread attacher([&] {
+            subject.attach(&other);
+            subject.detach(&other);
+            subject.attachWithoutNotifyDelay(&other);
+        });
+        attacher.join();
+    };
+    subject.attach(&waiting);
+    subject.notify();
+    subject.detach(&waiting);
+    subject.notify();
+    EXPECT_EQ(other.count.load(), 1);
+    subject.detach(&other);
+}
+
+namespace {
+
+struct AddProbe {
+    std::function<void()> body;
+    void heard() { body(); }
+};
+
+} // namespace
+
+// Add-observer lists share the subjects' policy: detach on another thread
+// waits for a running call, and an observer that throws leaves the others
+// hearing.
+TEST(NotificationConcurrency, AddObserverListsFollowTheSamePolicy) {
+    Deadline deadline(std::chrono::seconds(60));
+    AddObserverList<AddProbe> list;
+    std::atomic<bool> entered{false}, detached{false};
+    bool detachedWhileRunning = true;
+    AddProbe slow, thrower, counter;
+    int counted = 0;
+    slow.body = [&] {
+        entered = true;
+        detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
+    };
+    thrower.body = [] { throw std::runtime_error("observer failure"); };
+    counter.body = [&] { ++counted; };
+    list.attach(&slow);
+    list.attach(&thrower);
+    list.attach(&counter);
+    list.attach(&counter); // attached once
+    std::thread teller([&] { list.tell([](AddProbe& probe) { probe.heard(); }); });
+    waitFor(entered, std::chrono::seconds(30));
+    list.detach(&slow);
+    detached = true;
+    teller.join();
+    EXPECT_FALSE(detachedWhileRunning);
+    EXPECT_EQ(counted, 1);
 }

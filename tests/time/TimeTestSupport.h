@@ -19,8 +19,8 @@ public:
 
 protected:
     boost::shared_ptr<ParameterInterface> createDefaultParameter(const std::string& name) const override {
-        if (name == "level") return InterpolatingParam<double>::create(parametersToken(), name, 1.0);
-        if (name == "pan") return InterpolatingParam<double>::create(parametersToken(), name, 0.0);
+        if (name == "level") return InterpolatingParam<double>::create(projectMutex(), name, 1.0);
+        if (name == "pan") return InterpolatingParam<double>::create(projectMutex(), name, 0.0);
         return Parametric::createDefaultParameter(name);
     }
     std::vector<std::string> defaultParameterNames() const override { return {"level", "pan"}; }

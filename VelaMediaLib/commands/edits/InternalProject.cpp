@@ -17,16 +17,14 @@ bool wholeRateIn(const boost::rational<unsigned long>& rate, std::initializer_li
 } // namespace
 
 boost::shared_ptr<Project> Project::create(unsigned long numerator, unsigned long denominator) {
-    return create(
-        boost::rational<unsigned long>(numerator, denominator)); // a zero denominator throws bad_rational
+    return create(SimpleProjectEditRate::rateOf(numerator, denominator));
 }
 
 boost::shared_ptr<Project> Project::create(const boost::rational<unsigned long>& rate) {
     return InternalProject::create(rate);
 }
 
-InternalProject::InternalProject(const boost::rational<unsigned long>& rate)
-    : rateNumerator_(rate.numerator()), rateDenominator_(rate.denominator()) {}
+InternalProject::InternalProject(const boost::rational<unsigned long>& rate) : editRate_(rate) {}
 
 InternalProject::~InternalProject() { magnetizers_.reset(); }
 
@@ -48,10 +46,8 @@ int InternalProject::defaultAudioSampleRate(const boost::rational<unsigned long>
 
 void InternalProject::init() {
     const boost::weak_ptr<const ThreadSafe> projectToken = token();
-    subject_.setProjectMutex(projectToken);
+    setMetaDataProjectMutex(projectToken); // the one token of the project's own parts
     subject_.setOwner(this);
-    setMetaDataProjectMutex(projectToken);
-    setAttributesToken(projectToken);
     sourceBin_.reset(new SourceBin(projectToken));
     timeline_ = Timeline::create(projectToken);
     clipBoard_.reset(new ClipBoard(projectToken));
@@ -77,16 +73,6 @@ boost::weak_ptr<const ThreadSafe> InternalProject::token() const {
 boost::weak_ptr<ProjectEditRate> InternalProject::editRateToken() const {
     const boost::shared_ptr<const InternalProject> self = shared_from_this();
     return boost::shared_ptr<ProjectEditRate>(boost::const_pointer_cast<InternalProject>(self));
-}
-
-boost::rational<unsigned long> InternalProject::editRate() const {
-    return boost::rational<unsigned long>(rateNumerator_.load(), rateDenominator_.load());
-}
-
-void InternalProject::setEditRate(const boost::rational<unsigned long>& rate) {
-    rateNumerator_.store(rate.numerator());
-    rateDenominator_.store(rate.denominator());
-    editRateSubject_.notify();
 }
 
 void InternalProject::setAuthorVersionInfo(const VersionInfo& info) {

@@ -4,6 +4,7 @@
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/project/Project.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
+#include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
 
 #include <atomic>
@@ -32,15 +33,19 @@ public:
     boost::weak_ptr<const ThreadSafe> token() const override;
     boost::weak_ptr<ProjectEditRate> editRateToken() const override;
 
-    // Edit rate
-    boost::rational<unsigned long> editRate() const override;
+    // Edit rate, kept by a SimpleProjectEditRate (the one rule for every rate)
+    boost::rational<unsigned long> editRate() const override { return editRate_.editRate(); }
     int32_t durationPerFrame() const override { return 1; }
     uint64_t editingUnit() const override { return 1; }
     int videoFrameRate() const override { return attributeValue<int>("videoFormatFrameRate", 30); }
     int audioSampleRate() const override { return attributeValue<int>("audioFormatSampleRate", 44100); }
-    void attachEditRateObserver(Observer* observer) const override { editRateSubject_.attach(observer); }
-    void detachEditRateObserver(Observer* observer) const override { editRateSubject_.detach(observer); }
-    void setEditRate(const boost::rational<unsigned long>& rate) override;
+    void attachEditRateObserver(Observer* observer) const override {
+        editRate_.attachEditRateObserver(observer);
+    }
+    void detachEditRateObserver(Observer* observer) const override {
+        editRate_.detachEditRateObserver(observer);
+    }
+    void setEditRate(const boost::rational<unsigned long>& rate) override { editRate_.setEditRate(rate); }
 
     // Observation
     void attach(Observer* observer) override { subject_.attach(observer); }
@@ -98,9 +103,8 @@ private:
     explicit InternalProject(const boost::rational<unsigned long>& rate);
     void init();
 
-    std::atomic<unsigned long> rateNumerator_, rateDenominator_;
-    mutable SubjectWithMutex editRateSubject_;
-    Subject subject_;
+    SimpleProjectEditRate editRate_;
+    PartSubject subject_{*this}; // notifies under the project's own token
     boost::shared_ptr<SourceBin> sourceBin_;
     TimelinePtr timeline_;
     boost::shared_ptr<ClipBoard> clipBoard_;

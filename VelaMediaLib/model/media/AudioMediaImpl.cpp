@@ -12,7 +12,7 @@ AudioMediaImpl::AudioMediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
 
 boost::shared_ptr<ParameterInterface> AudioMediaImpl::createDefaultParameter(const std::string& name) const {
     if (name != "volume") return MediaImpl::createDefaultParameter(name);
-    const auto made = InterpolatingParam<double>::create(parametersToken(), name, 1.0);
+    const auto made = InterpolatingParam<double>::create(projectMutex(), name, 1.0);
     made->setTimeScalable(sharedTimeScale());
     return made;
 }

@@ -18,7 +18,7 @@ namespace VelaMediaLib {
 MediaImpl::MediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
                      const boost::weak_ptr<ProjectEditRate>& rate, const MediaState& initial,
                      EditorKind editor)
-    : Media(token), SubTimelineParts<Media>(token), transitionSubject_(token), state_(initial),
+    : Media(token), SubTimelineParts<Media>(token), transitionSubject_(*this), state_(initial),
       editRate_(rate) {
     if (initial.duration <= 0)
         throw ValueException<long long>("a clip's duration must be greater than 0", initial.duration);

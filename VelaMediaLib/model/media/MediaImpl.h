@@ -129,7 +129,7 @@ private:
     MediaState lockedStateAfter(const TimingEdit& edit) const;
     bool lockedTakeState(const MediaState& next);
 
-    Subject transitionSubject_;
+    PartSubject transitionSubject_; // notifies under the clip's token
     MediaState state_;
     TransitionPtr left_, right_;
     boost::weak_ptr<ProjectEditRate> editRate_;

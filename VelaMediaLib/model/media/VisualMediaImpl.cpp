@@ -19,7 +19,7 @@ std::vector<std::string> VisualMediaImpl::defaultParameterNames() const {
 }
 
 boost::shared_ptr<ParameterInterface> VisualMediaImpl::createDefaultParameter(const std::string& name) const {
-    const boost::weak_ptr<const ThreadSafe> token = parametersToken();
+    const boost::weak_ptr<const ThreadSafe> token = projectMutex();
     boost::shared_ptr<ParameterInterface> made;
     if (name == "scale")
         made = InterpolatingParam<Point3d>::create(token, name, kUnitScale);

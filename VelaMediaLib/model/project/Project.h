@@ -25,7 +25,9 @@ class Project : public XMLable,
                 public MetaDatable,
                 public Attributable {
 public:
-    /// Throws boost::bad_rational for a zero denominator; the rate is reduced.
+    /// The rate is reduced, a zero numerator giving 0/1 (as for every edit
+    /// rate, see SimpleProjectEditRate::rateOf). Throws boost::bad_rational
+    /// for a zero denominator, making no project.
     static boost::shared_ptr<Project> create(unsigned long numerator, unsigned long denominator);
     static boost::shared_ptr<Project> create(const boost::rational<unsigned long>& rate);
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/VelaObject.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <boost/shared_ptr.hpp>
@@ -11,21 +12,20 @@ namespace VelaMediaLib {
 class Source;
 
 /// The project's imported sources, in the order they came.
-class SourceBin : public VelaObject {
+class SourceBin : public VelaObject, public ProjectToken {
 public:
-    explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+    explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
 
     std::vector<boost::shared_ptr<Source>> sources() const {
-        ScopedReadLock lock(token_);
+        ScopedReadLock lock(projectMutex());
         return sources_;
     }
     size_t size() const {
-        ScopedReadLock lock(token_);
+        ScopedReadLock lock(projectMutex());
         return sources_.size();
     }
 
 private:
-    boost::weak_ptr<const ThreadSafe> token_;
     std::vector<boost::shared_ptr<Source>> sources_;
 };
 

@@ -8,20 +8,13 @@
 namespace VelaMediaLib {
 
 /// A part of a project: it finds the project's lock through the project's
-/// token and carries metadata.
+/// token (the object's one ProjectToken) and carries metadata.
 class SubProject : public VelaObject, public XMLable, public MetaDatable {
 public:
-    explicit SubProject(const boost::weak_ptr<const ThreadSafe>& token) : MetaDatable(token), token_(token) {}
+    explicit SubProject(const boost::weak_ptr<const ThreadSafe>& token) : MetaDatable(token) {}
 
     /// The project's lock, or null once the project has gone.
-    virtual ReadWriteMutex* mutex() const {
-        const boost::shared_ptr<const ThreadSafe> project = token_.lock();
-        return project ? &project->mutex() : nullptr;
-    }
-    virtual boost::weak_ptr<const ThreadSafe> projectMutex() const { return token_; }
-
-private:
-    const boost::weak_ptr<const ThreadSafe> token_;
+    virtual ReadWriteMutex* mutex() const { return metaDataMutex(); }
 };
 
 } // namespace VelaMediaLib

@@ -7,29 +7,28 @@
 namespace VelaMediaLib {
 
 /// The project's clipboard: clippings, each a copied portion of tracks.
-class ClipBoard : public VelaObject {
+class ClipBoard : public VelaObject, public ProjectToken {
 public:
-    explicit ClipBoard(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+    explicit ClipBoard(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
 
     void addClipping(const MixerPtr& clipping) {
-        ScopedWriteLock lock(token_);
+        ScopedWriteLock lock(projectMutex());
         clippings_.push_back(clipping);
     }
     /// Returns whether the clipboard held it.
     bool removeClipping(const MixerPtr& clipping) {
-        ScopedWriteLock lock(token_);
+        ScopedWriteLock lock(projectMutex());
         const auto found = std::find(clippings_.begin(), clippings_.end(), clipping);
         if (found == clippings_.end()) return false;
         clippings_.erase(found);
         return true;
     }
     std::vector<MixerPtr> clippings() const {
-        ScopedReadLock lock(token_);
+        ScopedReadLock lock(projectMutex());
         return clippings_;
     }
 
 private:
-    boost::weak_ptr<const ThreadSafe> token_;
     std::vector<MixerPtr> clippings_;
 };
 

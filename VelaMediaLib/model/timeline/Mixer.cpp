@@ -176,7 +176,7 @@ void Mixer::setParentGroup(const boost::weak_ptr<Media>& group) {
 
 void Mixer::attachAddObserver(MixerAddObserver* observer) { addObservers_.attach(observer); }
 
-void Mixer::detachAddObserver(MixerAddObserver* observer) { addObservers_.detach(observer); }
+void Mixer::detachAddObserver(MixerAddObserver* observer) { addObservers_.detach(observer, mutex()); }
 
 void Mixer::onTrackAddMedia(Track& track, const MediaPtr& media) {
     addObservers_.tell([&](MixerAddObserver& o) { o.onMixerAddMedia(*this, track, media); });

@@ -20,7 +20,7 @@ public:
     typedef std::vector<TrackPtr> Tracks;
 
     explicit Mixer(const boost::weak_ptr<const ThreadSafe>& token)
-        : SubTimeline(token), SubTimelineParts(token), addObservers_(token) {}
+        : SubTimeline(token), SubTimelineParts(token) {}
     ~Mixer() override;
     boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 

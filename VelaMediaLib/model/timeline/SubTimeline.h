@@ -14,7 +14,7 @@ namespace VelaMediaLib {
 /// that can be observed, carry parameters, effects and attributes, stand in
 /// time and have a name.
 class SubTimeline : public SubProject,
-                    public Observable,
+                    public virtual Observable,
                     public Parametric,
                     public Effectable,
                     public Attributable,

@@ -7,29 +7,28 @@
 namespace VelaMediaLib {
 
 /// What every concrete SubTimeline (clip, track, mixer) implements the same
-/// way: observation through a subject, an ordered effect list, and a name.
-/// Observers are told the object itself (the subject names it its owner).
+/// way: observation (the object is its own subject, sharing the object's one
+/// project token), an ordered effect list, and a name. Observers are told the
+/// object itself.
 /// A change that changes nothing (the same name, an effect swapped with
 /// itself) notifies nobody.
 /// Interface is SubTimeline or an interface derived from it, held as a
 /// virtual base so that clip families can share it.
 template <typename Interface>
-class SubTimelineParts : public virtual Interface {
+class SubTimelineParts : public virtual Interface, protected ObjectSubject {
 public:
     typedef Effectable::EffectPtr EffectPtr;
     typedef Effectable::Effects Effects;
 
     explicit SubTimelineParts(const boost::weak_ptr<const ThreadSafe>& token)
-        : Interface(token), subject_(token), effects_(token) {
-        subject_.setOwner(this);
-    }
+        : Interface(token), ObjectSubject(token), effects_(*this) {}
 
-    void attach(Observer* observer) override { subject_.attach(observer); }
+    void attach(Observer* observer) override { ObjectSubject::attach(observer); }
     void attachWithoutNotifyDelay(Observer* observer) override {
-        subject_.attachWithoutNotifyDelay(observer);
+        ObjectSubject::attachWithoutNotifyDelay(observer);
     }
-    void detach(Observer* observer) override { subject_.detach(observer); }
-    void notify() override { subject_.notify(); }
+    void detach(Observer* observer) override { ObjectSubject::detach(observer); }
+    void notify() override { ObjectSubject::notify(); }
 
     std::string identifier() const override {
         ScopedReadLock lock(this->projectMutex());
@@ -75,7 +74,6 @@ protected:
     const EffectList& effectList() const { return effects_; }
 
 private:
-    Subject subject_;
     EffectList effects_;
     std::string identifier_;
 };

@@ -31,7 +31,7 @@ TransformMatrix view(const Point3d& x, const Point3d& y, const Point3d& z, const
 } // namespace
 
 Timeline::Timeline(const boost::weak_ptr<const ThreadSafe>& token)
-    : SubProject(token), Subject(token), Parametric(token), Attributable(token), addObservers_(token) {}
+    : SubProject(token), ObjectSubject(token), Parametric(token), Attributable(token) {}
 
 Timeline::~Timeline() {
     for (const auto& entry : mixers_) entry.second->detachAddObserver(this);
@@ -58,7 +58,7 @@ double Timeline::defaultEyeDistance() const {
 }
 
 boost::shared_ptr<ParameterInterface> Timeline::createDefaultParameter(const std::string& name) const {
-    const boost::weak_ptr<const ThreadSafe> token = parametersToken();
+    const boost::weak_ptr<const ThreadSafe> token = projectMutex();
     if (name == "eyePosition")
         return InterpolatingParam<Point3d>::create(token, name, Point3d(0, 0, defaultEyeDistance()));
     if (name == "eyeLookAtPosition")
@@ -262,7 +262,7 @@ TransformMatrix Timeline::calcScreenTransformAtTime(const RationalTime& time) co
 
 void Timeline::attachAddObserver(TimelineAddObserver* observer) { addObservers_.attach(observer); }
 
-void Timeline::detachAddObserver(TimelineAddObserver* observer) { addObservers_.detach(observer); }
+void Timeline::detachAddObserver(TimelineAddObserver* observer) { addObservers_.detach(observer, mutex()); }
 
 void Timeline::onMixerAddTrack(Mixer& mixer, const TrackPtr& track) {
     addObservers_.tell([&](TimelineAddObserver& o) { o.onTimelineAddTrack(*this, mixer, track); });

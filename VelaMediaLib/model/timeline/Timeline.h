@@ -25,7 +25,7 @@ class Source;
 /// the canvas height exactly.
 class Timeline : public SubProject,
                  public Cloneable,
-                 public Subject,
+                 public ObjectSubject,
                  public Temporal,
                  public Parametric,
                  public TransformerImpl,
@@ -37,7 +37,6 @@ public:
     static boost::shared_ptr<Timeline> create(const boost::weak_ptr<const ThreadSafe>& token,
                                               int width = 1920, int height = 1080);
     ~Timeline() override;
-    using SubProject::projectMutex;
     boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
 
     // Mixers

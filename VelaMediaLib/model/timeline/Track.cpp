@@ -46,8 +46,7 @@ Range<VelaTime> previewOf(const Media& media, const Media::TimingEdit& edit) {
 
 Track::Track(const boost::weak_ptr<const ThreadSafe>& token)
     : SubTimeline(token), SubTimelineParts<SubTimeline>(token),
-      nodePool_(new std::pmr::unsynchronized_pool_resource()), medias_(nodePool_.get()),
-      addObservers_(token) {
+      nodePool_(new std::pmr::unsynchronized_pool_resource()), medias_(nodePool_.get()) {
     for (const char* key : kFlags) addAttribute<bool>(key, false);
 }
 
@@ -55,7 +54,7 @@ Track::~Track() = default;
 
 boost::shared_ptr<ParameterInterface> Track::createDefaultParameter(const std::string& name) const {
     if (name != "volume") return SubTimelineParts<SubTimeline>::createDefaultParameter(name);
-    const auto made = InterpolatingParam<double>::create(parametersToken(), name, 1.0);
+    const auto made = InterpolatingParam<double>::create(projectMutex(), name, 1.0);
     made->setTimeScalable(sharedTimeScale());
     return made;
 }
@@ -378,7 +377,7 @@ void Track::setParentStitchedMedia(const boost::weak_ptr<Media>& media) {
 
 void Track::attachAddObserver(TrackAddObserver* observer) { addObservers_.attach(observer); }
 
-void Track::detachAddObserver(TrackAddObserver* observer) { addObservers_.detach(observer); }
+void Track::detachAddObserver(TrackAddObserver* observer) { addObservers_.detach(observer, mutex()); }
 
 VelaTime Track::startTime() const {
     ScopedReadLock lock(projectMutex());

@@ -5,22 +5,22 @@
 namespace VelaMediaLib {
 
 Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
-    ScopedReadLock lock(attributesToken_);
+    ScopedReadLock lock(projectMutex());
     return attributes_.find(name);
 }
 
 Attributable::AttributePtr Attributable::insertAttribute(const AttributePtr& attribute) {
-    ScopedWriteLock lock(attributesToken_);
+    ScopedWriteLock lock(projectMutex());
     return attributes_.insertIfAbsent(attribute->name(), attribute);
 }
 
 Attributable::AttributePtr Attributable::insertAttributeIfAbsent(const AttributePtr& attribute) {
-    ScopedReadLock lock(attributesToken_);
+    ScopedReadLock lock(projectMutex());
     return attributes_.insertIfAbsent(attribute->name(), attribute);
 }
 
 std::vector<std::string> Attributable::attributeNames() const {
-    ScopedReadLock lock(attributesToken_);
+    ScopedReadLock lock(projectMutex());
     std::vector<std::string> names;
     attributes_.forEach([&](const std::string& name, const AttributePtr&) { names.push_back(name); });
     return names;
@@ -34,9 +34,9 @@ void Attributable::writeAttributes(XMLOptions& options, int indent) const {
 }
 
 void Attributable::copyAttributesTo(Attributable& other) const {
-    ScopedReadLock lock(attributesToken_);
+    ScopedReadLock lock(projectMutex());
     attributes_.forEach([&](const std::string& name, const AttributePtr& attribute) {
-        other.attributes_.set(name, attribute->cloneAttribute(other.attributesToken_));
+        other.attributes_.set(name, attribute->cloneAttribute(other.projectMutex()));
     });
 }
 

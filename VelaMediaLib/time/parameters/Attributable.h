@@ -2,6 +2,7 @@
 
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 
 #include <vector>
@@ -13,13 +14,14 @@ class XMLOptions;
 /// Named, typed, observable attributes of a model object ("width", "mixToMono",
 /// a track's "solo"). Each name holds one type; asking for it as another type
 /// answers null, adding it as another type throws TypeException.
-class Attributable {
+class Attributable : public virtual ProjectToken {
 public:
     typedef boost::shared_ptr<AttributeInterface> AttributePtr;
 
     explicit Attributable(
-        const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())
-        : attributesToken_(token) {}
+        const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>()) {
+        recordProjectToken(token);
+    }
     virtual ~Attributable() = default;
 
     template <typename T>
@@ -30,7 +32,7 @@ public:
     template <typename T>
     boost::shared_ptr<Attribute<T>> addAttribute(const std::string& name, const T& value) {
         AttributePtr kept = findAttribute(name);
-        if (!kept) kept = insertAttribute(AttributePtr(new Attribute<T>(name, value, attributesToken_)));
+        if (!kept) kept = insertAttribute(AttributePtr(new Attribute<T>(name, value, projectMutex())));
         const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(kept);
         if (!typed) throw TypeException("attribute " + name + " holds another type");
         typed->setValue(value); // tells nobody when it holds the value already
@@ -43,7 +45,7 @@ public:
     boost::shared_ptr<Attribute<T>> attributeOrAdd(const std::string& name, const T& initial) {
         if (const auto existing = attribute<T>(name)) return existing;
         const auto typed = boost::dynamic_pointer_cast<Attribute<T>>(
-            insertAttributeIfAbsent(AttributePtr(new Attribute<T>(name, initial, attributesToken_))));
+            insertAttributeIfAbsent(AttributePtr(new Attribute<T>(name, initial, projectMutex()))));
         if (!typed) throw TypeException("attribute " + name + " holds another type");
         return typed;
     }
@@ -61,8 +63,6 @@ public:
     void writeAttributes(XMLOptions& options, int indent) const;
 
 protected:
-    /// For an owner that learns its project's token after construction (the project itself).
-    void setAttributesToken(const boost::weak_ptr<const ThreadSafe>& token) { attributesToken_ = token; }
     /// Copies every attribute's value into another object's attributes.
     void copyAttributesTo(Attributable& other) const;
 
@@ -73,7 +73,6 @@ private:
     /// The attribute the name has, or else the given one, linked in under the read lock.
     AttributePtr insertAttributeIfAbsent(const AttributePtr& attribute);
 
-    boost::weak_ptr<const ThreadSafe> attributesToken_;
     NamedEntries<AttributeInterface> attributes_;
 };
 

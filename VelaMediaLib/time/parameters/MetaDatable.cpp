@@ -6,16 +6,16 @@
 
 namespace VelaMediaLib {
 
-MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }
 
 MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const std::string& value) {
     AttributePtr attribute;
     {
-        ScopedWriteLock lock(token_);
+        ScopedWriteLock lock(projectMutex());
         if (!metaData_) metaData_.reset(new Map);
         AttributePtr& slot = (*metaData_)[key];
         if (!slot) {
-            slot.reset(new Attribute<std::string>(key, value, token_));
+            slot.reset(new Attribute<std::string>(key, value, projectMutex()));
             return slot;
         }
         attribute = slot;
@@ -25,7 +25,7 @@ MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const
 }
 
 MetaDatable::AttributePtr MetaDatable::metaDataAttribute(const std::string& key) const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(projectMutex());
     if (!metaData_) return AttributePtr();
     const auto found = metaData_->find(key);
     return found == metaData_->end() ? AttributePtr() : found->second;
@@ -39,12 +39,12 @@ std::string MetaDatable::metaDataValue(const std::string& key) const {
 bool MetaDatable::hasMetaData(const std::string& key) const { return bool(metaDataAttribute(key)); }
 
 bool MetaDatable::removeMetaData(const std::string& key) {
-    ScopedWriteLock lock(token_);
+    ScopedWriteLock lock(projectMutex());
     return metaData_ && metaData_->erase(key) > 0;
 }
 
 std::vector<std::string> MetaDatable::metaDataKeys() const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(projectMutex());
     std::vector<std::string> keys;
     if (metaData_)
         for (const auto& entry : *metaData_) keys.push_back(entry.first);
@@ -52,19 +52,19 @@ std::vector<std::string> MetaDatable::metaDataKeys() const {
 }
 
 ReadWriteMutex* MetaDatable::metaDataMutex() const {
-    const boost::shared_ptr<const ThreadSafe> project = token_.lock();
+    const boost::shared_ptr<const ThreadSafe> project = projectMutex().lock();
     return project ? &project->mutex() : nullptr;
 }
 
 void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
-    ScopedWriteLock lock(token_);
-    token_ = token;
+    ScopedWriteLock lock(projectMutex());
+    replaceProjectToken(token);
     if (metaData_)
         for (auto& entry : *metaData_) entry.second->setProjectMutex(token);
 }
 
 std::map<std::string, std::string> MetaDatable::metaDataCopy() const {
-    ScopedReadLock lock(token_);
+    ScopedReadLock lock(projectMutex());
     std::map<std::string, std::string> copy;
     if (metaData_)
         for (const auto& entry : *metaData_) copy[entry.first] = entry.second->value();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/time/parameters/Attribute.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 
 #include <boost/shared_ptr.hpp>
 #include <map>
@@ -14,7 +15,7 @@ class XMLOptions;
 
 /// String metadata of an object: each key holds an observable attribute.
 /// Reads and writes take the project lock through the object's token.
-class MetaDatable {
+class MetaDatable : public virtual ProjectToken {
 public:
     typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
 
@@ -33,10 +34,11 @@ public:
     bool removeMetaData(const std::string& key);
     std::vector<std::string> metaDataKeys() const;
 
-    /// The project's token that guards the metadata, and the lock it leads to
-    /// (null once the project has gone).
-    const boost::weak_ptr<const ThreadSafe>& metaDataProjectMutex() const { return token_; }
+    /// The project's token that guards the metadata (the object's one token,
+    /// projectMutex()), and the lock it leads to (null once the project has gone).
+    const boost::weak_ptr<const ThreadSafe>& metaDataProjectMutex() const { return projectMutex(); }
     ReadWriteMutex* metaDataMutex() const;
+    /// Sets the token of the whole object and of its metadata attributes.
     void setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
 
     /// Writes the keys as the "metadata" member of the object being written
@@ -50,7 +52,6 @@ public:
 private:
     typedef std::map<std::string, AttributePtr> Map;
     std::unique_ptr<Map> metaData_; // allocated with the first key: most objects carry none
-    boost::weak_ptr<const ThreadSafe> token_;
 };
 
 } // namespace VelaMediaLib

@@ -30,7 +30,7 @@ boost::shared_ptr<ParameterInterface> Parametric::createDefaultParameter(const s
 }
 
 boost::shared_ptr<ParameterInterface> Parametric::madeParameter(const std::string& name) const {
-    ScopedReadLock lock(parametersToken_);
+    ScopedReadLock lock(projectMutex());
     return parameters_.find(name);
 }
 
@@ -40,14 +40,14 @@ boost::shared_ptr<ParameterInterface> Parametric::parameter(const std::string& n
     if (const auto made = madeParameter(name)) return made;
     const boost::shared_ptr<ParameterInterface> created = createDefaultParameter(name);
     if (!created) return created;
-    ScopedReadLock lock(parametersToken_);
+    ScopedReadLock lock(projectMutex());
     return parameters_.insertIfAbsent(name, created);
 }
 
 std::vector<std::string> Parametric::parameterNames() const {
     std::vector<std::string> names = defaultParameterNames();
     {
-        ScopedReadLock lock(parametersToken_);
+        ScopedReadLock lock(projectMutex());
         parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>&) {
             names.push_back(name);
         });
@@ -60,7 +60,7 @@ std::vector<std::string> Parametric::parameterNames() const {
 void Parametric::addParameter(const std::string& name,
                               const boost::shared_ptr<ParameterInterface>& parameter) {
     if (!parameter) throw AddRemoveException("no parameter to add as " + name);
-    ScopedWriteLock lock(parametersToken_);
+    ScopedWriteLock lock(projectMutex());
     parameters_.set(name, parameter);
 }
 
@@ -69,7 +69,7 @@ bool Parametric::hasMadeParameter(const std::string& name) const { return bool(m
 void Parametric::toJSONParameterList(XMLOptions& options, int indent) const {
     NamedParameters made;
     {
-        ScopedReadLock lock(parametersToken_);
+        ScopedReadLock lock(projectMutex());
         parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
             made.emplace_back(name, p);
         });
@@ -98,7 +98,7 @@ void Parametric::readParameterList(const Json::Value& parameters) {
     if (read.empty()) return;
     std::vector<boost::shared_ptr<ParameterInterface>> changed;
     {
-        ScopedWriteLock lock(parametersToken_);
+        ScopedWriteLock lock(projectMutex());
         for (const auto& entry : read) {
             const boost::shared_ptr<ParameterInterface> existing = parameters_.find(entry.first);
             if (existing && existing->takeStateOf(*entry.second))
@@ -112,7 +112,7 @@ void Parametric::readParameterList(const Json::Value& parameters) {
 }
 
 void Parametric::cloneParametersInto(Parametric& other) const {
-    ScopedReadLock lock(parametersToken_);
+    ScopedReadLock lock(projectMutex());
     parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
         const boost::shared_ptr<ParameterInterface> copy = p->cloneParameter();
         copy->setTimeScalable(other.sharedTimeScale());

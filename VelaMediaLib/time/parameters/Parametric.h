@@ -2,6 +2,7 @@
 
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/parameters/Parameter.h>
 #include <VelaMediaLib/time/rational/TimeScalable.h>
 
@@ -21,9 +22,9 @@ class XMLOptions;
 /// the read lock (the new parameter holds the default they would have
 /// answered) and never asks for the write lock, so a reader's snapshot stays
 /// one.
-class Parametric : public virtual XMLIdentified, public virtual TimeScalable {
+class Parametric : public virtual XMLIdentified, public virtual TimeScalable, public virtual ProjectToken {
 public:
-    explicit Parametric(const boost::weak_ptr<const ThreadSafe>& token) : parametersToken_(token) {}
+    explicit Parametric(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }
 
     /// The parameter of the name, made with its default if need be; null for
     /// a name the object does not have. Takes only the read lock.
@@ -70,12 +71,10 @@ protected:
     virtual std::vector<std::string> defaultParameterNames() const { return {}; }
     /// Clones of the parameters made so far, for a cloned object.
     void cloneParametersInto(Parametric& other) const;
-    const boost::weak_ptr<const ThreadSafe>& parametersToken() const { return parametersToken_; }
 
 private:
     boost::shared_ptr<ParameterInterface> madeParameter(const std::string& name) const;
 
-    boost::weak_ptr<const ThreadSafe> parametersToken_;
     mutable NamedEntries<ParameterInterface> parameters_;
 };
 

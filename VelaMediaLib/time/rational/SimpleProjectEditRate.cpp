@@ -1,30 +1,24 @@
 #include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
 
-#include <VelaMediaLib/base/VelaMediaLibException.h>
-
 namespace VelaMediaLib {
-namespace {
 
-void checkRate(const boost::rational<unsigned long>& rate) {
-    if (rate.numerator() == 0)
-        throw ValueException<boost::rational<unsigned long>>("edit rate must not be zero", rate);
-}
+SimpleProjectEditRate::SimpleProjectEditRate(const boost::rational<unsigned long>& rate) : rate_(rate) {}
 
-} // namespace
-
-SimpleProjectEditRate::SimpleProjectEditRate(const boost::rational<unsigned long>& rate)
-    : numerator_(rate.numerator()), denominator_(rate.denominator()) {
-    checkRate(rate);
+boost::rational<unsigned long> SimpleProjectEditRate::rateOf(unsigned long numerator,
+                                                             unsigned long denominator) {
+    return boost::rational<unsigned long>(numerator, denominator); // a zero denominator throws bad_rational
 }
 
 boost::rational<unsigned long> SimpleProjectEditRate::editRate() const {
-    return boost::rational<unsigned long>(numerator_.load(), denominator_.load());
+    std::lock_guard<std::mutex> lock(rateMutex_);
+    return rate_;
 }
 
 void SimpleProjectEditRate::setEditRate(const boost::rational<unsigned long>& rate) {
-    checkRate(rate);
-    numerator_.store(rate.numerator());
-    denominator_.store(rate.denominator());
+    {
+        std::lock_guard<std::mutex> lock(rateMutex_);
+        rate_ = rate;
+    }
     subject_.notify();
 }
 

@@ -3,17 +3,22 @@
 #include <VelaMediaLib/time/rational/ProjectEditRate.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
 
-#include <atomic>
+#include <mutex>
 
 namespace VelaMediaLib {
 
-/// An edit rate held as a value, with fixed frame and sample answers. The
-/// rate itself is read and written atomically so that a reader on another
-/// thread never sees a torn rational.
+/// An edit rate held as a value, with fixed frame and sample answers; the
+/// project keeps its rate in one of these. Every rate that reaches it is a
+/// reduced rational: a zero numerator is the rate 0/1, and a zero denominator
+/// never gets this far (the rational refuses it, see rateOf).
 class SimpleProjectEditRate : public ProjectEditRate {
 public:
-    /// Throws ValueException for a zero rate.
     explicit SimpleProjectEditRate(const boost::rational<unsigned long>& rate);
+
+    /// The rate of the frames per seconds given, as every entry point builds
+    /// it: reduced, a zero numerator giving 0/1. Throws boost::bad_rational
+    /// ("bad rational: zero denominator") for a zero denominator.
+    static boost::rational<unsigned long> rateOf(unsigned long numerator, unsigned long denominator);
 
     boost::rational<unsigned long> editRate() const override;
     int32_t durationPerFrame() const override { return 1; }
@@ -26,8 +31,10 @@ public:
     void setEditRate(const boost::rational<unsigned long>& rate) override;
 
 private:
-    std::atomic<unsigned long> numerator_;
-    std::atomic<unsigned long> denominator_;
+    // Numerator and denominator change together: a reader never sees half of
+    // a new rate.
+    mutable std::mutex rateMutex_;
+    boost::rational<unsigned long> rate_;
     mutable SubjectWithMutex subject_;
 };
 

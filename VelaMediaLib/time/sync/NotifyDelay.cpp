@@ -40,7 +40,7 @@ bool NotifyDelay::deliverNext() {
     NotifyDelayState& s = stateOf(*token_);
     boost::shared_ptr<const void> keep;
     ScopedReadLock read(token_->mutex());
-    Subject* next = nullptr;
+    SubjectBase* next = nullptr;
     {
         std::lock_guard<std::mutex> lock(s.mutex_);
         if (s.waiting_.empty()) {
@@ -85,7 +85,7 @@ bool NotifyDelay::isNotifying(const boost::shared_ptr<const ThreadSafe>& token) 
     return s.count_ < 0;
 }
 
-bool NotifyDelay::addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token) {
+bool NotifyDelay::addSubject(SubjectBase* subject, const boost::shared_ptr<const ThreadSafe>& token) {
     if (!subject || !token) return false;
     NotifyDelayState& s = stateOf(*token);
     std::lock_guard<std::mutex> lock(s.mutex_);
@@ -99,7 +99,7 @@ bool NotifyDelay::addSubject(Subject* subject, const boost::shared_ptr<const Thr
     return true;
 }
 
-void NotifyDelay::removeSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token) {
+void NotifyDelay::removeSubject(SubjectBase* subject, const boost::shared_ptr<const ThreadSafe>& token) {
     if (!subject || !token) return;
     NotifyDelayState& s = stateOf(*token);
     std::unique_lock<std::mutex> lock(s.mutex_);

@@ -9,7 +9,7 @@
 
 namespace VelaMediaLib {
 
-class Subject;
+class SubjectBase;
 class ThreadSafe;
 
 /// The delay state of one project, held by the project itself (its
@@ -28,7 +28,7 @@ private:
     friend class NotifyDelay;
 
     struct Waiting {
-        Subject* subject;
+        SubjectBase* subject;
         boost::weak_ptr<const void> lifeline;
         bool kept; // whether the lifeline held the subject when it was parked
     };
@@ -37,7 +37,7 @@ private:
     std::condition_variable delivered_;
     int count_ = 0; // > 0: live delays; 0: idle; -1: delivering
     std::deque<Waiting> waiting_;
-    Subject* delivering_ = nullptr;
+    SubjectBase* delivering_ = nullptr;
     std::thread::id deliverer_;
 };
 
@@ -65,12 +65,12 @@ public:
     /// Holds the subject back if a delay of the project is active, checking
     /// and parking in one step; returns whether it did. A subject is held
     /// back once however often it changes.
-    static bool addSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token);
+    static bool addSubject(SubjectBase* subject, const boost::shared_ptr<const ThreadSafe>& token);
     /// Forgets a held-back subject (one that is destroyed). A subject without
     /// a lifeline that another thread is delivering at that moment waits
     /// until that delivery has ended (one with a lifeline cannot be destroyed
     /// then).
-    static void removeSubject(Subject* subject, const boost::shared_ptr<const ThreadSafe>& token);
+    static void removeSubject(SubjectBase* subject, const boost::shared_ptr<const ThreadSafe>& token);
     /// Forgets every subject the project holds back (they will not be told).
     static void removeMappingForThreadSafe(const ThreadSafe* token);
 

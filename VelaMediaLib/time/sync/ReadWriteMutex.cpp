@@ -119,6 +119,14 @@ void ReadWriteMutex::unlockRead() {
     readers.store(readers.load(std::memory_order_relaxed) - 1, std::memory_order_release);
 }
 
+bool ReadWriteMutex::heldByThisThread() const {
+    if (writerOwner_.load(std::memory_order_relaxed) == self()) return true;
+    const int index = slotOfThread;
+    if (index < 0) return false; // this thread has never locked anything
+    if (index == kSharedSlot) return findHeld(this) != nullptr;
+    return slots_[index].readers.load(std::memory_order_relaxed) != 0;
+}
+
 void ReadWriteMutex::lockReadShared() {
     if (Held* entry = findHeld(this)) {
         ++entry->reads;

@@ -34,6 +34,8 @@ public:
     void unlockWrite();
     /// Whether a writer holds the lock or waits for it (for diagnostics and tests).
     bool hasWriter() const { return writer_.load(std::memory_order_acquire); }
+    /// Whether the calling thread holds the lock, for reading or writing.
+    bool heldByThisThread() const;
 
     /// Guards that take the lock for their lifetime. The token forms lock the
     /// project's mutex while the project lives, and nothing once it has gone.

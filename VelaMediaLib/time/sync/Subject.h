@@ -1,6 +1,8 @@
 #pragma once
 
 #include <VelaMediaLib/time/sync/Observable.h>
+#include <VelaMediaLib/time/sync/ObserverList.h>
+#include <VelaMediaLib/time/sync/ProjectToken.h>
 
 #include <atomic>
 #include <boost/weak_ptr.hpp>
@@ -12,17 +14,18 @@ namespace VelaMediaLib {
 class ThreadSafe;
 class NotifyDelay;
 
-/// A subject of one project: two observer lists (ordinary ones, which a
-/// NotifyDelay holds back, and ones that are always told at once), a disable
-/// counter and the project's token. An observer sits in one list at a time.
+/// What every subject of a project does: two observer lists (ordinary ones,
+/// which a NotifyDelay holds back, and ones that are always told at once) and
+/// a disable counter. An observer sits in one list at a time. The project's
+/// token comes from subjectToken: a Subject keeps its own, an ObjectSubject
+/// shares its object's ProjectToken, a PartSubject asks the object it is a
+/// part of.
 ///
-/// Every subject guards its lists the same way: list changes and the copies
-/// that walks take hold a small mutex from a process-wide table (chosen by the
-/// subject's address), so attach and detach are safe while another thread
-/// notifies, and a subject costs no mutex of its own. Observers are never
-/// called under that mutex: a walk tells a snapshot and skips observers
-/// detached meanwhile. Notifications run under the project's read lock, so an
-/// observer detached under the write lock is certain not to be called any more.
+/// The lists follow ObserverList's policy: safe to change on any thread,
+/// observers told from a snapshot and never under a lock of the lists, their
+/// exceptions dropped, and detach returning only once the observer's calls on
+/// other threads have ended. Notifications run under the project's read lock,
+/// so an observer detached under the write lock is not running either.
 ///
 /// A notification held back by a NotifyDelay is delivered holding the
 /// subject's lifeline (its owner's, when it has one), so neither the owner nor
@@ -31,12 +34,12 @@ class NotifyDelay;
 /// the delivery to end (by then the parts of any object it belongs to are
 /// gone: such objects give a lifeline); one destroyed by its own observer
 /// ends its delivery.
-class Subject : public Observable {
+class SubjectBase : public virtual Observable {
 public:
-    explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
-    ~Subject() override;
-    Subject(const Subject&) = delete;
-    Subject& operator=(const Subject&) = delete;
+    SubjectBase() = default;
+    ~SubjectBase() override = default;
+    SubjectBase(const SubjectBase&) = delete;
+    SubjectBase& operator=(const SubjectBase&) = delete;
 
     void attach(Observer* observer) override;
     void attachWithoutNotifyDelay(Observer* observer) override;
@@ -48,13 +51,13 @@ public:
     /// Raises the disable counter for its lifetime; disablers nest.
     class NotifyDisabler {
     public:
-        explicit NotifyDisabler(Subject& subject);
+        explicit NotifyDisabler(SubjectBase& subject);
         ~NotifyDisabler();
         NotifyDisabler(const NotifyDisabler&) = delete;
         NotifyDisabler& operator=(const NotifyDisabler&) = delete;
 
     private:
-        Subject& subject_;
+        SubjectBase& subject_;
     };
     NotifyDisabler disableNotifies() { return NotifyDisabler(*this); }
     bool notifiesEnabled() const { return disableCount_.load() <= 0; }
@@ -67,13 +70,14 @@ public:
     /// The owner's lifeline, or none.
     boost::weak_ptr<const void> lifeline() const override;
 
-    const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
-    /// Set before the subject is shared with other threads. A notification
-    /// the old project's delay holds back moves to the new project (held back
-    /// by its delay, or told at once).
-    void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
-
 protected:
+    /// The token of the project the subject notifies in.
+    virtual const boost::weak_ptr<const ThreadSafe>& subjectToken() const = 0;
+    /// Takes the subject out of the delay of the project of `token`, if it is
+    /// held back there; returns whether it was. Called by destructors (which
+    /// must not ask subjectToken) and when the token changes.
+    bool leaveDelay(const boost::weak_ptr<const ThreadSafe>& token);
+
     /// Whether the subject still exists, asked after each observer of a
     /// delayed delivery (an observer may destroy the subject).
     typedef std::function<bool()> StillHere;
@@ -83,27 +87,60 @@ protected:
 
 private:
     friend class NotifyDelay;
-    enum ListKind { Ordinary, WithoutDelay };
-    // Most subjects (keyframes, parameters, attributes) never have observers:
-    // the lists are allocated with the first one.
-    struct Lists {
-        std::vector<Observer*> ordinary;
-        std::vector<Observer*> withoutDelay;
-        std::vector<Observer*>& of(ListKind kind) { return kind == Ordinary ? ordinary : withoutDelay; }
-    };
-    void add(ListKind kind, Observer* observer);
-    std::vector<Observer*> snapshot(ListKind kind) const;
-    bool stillIn(ListKind kind, Observer* observer) const;
-    /// Without `stillHere` failures go to the caller; with it (delayed
-    /// delivery) they are dropped. Returns whether the subject is still here.
-    bool tell(ListKind kind, const std::vector<Observer*>& observers, std::vector<Observer*>& told,
-              const StillHere* stillHere);
+    /// Tells the observers of the snapshot still in the list, each once per
+    /// notification. Returns whether the subject is still here.
+    bool tell(ObserverList::Kind kind, std::vector<void*>& told, const StillHere* stillHere);
 
-    std::atomic<Lists*> lists_{nullptr};
+    ObserverList observers_;
     std::atomic<int> disableCount_{0};
     std::atomic<bool> parked_{false}; // held back by its project's delay; written under that delay's mutex
     Observable* owner_ = nullptr;
+};
+
+/// A subject on its own (a parameter, an attribute, a keyframe's owner): it
+/// keeps the project's token itself.
+class Subject : public SubjectBase {
+public:
+    explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
+    ~Subject() override;
+
+    const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
+    /// Set before the subject is shared with other threads. A notification
+    /// the old project's delay holds back moves to the new project (held back
+    /// by its delay, or told at once).
+    void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
+
+protected:
+    const boost::weak_ptr<const ThreadSafe>& subjectToken() const override { return token_; }
+
+private:
     boost::weak_ptr<const ThreadSafe> token_;
+};
+
+/// The subject part of an object whose parts share one ProjectToken (a clip,
+/// a track, the timeline): it keeps no token of its own.
+class ObjectSubject : public SubjectBase, public virtual ProjectToken {
+public:
+    explicit ObjectSubject(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }
+    ~ObjectSubject() override;
+
+protected:
+    const boost::weak_ptr<const ThreadSafe>& subjectToken() const override { return projectMutex(); }
+};
+
+/// A further subject of an object (a clip's transition subject) that
+/// notifies under the token of the object it is a part of, keeping no copy.
+/// The object outlives it: it is a member of that object.
+class PartSubject : public SubjectBase {
+public:
+    explicit PartSubject(const ProjectToken& object) : object_(object) {}
+    ~PartSubject() override;
+
+protected:
+    const boost::weak_ptr<const ThreadSafe>& subjectToken() const override { return object_.projectMutex(); }
+
+private:
+    const ProjectToken& object_;
 };
 
 } // namespace VelaMediaLib
