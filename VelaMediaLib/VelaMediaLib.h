@@ -68,6 +68,7 @@
 #include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/model/project/SubProject.h>
 #include <VelaMediaLib/model/timeline/ClipBoard.h>
+#include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>

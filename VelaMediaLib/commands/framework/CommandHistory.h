@@ -132,6 +132,8 @@ private:
                 Replay step);
 
     CommandHandler* handler_;
+    // The history's one token. Its subject base is given none: the history's
+    // observers hear at once, never held back by the delays its own steps open.
     boost::weak_ptr<const ThreadSafe> token_;
     bool bound_; // given a token: the steps need its project
     CommandHistoryState state_;

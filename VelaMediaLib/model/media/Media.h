@@ -1,6 +1,6 @@
 #pragma once
 
-#include <VelaMediaLib/time/rational/TimeExceptions.h>
+#include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
 #include <VelaMediaLib/model/media/MediaState.h>

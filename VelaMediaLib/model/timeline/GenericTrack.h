@@ -1,6 +1,6 @@
 #pragma once
 
-#include <VelaMediaLib/time/rational/TimeExceptions.h>
+#include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
 namespace VelaMediaLib {

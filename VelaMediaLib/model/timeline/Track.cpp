@@ -1,4 +1,4 @@
-#include <VelaMediaLib/time/rational/TimeExceptions.h>
+#include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
 #include <VelaMediaLib/model/timeline/Mixer.h>
