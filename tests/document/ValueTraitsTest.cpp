@@ -205,6 +205,16 @@ TEST(JSONWriter, IndentsNestedObjectsAndArrays) {
     EXPECT_EQ(empty.str(), "{\n  }");
 }
 
+TEST(JSONWriter, RefusesAKeyInAnArrayAndAnElementInAnObject) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    JSONWriter object(options, 0);
+    EXPECT_THROW(options.element(), VelaMediaLibException);
+    options.key("list");
+    JSONWriter list(options, 1, JSONWriter::Array);
+    EXPECT_THROW(options.key("x"), VelaMediaLibException);
+}
+
 TEST(XMLOptions, IdentsAndPaths) {
     std::ostringstream out;
     XMLOptions options(out);

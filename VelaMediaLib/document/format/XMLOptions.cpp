@@ -1,5 +1,6 @@
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
+#include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 
 namespace VelaMediaLib {
@@ -10,21 +11,24 @@ std::string XMLOptions::indentation(int level) const {
     return std::string(size_t(level > 0 ? level * indentWidth_ : 0), ' ');
 }
 
-void XMLOptions::separate() {
+void XMLOptions::separate(bool array) {
     if (open_.empty()) return;
     Container& innermost = open_.back();
+    if (innermost.array != array)
+        throw VelaMediaLibException(array ? "an array element written inside an object"
+                                          : "an object member written inside an array");
     if (!innermost.empty) stream_ << ",\n";
     innermost.empty = false;
     stream_ << indentation(innermost.level + 1);
 }
 
 std::ostream& XMLOptions::key(const std::string& name) {
-    separate();
+    separate(false);
     return stream_ << keyName(name);
 }
 
 std::ostream& XMLOptions::element() {
-    separate();
+    separate(true);
     return stream_;
 }
 

@@ -13,7 +13,8 @@ namespace VelaMediaLib {
 /// writer knows whether a separator comes before the next member), the
 /// identity table that gives every written object a fresh "id" (so references
 /// name ids of the same write), and the modifier applied to every file path
-/// written.
+/// written. One options object serves one document: its identifiers count
+/// on and its table is never cleared.
 class XMLOptions {
 public:
     typedef boost::function<std::string(const std::string&)> PathModifier;
@@ -26,15 +27,13 @@ public:
     std::string indentation(int level) const;
 
     /// Starts the next member of the innermost open object: separator,
-    /// indentation and key. With nothing open, the key alone.
+    /// indentation and key. With nothing open, the key alone. Throws
+    /// VelaMediaLibException inside an open array (the text would not be JSON).
     std::ostream& key(const std::string& name);
     /// Starts the next element of the innermost open array: separator and
-    /// indentation. With nothing open, nothing.
+    /// indentation. With nothing open, nothing. Throws VelaMediaLibException
+    /// inside an open object.
     std::ostream& element();
-    /// Opens an object or array whose closing bracket stands at the level;
-    /// JSONWriter does this and closeContainer.
-    void openContainer(int level, bool array);
-    void closeContainer();
 
     /// A fresh identifier for the object, remembered for findIdent. Identifiers
     /// count from 1 within one write.
@@ -47,12 +46,17 @@ public:
     std::string modifyPath(const std::string& path) const;
 
 private:
+    friend class JSONWriter;
+    /// Opens an object or array whose closing bracket stands at the level.
+    void openContainer(int level, bool array);
+    void closeContainer();
+
     struct Container {
         int level;
         bool array;
         bool empty;
     };
-    void separate();
+    void separate(bool array);
 
     std::ostream& stream_;
     int indentWidth_;
