@@ -4,6 +4,7 @@
 // "\"key\" : ", and closing brackets stand on their own line at the level of
 // the opening key.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
 #include <string>
@@ -11,13 +12,13 @@
 namespace VelaMediaLib {
 
 /// The quoted, escaped key followed by " : ".
-std::string keyName(const std::string& key);
+VELAMEDIALIB_API std::string keyName(const std::string& key);
 /// The text as a JSON string literal, quotes included.
-std::string quotedJSONString(const std::string& text);
+VELAMEDIALIB_API std::string quotedJSONString(const std::string& text);
 
 /// Writes one JSON object or array whose members stand at level + 1. The
 /// closing bracket is written by close() or, failing that, the destructor.
-class JSONWriter {
+class VELAMEDIALIB_API JSONWriter {
 public:
     enum Kind { Object, Array };
 

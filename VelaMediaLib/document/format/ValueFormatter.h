@@ -7,6 +7,7 @@
 // back as the same double; a value that is not finite is written as null and
 // read back as NaN.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/CaptionData.h>
 #include <VelaMediaLib/base/KeystrokeData.h>
@@ -18,25 +19,29 @@
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
-#include <json/value.h>
 #include <list>
 #include <ostream>
 #include <string>
 #include <vector>
+
+// Documents are read from jsoncpp values; only the library needs their definition.
+namespace Json {
+class Value;
+} // namespace Json
 
 namespace VelaMediaLib {
 
 template <typename T>
 struct ValueFormatter; // write(std::ostream&, const T&) and read(const Json::Value&)
 
-std::string formatDouble(double value);
-std::string formatFloat(float value);
+VELAMEDIALIB_API std::string formatDouble(double value);
+VELAMEDIALIB_API std::string formatFloat(float value);
 /// The value on one line, for messages.
-std::string compactJSON(const Json::Value& value);
+VELAMEDIALIB_API std::string compactJSON(const Json::Value& value);
 
 #define VELA_VALUE_FORMATTER(Type)                                                                           \
     template <>                                                                                              \
-    struct ValueFormatter<Type> {                                                                            \
+    struct VELAMEDIALIB_API ValueFormatter<Type> {                                                           \
         static void write(std::ostream& out, const Type& value);                                             \
         static Type read(const Json::Value& json);                                                           \
     }

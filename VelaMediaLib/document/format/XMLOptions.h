@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/function.hpp>
 #include <map>
 #include <ostream>
@@ -11,7 +13,7 @@ namespace VelaMediaLib {
 /// indentation level is, the identity table that gives every written object
 /// a fresh "id" (so references name ids of the same write), and the modifier
 /// applied to every file path written.
-class XMLOptions {
+class VELAMEDIALIB_API XMLOptions {
 public:
     typedef boost::function<std::string(const std::string&)> PathModifier;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
@@ -11,7 +12,7 @@ namespace VelaMediaLib {
 class Source;
 
 /// The project's imported sources, in the order they came.
-class SourceBin : public VelaObject {
+class VELAMEDIALIB_API SourceBin : public VelaObject {
 public:
     explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
 

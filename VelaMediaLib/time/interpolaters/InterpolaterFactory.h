@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/Point3d.h>
 #include <VelaMediaLib/base/Rect.h>
@@ -24,7 +25,7 @@ namespace VelaMediaLib {
 /// numeric and geometric types tween linearly and with the exponential
 /// eases; some of those also have the in-out, bounce and spring curves.
 template <typename T>
-struct InterpolaterKinds {
+struct VELAMEDIALIB_TEMPLATE_API InterpolaterKinds {
     static constexpr bool linear =
         std::is_same<T, int>::value || std::is_same<T, float>::value || std::is_same<T, double>::value ||
         std::is_same<T, long long>::value || std::is_same<T, Rect<float>>::value ||
@@ -39,7 +40,7 @@ struct InterpolaterKinds {
 /// The shared interpolater of a name for a value type. A name the type does
 /// not have throws ParserException "trying to read an unknown interpolater".
 template <typename T>
-class InterpolaterFactory {
+class VELAMEDIALIB_TEMPLATE_API InterpolaterFactory {
 public:
     typedef boost::shared_ptr<Interpolater<T>> Pointer;
 

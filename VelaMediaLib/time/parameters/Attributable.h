@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
@@ -13,7 +14,7 @@ class JSONWriter;
 /// Named, typed, observable attributes of a model object ("width", "mixToMono",
 /// a track's "solo"). Each name holds one type; asking for it as another type
 /// answers null, adding it as another type throws TypeException.
-class Attributable {
+class VELAMEDIALIB_API Attributable {
 public:
     typedef boost::shared_ptr<AttributeInterface> AttributePtr;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
 #include <algorithm>
@@ -12,13 +13,13 @@ namespace VelaMediaLib {
 /// vector sorted by time so that lookups are binary searches over memory
 /// that lies together.
 template <typename K>
-struct KeyFrameEntry {
+struct VELAMEDIALIB_TEMPLATE_API KeyFrameEntry {
     RationalTime time;
     boost::shared_ptr<K> keyframe;
 };
 
 template <typename K>
-class KeyFrameMapUtil {
+class VELAMEDIALIB_TEMPLATE_API KeyFrameMapUtil {
 public:
     typedef std::vector<KeyFrameEntry<K>> Map;
     typedef typename Map::iterator Iterator;

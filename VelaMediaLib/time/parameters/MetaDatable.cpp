@@ -4,6 +4,8 @@
 #include <VelaMediaLib/document/format/ValueFormatter.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
+#include <json/value.h>
+
 namespace VelaMediaLib {
 
 MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 
 #include <boost/shared_ptr.hpp>
@@ -14,7 +15,7 @@ class JSONWriter;
 
 /// String metadata of an object: each key holds an observable attribute.
 /// Reads and writes take the project lock through the object's token.
-class MetaDatable {
+class VELAMEDIALIB_API MetaDatable {
 public:
     typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
 

@@ -4,6 +4,7 @@
 // for real numbers: a millionth relative for float members, a billionth
 // relative for double members; other values compare exactly).
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/CaptionData.h>
 #include <VelaMediaLib/base/KeystrokeData.h>
@@ -81,7 +82,7 @@ struct ParameterTraits;
 
 #define VELA_PARAMETER_TYPE_NAME(Type, Name)                                                                 \
     template <>                                                                                              \
-    struct ParameterTraits<Type> {                                                                           \
+    struct VELAMEDIALIB_API ParameterTraits<Type> {                                                          \
         static const char* typeName() { return Name; }                                                       \
     }
 
@@ -106,7 +107,7 @@ VELA_PARAMETER_TYPE_NAME(std::vector<double>, "vector");
 
 /// Parameters whose value is itself an interpolater.
 template <typename X>
-struct ParameterTraits<boost::shared_ptr<Interpolater<X>>> {
+struct VELAMEDIALIB_TEMPLATE_API ParameterTraits<boost::shared_ptr<Interpolater<X>>> {
     static const char* typeName() { return "interpolater"; }
 };
 

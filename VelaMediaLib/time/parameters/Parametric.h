@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
 #include <VelaMediaLib/time/parameters/Parameter.h>
@@ -21,7 +22,7 @@ class JSONWriter;
 /// the read lock (the new parameter holds the default they would have
 /// answered) and never asks for the write lock, so a reader's snapshot stays
 /// one.
-class Parametric : public virtual XMLIdentified, public virtual TimeScalable {
+class VELAMEDIALIB_API Parametric : public virtual XMLIdentified, public virtual TimeScalable {
 public:
     explicit Parametric(const boost::weak_ptr<const ThreadSafe>& token) : parametersToken_(token) {}
 

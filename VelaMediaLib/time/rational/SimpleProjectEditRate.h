@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/ProjectEditRate.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
 
@@ -10,7 +11,7 @@ namespace VelaMediaLib {
 /// An edit rate held as a value, with fixed frame and sample answers. The
 /// rate itself is read and written atomically so that a reader on another
 /// thread never sees a torn rational.
-class SimpleProjectEditRate : public ProjectEditRate {
+class VELAMEDIALIB_API SimpleProjectEditRate : public ProjectEditRate {
 public:
     /// Throws ValueException for a zero rate.
     explicit SimpleProjectEditRate(const boost::rational<unsigned long>& rate);

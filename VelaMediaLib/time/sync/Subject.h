@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Observable.h>
 
 #include <atomic>
@@ -31,7 +32,7 @@ class NotifyDelay;
 /// the delivery to end (by then the parts of any object it belongs to are
 /// gone: such objects give a lifeline); one destroyed by its own observer
 /// ends its delivery.
-class Subject : public Observable {
+class VELAMEDIALIB_API Subject : public Observable {
 public:
     explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
     ~Subject() override;

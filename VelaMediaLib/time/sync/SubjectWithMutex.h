@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 #include <VelaMediaLib/time/sync/Subject.h>
 
@@ -18,7 +19,7 @@ namespace VelaMediaLib {
 /// that mutex, as an edit holding the write lock that detaches takes it after;
 /// observers run holding the mutex, so they must not wait for another thread
 /// that attaches to or detaches from the same subject, nor destroy it.
-class SubjectWithMutex : public Subject {
+class VELAMEDIALIB_API SubjectWithMutex : public Subject {
 public:
     using Subject::Subject;
 
