@@ -13,7 +13,7 @@ namespace VelaMediaLib {
 /// transitions with its touching neighbours (and placing it back does so
 /// again), so an undo puts back what was taken and transitions come back
 /// exactly. Clips without any transition among them take no room.
-class VELAMEDIALIB_API TransitionSlots {
+class TransitionSlots {
 public:
     /// Takes the clip and the clips of the track touching or inside the range
     /// (where placing the clip joins transitions).

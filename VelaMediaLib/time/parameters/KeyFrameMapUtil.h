@@ -1,6 +1,5 @@
 #pragma once
 
-#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
 #include <algorithm>
@@ -13,13 +12,13 @@ namespace VelaMediaLib {
 /// vector sorted by time so that lookups are binary searches over memory
 /// that lies together.
 template <typename K>
-struct VELAMEDIALIB_TEMPLATE_API KeyFrameEntry {
+struct KeyFrameEntry {
     RationalTime time;
     boost::shared_ptr<K> keyframe;
 };
 
 template <typename K>
-class VELAMEDIALIB_TEMPLATE_API KeyFrameMapUtil {
+class KeyFrameMapUtil {
 public:
     typedef std::vector<KeyFrameEntry<K>> Map;
     typedef typename Map::iterator Iterator;

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
 #include <algorithm>
@@ -17,7 +16,7 @@ namespace VelaMediaLib {
 /// exception is dropped and the others are still told. The edit that told
 /// them therefore never fails after it has changed the model.
 template <typename ObserverType>
-class VELAMEDIALIB_TEMPLATE_API AddObserverList {
+class AddObserverList {
 public:
     explicit AddObserverList(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
 

@@ -7,8 +7,6 @@
 // at once keep one, and nobody waits. What is published is replaced or freed
 // only under the project's write lock (when no one reads) or with its owner.
 
-#include <VelaMediaLib/base/Export.h>
-
 #include <atomic>
 #include <boost/shared_ptr.hpp>
 #include <string>
@@ -17,7 +15,7 @@ namespace VelaMediaLib {
 
 /// An owned object made on first use.
 template <typename T>
-class VELAMEDIALIB_TEMPLATE_API LazyPtr {
+class LazyPtr {
 public:
     LazyPtr() = default;
     ~LazyPtr() { delete get(); }
@@ -52,7 +50,7 @@ private:
 /// compare-and-swap and never unlinked. Callers hold the project's read lock
 /// to read or add, and its write lock to replace a value.
 template <typename V>
-class VELAMEDIALIB_TEMPLATE_API NamedEntries {
+class NamedEntries {
 public:
     typedef boost::shared_ptr<V> Pointer;
 

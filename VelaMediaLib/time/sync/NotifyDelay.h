@@ -20,7 +20,7 @@ class ThreadSafe;
 /// which they first changed (each with its lifeline), and the subject being
 /// delivered. Its small mutex is taken only for the state's own reads and
 /// writes, never while observers run.
-class VELAMEDIALIB_API NotifyDelayState {
+class NotifyDelayState {
 public:
     NotifyDelayState() = default;
     NotifyDelayState(const NotifyDelayState&) = delete;
