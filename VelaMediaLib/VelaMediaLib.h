@@ -5,6 +5,7 @@
 #include <VelaMediaLib/base/CaptionAttributes.h>
 #include <VelaMediaLib/base/CaptionData.h>
 #include <VelaMediaLib/base/Cloneable.h>
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/IdentManager.h>
 #include <VelaMediaLib/base/Identified.h>
 #include <VelaMediaLib/base/KeystrokeData.h>

@@ -1,12 +1,14 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 
 namespace VelaMediaLib {
 
 /// Where a sound sits in the listening field: pan from -1 (left) to 1 (right)
 /// and depth from 0 (front) to 1 (far).
-struct AudioPosition {
+struct VELAMEDIALIB_API AudioPosition {
     double pan = 0.0;
     double depth = 0.0;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/TemplatedColor.h>
 
 #include <string>
@@ -7,7 +8,7 @@
 namespace VelaMediaLib {
 
 /// How the timeline's captions are shown.
-struct CaptionAttributes {
+struct VELAMEDIALIB_API CaptionAttributes {
     bool enabled = false;
     std::string fontName = "Arial";
     double fontSize = 32.0;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 #include <string>
 
@@ -7,7 +9,7 @@ namespace VelaMediaLib {
 
 /// The content of one caption: its text and the language it is written in
 /// (a BCP 47 tag such as "en-US"; empty when unknown).
-struct CaptionData {
+struct VELAMEDIALIB_API CaptionData {
     std::string text;
     std::string language;
 

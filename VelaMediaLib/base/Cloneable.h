@@ -1,18 +1,20 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
 
 /// Something that can be copied whole.
-class Cloneable {
+class VELAMEDIALIB_API Cloneable {
 public:
     virtual ~Cloneable() = default;
 };
 
 /// A Cloneable whose copies are of a known base type.
 template <typename Base>
-class DecoratedCloneable : public Cloneable {
+class VELAMEDIALIB_TEMPLATE_API DecoratedCloneable : public Cloneable {
 public:
     virtual boost::shared_ptr<Base> clone() const = 0;
 };

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <cstdint>
 #include <mutex>
 #include <vector>
@@ -10,7 +12,7 @@ namespace VelaMediaLib {
 /// from 0, with retired identifiers reused last in, first out. The process
 /// has one, made on first use; it takes a small lock of its own so that
 /// clips may be made on several threads.
-class IdentManager {
+class VELAMEDIALIB_API IdentManager {
 public:
     IdentManager() = default;
     static IdentManager& instance();

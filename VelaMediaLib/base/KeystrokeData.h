@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 #include <string>
 
@@ -7,7 +9,7 @@ namespace VelaMediaLib {
 
 /// A keystroke shown by a screen recording: the key's label and the modifier
 /// keys held with it.
-struct KeystrokeData {
+struct VELAMEDIALIB_API KeystrokeData {
     enum Modifier { Shift = 1, Control = 2, Alt = 4, Command = 8 };
 
     std::string key;

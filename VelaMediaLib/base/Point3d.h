@@ -1,11 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 
 namespace VelaMediaLib {
 
 /// A point or vector in three dimensions.
-struct Point3d {
+struct VELAMEDIALIB_API Point3d {
     double x = 0.0, y = 0.0, z = 0.0;
 
     Point3d() = default;

@@ -1,12 +1,14 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 
 namespace VelaMediaLib {
 
 /// An axis-aligned rectangle: origin and size.
 template <typename T>
-struct Rect {
+struct VELAMEDIALIB_TEMPLATE_API Rect {
     T x{}, y{}, width{}, height{};
 
     Rect() = default;

@@ -1,12 +1,14 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 
 namespace VelaMediaLib {
 
 /// A colour as red, green, blue and alpha channels (0-255 for int channels).
 template <typename T>
-struct TemplatedColor {
+struct VELAMEDIALIB_TEMPLATE_API TemplatedColor {
     T red{}, green{}, blue{}, alpha{};
 
     TemplatedColor() = default;

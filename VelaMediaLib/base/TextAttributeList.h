@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 #include <string>
 #include <vector>
@@ -8,7 +10,7 @@ namespace VelaMediaLib {
 
 /// Text with attribute runs: each run gives one attribute (a name such as
 /// "fontSize" or "bold" and its value as text) to a span of the text's bytes.
-class TextAttributeList {
+class VELAMEDIALIB_API TextAttributeList {
 public:
     struct Run {
         size_t start = 0;
@@ -40,6 +42,6 @@ private:
     std::vector<Run> runs_;
 };
 
-std::ostream& operator<<(std::ostream& out, const TextAttributeList& list);
+VELAMEDIALIB_API std::ostream& operator<<(std::ostream& out, const TextAttributeList& list);
 
 } // namespace VelaMediaLib

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/Point3d.h>
 
 #include <array>
@@ -8,7 +9,7 @@
 namespace VelaMediaLib {
 
 /// A 4x4 affine transform, row-major, acting on column vectors (x, y, z, 1).
-class TransformMatrix {
+class VELAMEDIALIB_API TransformMatrix {
 public:
     typedef std::array<double, 16> Elements;
 
@@ -41,6 +42,6 @@ private:
     Elements m_;
 };
 
-std::ostream& operator<<(std::ostream& out, const TransformMatrix& matrix);
+VELAMEDIALIB_API std::ostream& operator<<(std::ostream& out, const TransformMatrix& matrix);
 
 } // namespace VelaMediaLib

@@ -2,13 +2,15 @@
 // The exception family of the model. Every failure the library reports by
 // throwing derives from VelaMediaLibException, which carries its message.
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <exception>
 #include <string>
 #include <typeinfo>
 
 namespace VelaMediaLib {
 
-class VelaMediaLibException : public std::exception {
+class VELAMEDIALIB_API VelaMediaLibException : public std::exception {
 public:
     explicit VelaMediaLibException(std::string message) : message_(std::move(message)) {}
     const char* what() const noexcept override { return message_.c_str(); }
@@ -20,7 +22,7 @@ private:
 
 /// Carries the value that was refused alongside the message.
 template <typename T>
-class ValueException : public VelaMediaLibException {
+class VELAMEDIALIB_TEMPLATE_API ValueException : public VelaMediaLibException {
 public:
     ValueException(std::string message, T value)
         : VelaMediaLibException(std::move(message)), value_(std::move(value)) {}
@@ -31,7 +33,7 @@ private:
 };
 
 #define VELA_DECLARE_EXCEPTION(Name, Base)                                                                   \
-    class Name : public Base {                                                                               \
+    class VELAMEDIALIB_API Name : public Base {                                                              \
     public:                                                                                                  \
         using Base::Base;                                                                                    \
     }
@@ -49,7 +51,7 @@ VELA_DECLARE_EXCEPTION(VelaMediaLibFatalException, VelaMediaLibException);
 
 /// A weak back-reference (parent, project, source) that had expired when it was needed.
 template <typename T>
-class DanglingWeakPtrException : public VelaMediaLibException {
+class VELAMEDIALIB_TEMPLATE_API DanglingWeakPtrException : public VelaMediaLibException {
 public:
     DanglingWeakPtrException()
         : VelaMediaLibException(std::string("dangling weak pointer to ") + typeid(T).name()) {}

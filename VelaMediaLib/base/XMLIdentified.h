@@ -1,12 +1,14 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <cstdint>
 
 namespace VelaMediaLib {
 
 /// An object that documents refer to by number. It takes an identifier from
 /// the process's IdentManager when made and retires it when destroyed.
-class XMLIdentified {
+class VELAMEDIALIB_API XMLIdentified {
 public:
     XMLIdentified() : ident_(newXMLIdent()) {}
     XMLIdentified(const XMLIdentified&) : ident_(newXMLIdent()) {} // a copy is another object
@@ -23,6 +25,6 @@ private:
 };
 
 /// What writes itself into the project document.
-class XMLable : public virtual XMLIdentified {};
+class VELAMEDIALIB_API XMLable : public virtual XMLIdentified {};
 
 } // namespace VelaMediaLib

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 
 #include <boost/shared_ptr.hpp>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 
 /// An effect applied to a clip or a track. Effects are held and ordered by
 /// their owner (an Effectable); the kinds of effect build on this base.
-class Effect : public VelaObject {
+class VELAMEDIALIB_API Effect : public VelaObject {
 public:
     virtual std::string effectName() const = 0;
     virtual boost::shared_ptr<Effect> cloneEffect() const = 0;

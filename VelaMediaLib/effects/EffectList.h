@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/effects/Effectable.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// The ordered effects of one owner, guarded by the project lock it finds
 /// through its owner's token. Each change returns whether it changed
 /// anything, so the owner knows to notify.
-class EffectList {
+class VELAMEDIALIB_API EffectList {
 public:
     typedef Effectable::EffectPtr EffectPtr;
     typedef Effectable::Effects Effects;

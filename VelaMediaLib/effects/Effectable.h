@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/effects/Effect.h>
 
 #include <string>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 
 /// What holds an ordered list of effects (clips, tracks). Indices out of
 /// range throw IndexException.
-class Effectable {
+class VELAMEDIALIB_API Effectable {
 public:
     typedef boost::shared_ptr<Effect> EffectPtr;
     typedef std::vector<EffectPtr> Effects;

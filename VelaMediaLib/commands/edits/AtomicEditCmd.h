@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 
@@ -48,7 +49,7 @@ private:
 /// pair it parted), so giving back the timing gives back everything. Without a
 /// handler (a composite's inner history used between runs) it throws
 /// VelaMediaLibException "no command handler".
-class AtomicEditCmd : public Command {
+class VELAMEDIALIB_API AtomicEditCmd : public Command {
 public:
     const TrackPtr& track() const { return track_; }
     const MediaPtr& media() const { return media_; }
@@ -82,7 +83,7 @@ protected:
 
 /// Moves a clip on its track by a tick delta. Two moves of the same clip
 /// combine into one move by the sum, undone to the first one's saved state.
-class MoveCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API MoveCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<MoveCmd> create(const TrackPtr& track, const MediaPtr& media, VelaTime delta);
     bool execute(CommandHandler* handler) override;
@@ -97,7 +98,7 @@ private:
 /// Places a clip on a track at a start tick; undone by removing it, the clip
 /// taking back the start it had before and, with its neighbours there, the
 /// transitions they had before placing joined them.
-class AddMediaCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API AddMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<AddMediaCmd> create(const TrackPtr& track, const MediaPtr& media,
                                                  VelaTime start);
@@ -111,7 +112,7 @@ private:
 
 /// Takes a clip off its track; undone by placing it back where it was, with
 /// the transitions it and its neighbours had (placing it back would join them).
-class RemoveMediaCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API RemoveMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<RemoveMediaCmd> create(const TrackPtr& track, const MediaPtr& media);
     bool execute(CommandHandler* handler) override;

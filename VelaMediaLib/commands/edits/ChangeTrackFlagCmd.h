@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// Sets one of a track's flags (locked, hidden or solo) and puts back what
 /// it had on undo: for the locked flag, kept as metadata, that is the entry's
 /// text, or no entry at all when there was none.
-class ChangeTrackFlagCmd : public Command {
+class VELAMEDIALIB_API ChangeTrackFlagCmd : public Command {
 public:
     enum Flag { Locked, Hidden, Solo };
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
@@ -13,7 +14,7 @@ namespace VelaMediaLib {
 /// moves to the right, latest clip first, so no move lands on a clip that
 /// has not moved yet. A refused move refuses the whole command (rolled back,
 /// false); so does a track without a gap, which leaves nothing to record.
-class CloseGapsOnTrackCmd : public MultiCommand {
+class VELAMEDIALIB_API CloseGapsOnTrackCmd : public MultiCommand {
 public:
     static boost::shared_ptr<CloseGapsOnTrackCmd> create(const TrackPtr& track);
     /// A magnetizer's request, queued to run later: it refuses (false,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
 #include <utility>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// What commands reach the model through. Each operation takes the track and
 /// the clip and answers the track and clip after the edit (an edit may
 /// replace the clip), or an empty pair when the model refused it.
-class CommandHandler {
+class VELAMEDIALIB_API CommandHandler {
 public:
     typedef std::pair<TrackPtr, MediaPtr> TrackAndMedia;
 
@@ -31,7 +32,7 @@ public:
 /// it carries the edits out on the tracks and answers a refused one (a
 /// collision, a trim past the limits, a stretch to nothing, a state the clip
 /// does not accept, a clip not on the track) with an empty pair.
-class ProjectIndependentCommandHandler : public CommandHandler {
+class VELAMEDIALIB_API ProjectIndependentCommandHandler : public CommandHandler {
 public:
     TrackAndMedia moveMedia(const TrackPtr& track, const MediaPtr& media, VelaTime delta) override;
     TrackAndMedia trimMediaStart(const TrackPtr& track, const MediaPtr& media, VelaTime delta) override;

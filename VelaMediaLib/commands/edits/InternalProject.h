@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/project/Project.h>
@@ -14,11 +15,11 @@ namespace VelaMediaLib {
 
 /// The one implementation of Project. It is its own command handler for
 /// commands that need no more than its tracks.
-class InternalProject : public VelaObject,
-                        public Cloneable,
-                        public Project,
-                        public ProjectIndependentCommandHandler,
-                        public boost::enable_shared_from_this<InternalProject> {
+class VELAMEDIALIB_API InternalProject : public VelaObject,
+                                         public Cloneable,
+                                         public Project,
+                                         public ProjectIndependentCommandHandler,
+                                         public boost::enable_shared_from_this<InternalProject> {
 public:
     /// Makes the project under a shared pointer, then builds its parts in
     /// order: source bin, timeline, clipboard, command history, command

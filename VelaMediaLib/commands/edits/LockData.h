@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
@@ -10,7 +11,7 @@ class Observer;
 /// Lock and visibility questions over tracks, clips and transitions. A clip
 /// answers through its track's flags, a transition through its clips; a clip
 /// or transition that is on no track is editable, shown and unlocked.
-class LockData {
+class VELAMEDIALIB_API LockData {
 public:
     static bool IsTrackLocked(const Track& track) { return track.isLocked(); }
     static bool IsTrackHidden(const Track& track) { return track.attributeValue("videoHidden", false); }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 
 namespace VelaMediaLib {
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// plays faster or slower, the duration following. Undo gives back the exact
 /// state; a clip on no track, or one the stretch would leave without a tick,
 /// refuses (false).
-class StretchCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API StretchCmd : public AtomicEditCmd {
 public:
     /// Throws ValueException<double> "a clip's scalar must be above zero".
     static boost::shared_ptr<StretchCmd> create(const MediaPtr& media, const SafeRational& scalar);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 #include <VelaMediaLib/time/sync/Subject.h>
@@ -25,7 +26,7 @@ class CloseGapsOnTrackCmd;
 /// waiting request is guarded by a small mutex of its own. A request that
 /// has not started when the magnetizer goes (its track left the timeline) is
 /// cancelled, and refuses when it comes to run. The executor must outlive it.
-class TrackMagnetizer : public Observer, public TrackAddObserver {
+class VELAMEDIALIB_API TrackMagnetizer : public Observer, public TrackAddObserver {
 public:
     TrackMagnetizer(const TrackPtr& track, CommandExecutor& executor);
     ~TrackMagnetizer() override;

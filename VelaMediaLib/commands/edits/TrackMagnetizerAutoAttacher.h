@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 
@@ -10,7 +11,7 @@ namespace VelaMediaLib {
 
 /// Gives every track of a timeline its TrackMagnetizer, as tracks and mixers
 /// come, and drops it when they go.
-class TrackMagnetizerAutoAttacher : public TimelineAddObserver {
+class VELAMEDIALIB_API TrackMagnetizerAutoAttacher : public TimelineAddObserver {
 public:
     TrackMagnetizerAutoAttacher(const TimelinePtr& timeline, CommandExecutor& executor);
     ~TrackMagnetizerAutoAttacher() override;

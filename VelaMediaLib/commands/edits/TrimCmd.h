@@ -1,12 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 
 namespace VelaMediaLib {
 
 /// Moves a clip's start edge by a tick delta (positive shortens it), the
 /// content under the rest staying in place. Undo gives back the exact state.
-class TrimStartCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API TrimStartCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<TrimStartCmd> create(const TrackPtr& track, const MediaPtr& media,
                                                   VelaTime delta);
@@ -20,7 +21,7 @@ private:
 
 /// Moves a clip's end edge in by a tick delta (positive shortens it, negative
 /// plays more media). Undo gives back the exact state.
-class TrimEndCmd : public AtomicEditCmd {
+class VELAMEDIALIB_API TrimEndCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<TrimEndCmd> create(const TrackPtr& track, const MediaPtr& media, VelaTime delta);
     bool execute(CommandHandler* handler) override;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 
 #include <vector>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// Ready-made commands executed one after another as one undo step, telling
 /// progress callbacks the fraction done after each. A command that refuses
 /// refuses the batch: the ones before it are undone and execute reports false.
-class BatchCmd : public MultiCommand {
+class VELAMEDIALIB_API BatchCmd : public MultiCommand {
 public:
     typedef boost::function<bool(double)> ProgressCallback;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 
 #include <boost/enable_shared_from_this.hpp>
@@ -14,7 +15,7 @@ typedef boost::shared_ptr<Command> CommandPtr;
 
 /// An undoable edit. Commands are owned through shared pointers; executing
 /// one returns whether it took effect, and only those that did are recorded.
-class Command : public VelaObject, public boost::enable_shared_from_this<Command> {
+class VELAMEDIALIB_API Command : public VelaObject, public boost::enable_shared_from_this<Command> {
 public:
     virtual bool execute(CommandHandler* handler) = 0;
     virtual bool unexecute(CommandHandler* handler) = 0;

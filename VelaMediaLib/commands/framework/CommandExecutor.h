@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 
 namespace VelaMediaLib {
@@ -7,7 +8,7 @@ namespace VelaMediaLib {
 /// Anything that executes commands: the project's history, or a composite
 /// recording its sub-commands. Edit code is written against an executor so
 /// that it works at the top level and inside a composite alike.
-class CommandExecutor {
+class VELAMEDIALIB_API CommandExecutor {
 public:
     virtual ~CommandExecutor() = default;
     virtual bool execute(const CommandPtr& command) = 0;

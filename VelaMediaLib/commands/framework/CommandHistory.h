@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
@@ -14,7 +15,7 @@ namespace VelaMediaLib {
 class MultiCommand;
 
 /// Told before and after each command the history executes, follow-ups included.
-class CommandHistoryObserver {
+class VELAMEDIALIB_API CommandHistoryObserver {
 public:
     virtual ~CommandHistoryObserver() = default;
     virtual void commandWillExecute(const CommandPtr& command, uint32_t transactionNumber) = 0;
@@ -22,7 +23,7 @@ public:
 };
 
 /// Both stacks, as a history had them.
-struct CommandHistoryState {
+struct VELAMEDIALIB_API CommandHistoryState {
     std::list<CommandPtr> undoStack;
     std::list<CommandPtr> redoStack;
 };
@@ -46,7 +47,10 @@ struct CommandHistoryState {
 /// runFollowUps. Undo and redo replay recorded steps only: follow-ups queued
 /// by the replay are dropped. Queueing is safe from any thread; everything
 /// else belongs to one editing thread at a time.
-class CommandHistory : public VelaObject, public Cloneable, public SubjectWithMutex, public CommandExecutor {
+class VELAMEDIALIB_API CommandHistory : public VelaObject,
+                                        public Cloneable,
+                                        public SubjectWithMutex,
+                                        public CommandExecutor {
 public:
     explicit CommandHistory(CommandHandler* handler, const boost::weak_ptr<const ThreadSafe>& token =
                                                          boost::weak_ptr<const ThreadSafe>());

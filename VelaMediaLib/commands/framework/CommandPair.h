@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 
 namespace VelaMediaLib {
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// done: when the second refuses or throws, the first is put back (and the
 /// second's exception goes on); the same holds for undo and redo. When the
 /// first cannot be put back: VelaMediaLibFatalException.
-class CommandPair : public Command {
+class VELAMEDIALIB_API CommandPair : public Command {
 public:
     static boost::shared_ptr<CommandPair> create(const CommandPtr& first, const CommandPtr& second);
 

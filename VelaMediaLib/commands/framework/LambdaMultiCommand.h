@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 
 #include <type_traits>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// A composite whose sub-commands are issued by a stored function, given
 /// either the composite itself or its execute function.
-class LambdaMultiCommand : public MultiCommand {
+class VELAMEDIALIB_API LambdaMultiCommand : public MultiCommand {
 public:
     typedef boost::function<void(MultiCommand*)> Function;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/CommandHistory.h>
 
 #include <boost/function.hpp>
@@ -17,7 +18,7 @@ namespace VelaMediaLib {
 /// back: VelaMediaLibFatalException. The inner history has the handler only
 /// while the composite runs (none between runs: a composite kept in a stack
 /// holds no pointer to a handler that may have gone).
-class MultiCommand : public Command, public CommandExecutor {
+class VELAMEDIALIB_API MultiCommand : public Command, public CommandExecutor {
 public:
     typedef boost::function<bool(const CommandPtr&)> ExecuteFunc;
 

@@ -3,6 +3,7 @@
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 
+#include <json/value.h>
 #include <stdexcept>
 
 namespace VelaMediaLib {

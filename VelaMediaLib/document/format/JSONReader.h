@@ -1,15 +1,20 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
 
-#include <json/value.h>
 #include <string>
+
+// Documents are read from jsoncpp values; only the library needs their definition.
+namespace Json {
+class Value;
+} // namespace Json
 
 namespace VelaMediaLib {
 
 /// The base of the document readers and the conversions they share.
-class JSONReader {
+class VELAMEDIALIB_API JSONReader {
 public:
     virtual ~JSONReader() = default;
 

@@ -95,6 +95,8 @@ double jsonValueAsDouble(const Json::Value& json) {
 
 float jsonValueAsFloat(const Json::Value& json) { return float(jsonValueAsDouble(json)); }
 
+bool jsonValueIsNull(const Json::Value& json) { return json.isNull(); }
+
 std::string jsonValueAsString(const Json::Value& json) {
     if (json.isNull()) return std::string();
     if (!json.isString()) refuseJSONValue("a string", json);

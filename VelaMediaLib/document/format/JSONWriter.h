@@ -13,6 +13,7 @@
 // options keep the objects and arrays open, so options.key() and
 // options.element() put the separator and the indentation in.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
 #include <string>
@@ -20,13 +21,13 @@
 namespace VelaMediaLib {
 
 /// The quoted, escaped key followed by " : ".
-std::string keyName(const std::string& key);
+VELAMEDIALIB_API std::string keyName(const std::string& key);
 /// The text as a JSON string literal, quotes included.
-std::string quotedJSONString(const std::string& text);
+VELAMEDIALIB_API std::string quotedJSONString(const std::string& text);
 
 /// Keeps one JSON object or array open, its members at level + 1: opens it on
 /// construction and closes it by close() or, failing that, the destructor.
-class JSONWriter {
+class VELAMEDIALIB_API JSONWriter {
 public:
     enum Kind { Object, Array };
 

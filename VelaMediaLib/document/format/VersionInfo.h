@@ -1,11 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <string>
 
 namespace VelaMediaLib {
 
 /// Who wrote a document, and in which version of its format.
-struct VersionInfo {
+struct VELAMEDIALIB_API VersionInfo {
     std::string version;
     std::string clientName;
     std::string clientVersion;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/function.hpp>
 #include <map>
 #include <ostream>
@@ -15,7 +17,7 @@ namespace VelaMediaLib {
 /// name ids of the same write), and the modifier applied to every file path
 /// written. One options object serves one document: its identifiers count
 /// on and its table is never cleared.
-class XMLOptions {
+class VELAMEDIALIB_API XMLOptions {
 public:
     typedef boost::function<std::string(const std::string&)> PathModifier;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/CaptionData.h>
 #include <VelaMediaLib/model/media/Media.h>
 
@@ -8,7 +9,7 @@
 namespace VelaMediaLib {
 
 /// A clip that can carry captions.
-class CaptionableMedia : public virtual Media {
+class VELAMEDIALIB_API CaptionableMedia : public virtual Media {
 public:
     explicit CaptionableMedia(const boost::weak_ptr<const ThreadSafe>& token) : Media(token) {}
     virtual std::vector<CaptionData> captions() const = 0;
@@ -17,7 +18,7 @@ public:
 };
 
 /// A clip whose speech can be transcribed.
-class TranscribableMedia : public virtual Media {
+class VELAMEDIALIB_API TranscribableMedia : public virtual Media {
 public:
     explicit TranscribableMedia(const boost::weak_ptr<const ThreadSafe>& token) : Media(token) {}
     virtual std::string transcription() const = 0;
@@ -27,7 +28,7 @@ public:
 /// A clip that plays sound: a keyframed volume, a gain, mixing to mono,
 /// loudness normalisation, an offset into the source file, the track and
 /// unified clip it belongs to, and fades as edge modifications.
-class AudioMedia : public CaptionableMedia, public TranscribableMedia {
+class VELAMEDIALIB_API AudioMedia : public CaptionableMedia, public TranscribableMedia {
 public:
     explicit AudioMedia(const boost::weak_ptr<const ThreadSafe>& token)
         : Media(token), CaptionableMedia(token), TranscribableMedia(token) {}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/AudioMedia.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// first asked for); gain ("gain", 1), mixing to mono ("mixToMono", false),
 /// loudness normalisation ("loudnessNormalization", false) and the source
 /// file offset ("sourceFileOffset", 0 ticks) are attributes.
-class AudioMediaImpl : public MediaImpl, public virtual AudioMedia {
+class VELAMEDIALIB_API AudioMediaImpl : public MediaImpl, public virtual AudioMedia {
 public:
     /// The part of the clip that holds the timing state.
     typedef MediaImpl ConcreteMediaImpl;

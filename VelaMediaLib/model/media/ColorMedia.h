@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/TemplatedColor.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>
 
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// A generated clip of one solid colour (attribute "color"). It has no media
 /// extent: its static editor changes only the track range, and it can be
 /// extended without limit.
-class ColorMedia : public VisualMediaImpl {
+class VELAMEDIALIB_API ColorMedia : public VisualMediaImpl {
 public:
     static boost::shared_ptr<ColorMedia>
     create(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/EdgeModification.h>
 
 #include <set>
@@ -8,7 +9,7 @@
 namespace VelaMediaLib {
 
 /// What carries edge modifications at its start (left) and end (right).
-class EdgeModifiable {
+class VELAMEDIALIB_API EdgeModifiable {
 public:
     typedef std::vector<EdgeModificationPtr> EdgeModifications;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/VelaTime.h>
 
 #include <boost/shared_ptr.hpp>
@@ -11,7 +12,7 @@ namespace VelaMediaLib {
 /// audio fade: its length, the group it belongs to (so that related changes
 /// are added and removed together), and the function it applies, by name
 /// ("FadeToValueFunc") and target value.
-class EdgeModification {
+class VELAMEDIALIB_API EdgeModification {
 public:
     static const char* fadeToValueFunctionName() { return "FadeToValueFunc"; }
 

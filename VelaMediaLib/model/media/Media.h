@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
@@ -27,11 +28,11 @@ class XMLOptions;
 /// range) over a stretch of its track (the track range) at a speed (the
 /// scalar), within its media's limits. Reads take the project's read lock,
 /// edits its write lock; a refused edit throws and changes nothing.
-class Media : public SubTimeline,
-              public DecoratedCloneable<Media>,
-              public boost::enable_shared_from_this<Media>,
-              public EdgeModifiable,
-              public TimeConverter {
+class VELAMEDIALIB_API Media : public SubTimeline,
+                               public DecoratedCloneable<Media>,
+                               public boost::enable_shared_from_this<Media>,
+                               public EdgeModifiable,
+                               public TimeConverter {
 public:
     typedef boost::function<void(const boost::shared_ptr<SubTimeline>&)> ParentVisitor;
     typedef std::pair<TransitionPtr, boost::shared_ptr<Media>> TransitionAndNeighbour;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 namespace VelaMediaLib {
 
 class ColorMedia;
@@ -9,7 +11,7 @@ class PlaceholderMedia;
 /// A visitor over the concrete clip kinds; each kind's dispatch calls the
 /// operation of its own kind. Kinds a visitor does not handle fall through
 /// to dispatchAnyMedia, which does nothing unless overridden.
-class MediaDispatcher {
+class VELAMEDIALIB_API MediaDispatcher {
 public:
     virtual ~MediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(PlaceholderMedia& media);
@@ -20,7 +22,7 @@ protected:
 };
 
 /// The same over clips that are only read.
-class ConstMediaDispatcher {
+class VELAMEDIALIB_API ConstMediaDispatcher {
 public:
     virtual ~ConstMediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(const PlaceholderMedia& media);

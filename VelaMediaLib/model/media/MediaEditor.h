@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/time/rational/VelaTime.h>
@@ -10,7 +11,7 @@ class Media;
 
 /// The older editor family: the same operations in whole ticks and a double
 /// scalar, carried out on the clip itself.
-class MediaEditor : public VelaObject {
+class VELAMEDIALIB_API MediaEditor : public VelaObject {
 public:
     explicit MediaEditor(Media& clip) : clip_(clip) {}
 
@@ -29,7 +30,7 @@ protected:
 
 /// For clips with a media extent: an invalid trim, of either edge, throws
 /// InvalidTrimRangeException "invalid media duration trim offset".
-class TemporalEditor : public MediaEditor {
+class VELAMEDIALIB_API TemporalEditor : public MediaEditor {
 public:
     using MediaEditor::MediaEditor;
     void trimStart(VelaTime offset) override;
@@ -37,7 +38,7 @@ public:
 };
 
 /// For clips without a media extent.
-class StaticEditor : public MediaEditor {
+class VELAMEDIALIB_API StaticEditor : public MediaEditor {
 public:
     using MediaEditor::MediaEditor;
 };

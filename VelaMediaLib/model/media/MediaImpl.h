@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/Media.h>
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 #include <VelaMediaLib/model/timeline/SubTimelineParts.h>
@@ -12,7 +13,7 @@ namespace VelaMediaLib {
 /// The state every clip holds and the operations over it. A clip's parametric
 /// time counts ticks from its start on the track: its parameters' keyframes
 /// move with it and are cut, not shifted, when its start is trimmed.
-class MediaImpl : public SubTimelineParts<Media> {
+class VELAMEDIALIB_API MediaImpl : public SubTimelineParts<Media> {
 public:
     enum EditorKind { Temporal, Static };
 

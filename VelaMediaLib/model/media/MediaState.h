@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
@@ -14,7 +15,7 @@ namespace VelaMediaLib {
 /// duration, exact), how fast (scalar: track length per unit of media
 /// length), the media's limits, and, for static clips, an attached start
 /// offset. A limit at the 64-bit extreme means there is none on that side.
-struct MediaState {
+struct VELAMEDIALIB_API MediaState {
     VelaTime start = 0;
     VelaTime duration = 0;
     SafeRational mediaStart;

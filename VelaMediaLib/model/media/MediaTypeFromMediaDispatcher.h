@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
 
 #include <string>
@@ -7,7 +8,7 @@
 namespace VelaMediaLib {
 
 /// Names a clip's kind as the document's "_type" does.
-class MediaTypeFromMediaDispatcher : public ConstMediaDispatcher {
+class VELAMEDIALIB_API MediaTypeFromMediaDispatcher : public ConstMediaDispatcher {
 public:
     void dispatchPlaceholderMedia(const PlaceholderMedia&) override { type_ = "PlaceholderMedia"; }
     void dispatchColorMedia(const ColorMedia&) override { type_ = "ColorMedia"; }

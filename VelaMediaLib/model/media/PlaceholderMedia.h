@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>
 
 namespace VelaMediaLib {
@@ -7,7 +8,7 @@ namespace VelaMediaLib {
 /// A visual clip without content, standing in for media to come. Its temporal
 /// editor works over its own media range: it can be trimmed within the slice
 /// it was made with, not beyond. Attributes "width", "height" (pixels) and "note".
-class PlaceholderMedia : public VisualMediaImpl {
+class VELAMEDIALIB_API PlaceholderMedia : public VisualMediaImpl {
 public:
     /// A placeholder on the track from start for duration ticks, at scalar 1.
     static boost::shared_ptr<PlaceholderMedia> create(const boost::weak_ptr<const ThreadSafe>& token,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/model/media/MediaState.h>
 #include <VelaMediaLib/base/VelaObject.h>
@@ -11,7 +12,7 @@ class MediaImpl;
 /// The arithmetic of a clip's timing. An editor computes the state a clip
 /// would have after an edit, or throws; the clip takes the new state only
 /// when the editor returned one, so a refused edit changes nothing.
-class RationalMediaEditor : public VelaObject {
+class VELAMEDIALIB_API RationalMediaEditor : public VelaObject {
 public:
     explicit RationalMediaEditor(const MediaImpl& clip) : clip_(clip) {}
 

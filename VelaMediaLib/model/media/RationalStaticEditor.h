@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 
 namespace VelaMediaLib {
@@ -10,7 +11,7 @@ namespace VelaMediaLib {
 /// and shift an attached start offset with the start. The media duration
 /// follows the track duration (duration / scalar), so the clip's state keeps
 /// the rule that restoring checks. Its limits are unbounded.
-class RationalStaticEditor : public RationalMediaEditor {
+class VELAMEDIALIB_API RationalStaticEditor : public RationalMediaEditor {
 public:
     using RationalMediaEditor::RationalMediaEditor;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 
 namespace VelaMediaLib {
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// recordings): trims keep the media range and scalar consistent with the
 /// track range and stay within the source's limits. Trims may leave the
 /// minimum track duration itself.
-class RationalTemporalEditor : public RationalMediaEditor {
+class VELAMEDIALIB_API RationalTemporalEditor : public RationalMediaEditor {
 public:
     using RationalMediaEditor::RationalMediaEditor;
 

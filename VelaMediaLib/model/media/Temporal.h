@@ -1,12 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/VelaTime.h>
 
 namespace VelaMediaLib {
 
 /// Something placed in ticks: a start, an end and a duration.
-class Temporal {
+class VELAMEDIALIB_API Temporal {
 public:
     virtual ~Temporal() = default;
     virtual VelaTime startTime() const = 0;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/TransformMatrix.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
@@ -7,7 +8,7 @@ namespace VelaMediaLib {
 
 /// Something that places content on the canvas with a transform that may
 /// change over its parametric time.
-class Transformer {
+class VELAMEDIALIB_API Transformer {
 public:
     virtual ~Transformer() = default;
     virtual TransformMatrix transformAtTime(const RationalTime& time) const = 0;
@@ -15,7 +16,7 @@ public:
 
 /// The transform base of containers that place their content unchanged
 /// unless a kind says otherwise (the timeline).
-class TransformerImpl : public Transformer {
+class VELAMEDIALIB_API TransformerImpl : public Transformer {
 public:
     TransformMatrix transformAtTime(const RationalTime&) const override { return TransformMatrix(); }
 };

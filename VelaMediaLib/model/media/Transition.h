@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/time/rational/VelaTime.h>
@@ -15,7 +16,7 @@ class Media;
 
 /// A transition at a clip's edge, or between two touching clips: its kind by
 /// name, its length in ticks and the clips on either side.
-class Transition : public VelaObject, public virtual XMLIdentified {
+class VELAMEDIALIB_API Transition : public VelaObject, public virtual XMLIdentified {
 public:
     Transition(std::string name, VelaTime duration) : name_(std::move(name)), duration_(duration) {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/Media.h>
 #include <VelaMediaLib/base/Rect.h>
 #include <VelaMediaLib/model/media/Transformer.h>
@@ -10,7 +11,7 @@ namespace VelaMediaLib {
 /// (translation, scale, rotation in radians about x, y and z, shear, anchor),
 /// with an opacity and two crops (of the placed geometry and of the source
 /// picture, each as insets left, top, right, bottom in pixels).
-class VisualMedia : public virtual Media, public Transformer {
+class VELAMEDIALIB_API VisualMedia : public virtual Media, public Transformer {
 public:
     explicit VisualMedia(const boost::weak_ptr<const ThreadSafe>& token) : Media(token) {}
 

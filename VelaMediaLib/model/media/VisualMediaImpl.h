@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
 
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// first asked for; until then the transform queries use their defaults
 /// (no translation, scale 1, no rotation or shear, anchor at the origin,
 /// opacity 1, no crop).
-class VisualMediaImpl : public MediaImpl, public virtual VisualMedia {
+class VELAMEDIALIB_API VisualMediaImpl : public MediaImpl, public virtual VisualMedia {
 public:
     /// The part of the clip that holds the timing state.
     typedef MediaImpl ConcreteMediaImpl;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
 #include <VelaMediaLib/commands/framework/CommandHistory.h>
 #include <VelaMediaLib/document/format/VersionInfo.h>
@@ -17,13 +18,13 @@ class CommandHandler;
 /// history and the settings, and the one reader-writer lock of the whole
 /// model (the project is the token every object holds). Edits go through
 /// execute, undo and redo.
-class Project : public XMLable,
-                public ThreadSafe,
-                public ProjectEditRate,
-                public Observable,
-                public CommandExecutor,
-                public MetaDatable,
-                public Attributable {
+class VELAMEDIALIB_API Project : public XMLable,
+                                 public ThreadSafe,
+                                 public ProjectEditRate,
+                                 public Observable,
+                                 public CommandExecutor,
+                                 public MetaDatable,
+                                 public Attributable {
 public:
     /// The rate is reduced, a zero numerator giving 0/1 (as for every edit
     /// rate, see SimpleProjectEditRate::rateOf). Throws boost::bad_rational

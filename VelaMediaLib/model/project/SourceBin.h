@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
@@ -12,7 +13,7 @@ namespace VelaMediaLib {
 class Source;
 
 /// The project's imported sources, in the order they came.
-class SourceBin : public VelaObject, public ProjectToken {
+class VELAMEDIALIB_API SourceBin : public VelaObject, public ProjectToken {
 public:
     explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -7,7 +9,7 @@ namespace VelaMediaLib {
 class Source;
 
 /// Something that plays an imported source; clips without one answer null.
-class Sourceable {
+class VELAMEDIALIB_API Sourceable {
 public:
     virtual ~Sourceable() = default;
     virtual boost::shared_ptr<const Source> source() const = 0;

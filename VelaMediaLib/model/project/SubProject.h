@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/time/parameters/MetaDatable.h>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 
 /// A part of a project: it finds the project's lock through the project's
 /// token (the object's one ProjectToken) and carries metadata.
-class SubProject : public VelaObject, public XMLable, public MetaDatable {
+class VELAMEDIALIB_API SubProject : public VelaObject, public XMLable, public MetaDatable {
 public:
     explicit SubProject(const boost::weak_ptr<const ThreadSafe>& token) : MetaDatable(token) {}
 

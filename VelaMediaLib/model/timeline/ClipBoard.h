@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>
 
 #include <algorithm>
@@ -7,7 +8,7 @@
 namespace VelaMediaLib {
 
 /// The project's clipboard: clippings, each a copied portion of tracks.
-class ClipBoard : public VelaObject, public ProjectToken {
+class VELAMEDIALIB_API ClipBoard : public VelaObject, public ProjectToken {
 public:
     explicit ClipBoard(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 
 #include <boost/shared_ptr.hpp>
@@ -10,7 +11,7 @@ class Media;
 
 /// A clip refused by a track because it would overlap another: which range
 /// collided, the clip that was being placed and the start asked for.
-class CollisionException : public VelaMediaLibException {
+class VELAMEDIALIB_API CollisionException : public VelaMediaLibException {
 public:
     CollisionException(Range<long long> range = Range<long long>(),
                        boost::shared_ptr<Media> clip = boost::shared_ptr<Media>(), long long start = 0)

@@ -1,11 +1,12 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>
 
 namespace VelaMediaLib {
 
 /// The concrete mixer.
-class GenericMixer : public Mixer {
+class VELAMEDIALIB_API GenericMixer : public Mixer {
 public:
     static boost::shared_ptr<GenericMixer> create(const boost::weak_ptr<const ThreadSafe>& token);
 

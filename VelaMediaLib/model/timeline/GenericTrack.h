@@ -1,12 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
 namespace VelaMediaLib {
 
 /// The concrete track that timelines and groups make.
-class GenericTrack : public Track {
+class VELAMEDIALIB_API GenericTrack : public Track {
 public:
     static boost::shared_ptr<GenericTrack> create(const boost::weak_ptr<const ThreadSafe>& token);
 

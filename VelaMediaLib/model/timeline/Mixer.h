@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/model/timeline/MixerAddObserver.h>
 #include <VelaMediaLib/model/timeline/RemoveTrackInfo.h>
 #include <VelaMediaLib/model/timeline/Track.h>
@@ -11,11 +12,11 @@ class Timeline;
 /// An ordered list of tracks; a track's index is its place in the list. A
 /// mixer belongs to a timeline or to a group clip, never both. It observes
 /// its tracks and passes their clip additions and removals on.
-class Mixer : public SubTimelineParts<SubTimeline>,
-              public Cloneable,
-              public IdentityTimeConverter,
-              public TrackAddObserver,
-              public boost::enable_shared_from_this<Mixer> {
+class VELAMEDIALIB_API Mixer : public SubTimelineParts<SubTimeline>,
+                               public Cloneable,
+                               public IdentityTimeConverter,
+                               public TrackAddObserver,
+                               public boost::enable_shared_from_this<Mixer> {
 public:
     typedef std::vector<TrackPtr> Tracks;
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -10,7 +12,7 @@ class Track;
 
 /// Told of every track a mixer gains or loses, and of every clip its tracks
 /// gain or lose, from within the edit that did it.
-class MixerAddObserver {
+class VELAMEDIALIB_API MixerAddObserver {
 public:
     virtual ~MixerAddObserver() = default;
     virtual void onMixerAddTrack(Mixer& mixer, const boost::shared_ptr<Track>& track) = 0;

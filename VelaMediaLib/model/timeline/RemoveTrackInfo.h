@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 #include <boost/weak_ptr.hpp>
 
@@ -10,7 +12,7 @@ class Track;
 
 /// What a track's removal needs to be undone: the track, the mixer it left
 /// and the index it had there.
-struct RemoveTrackInfo {
+struct VELAMEDIALIB_API RemoveTrackInfo {
     boost::shared_ptr<Track> track;
     boost::weak_ptr<Mixer> mixer;
     int index = -1;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/effects/Effectable.h>
 #include <VelaMediaLib/time/parameters/Attributable.h>
 #include <VelaMediaLib/base/Identified.h>
@@ -13,13 +14,13 @@ namespace VelaMediaLib {
 /// What clips, tracks and mixers have in common: they are parts of a project
 /// that can be observed, carry parameters, effects and attributes, stand in
 /// time and have a name.
-class SubTimeline : public SubProject,
-                    public virtual Observable,
-                    public Parametric,
-                    public Effectable,
-                    public Attributable,
-                    public Temporal,
-                    public Identified {
+class VELAMEDIALIB_API SubTimeline : public SubProject,
+                                     public virtual Observable,
+                                     public Parametric,
+                                     public Effectable,
+                                     public Attributable,
+                                     public Temporal,
+                                     public Identified {
 public:
     explicit SubTimeline(const boost::weak_ptr<const ThreadSafe>& token)
         : SubProject(token), Parametric(token), Attributable(token) {}

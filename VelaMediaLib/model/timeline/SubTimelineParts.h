@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/effects/EffectList.h>
 #include <VelaMediaLib/model/timeline/SubTimeline.h>
 #include <VelaMediaLib/time/sync/Subject.h>
@@ -15,7 +16,7 @@ namespace VelaMediaLib {
 /// Interface is SubTimeline or an interface derived from it, held as a
 /// virtual base so that clip families can share it.
 template <typename Interface>
-class SubTimelineParts : public virtual Interface, protected ObjectSubject {
+class VELAMEDIALIB_TEMPLATE_API SubTimelineParts : public virtual Interface, protected ObjectSubject {
 public:
     typedef Effectable::EffectPtr EffectPtr;
     typedef Effectable::Effects Effects;

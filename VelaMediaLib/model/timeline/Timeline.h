@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/AddObserverList.h>
 #include <VelaMediaLib/time/parameters/Attributable.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
@@ -23,16 +24,16 @@ class Source;
 /// view in degrees (45), near and far clip distances (1, 100000). The default
 /// eye sits on the z axis at the distance from which the field of view shows
 /// the canvas height exactly.
-class Timeline : public SubProject,
-                 public Cloneable,
-                 public ObjectSubject,
-                 public Temporal,
-                 public Parametric,
-                 public TransformerImpl,
-                 public IdentityTimeConverter,
-                 public MixerAddObserver,
-                 public Attributable,
-                 public boost::enable_shared_from_this<Timeline> {
+class VELAMEDIALIB_API Timeline : public SubProject,
+                                  public Cloneable,
+                                  public ObjectSubject,
+                                  public Temporal,
+                                  public Parametric,
+                                  public TransformerImpl,
+                                  public IdentityTimeConverter,
+                                  public MixerAddObserver,
+                                  public Attributable,
+                                  public boost::enable_shared_from_this<Timeline> {
 public:
     static boost::shared_ptr<Timeline> create(const boost::weak_ptr<const ThreadSafe>& token,
                                               int width = 1920, int height = 1080);

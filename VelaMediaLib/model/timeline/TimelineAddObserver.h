@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -10,7 +12,7 @@ class Timeline;
 class Track;
 
 /// Told of every mixer, track and clip a timeline gains or loses.
-class TimelineAddObserver {
+class VELAMEDIALIB_API TimelineAddObserver {
 public:
     virtual ~TimelineAddObserver() = default;
     virtual void onTimelineAddTrack(Timeline&, Mixer&, const boost::shared_ptr<Track>&) {}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/AddObserverList.h>
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
@@ -25,10 +26,10 @@ class Timeline;
 /// checks for collisions before anything changes. Flags are boolean
 /// attributes ("audioMuted", "videoHidden", "magnetic", "matte", "solo", all
 /// false on a new track); the locked flag is metadata ("isLocked").
-class Track : public SubTimelineParts<SubTimeline>,
-              public Cloneable,
-              public IdentityTimeConverter,
-              public boost::enable_shared_from_this<Track> {
+class VELAMEDIALIB_API Track : public SubTimelineParts<SubTimeline>,
+                               public Cloneable,
+                               public IdentityTimeConverter,
+                               public boost::enable_shared_from_this<Track> {
 public:
     /// Clips by start. The nodes come from a pool of the track's own, so a
     /// query walks memory that lies together rather than nodes scattered

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -8,7 +10,7 @@ class Media;
 class Track;
 
 /// Told of every clip a track gains or loses, from within the edit that did it.
-class TrackAddObserver {
+class VELAMEDIALIB_API TrackAddObserver {
 public:
     virtual ~TrackAddObserver() = default;
     virtual void onTrackAddMedia(Track& track, const boost::shared_ptr<Media>& media) = 0;

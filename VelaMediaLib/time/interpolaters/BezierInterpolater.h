@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/Point3d.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
 
@@ -12,7 +13,7 @@ namespace VelaMediaLib {
 ///
 /// Its document name carries the curve, so that it survives as the plain
 /// string an "interp" member holds: "bezr(<temporal name>;x1,y1,z1;x2,y2,z2)".
-class BezierInterpolater : public Interpolater<Point3d> {
+class VELAMEDIALIB_API BezierInterpolater : public Interpolater<Point3d> {
 public:
     /// Throws ParserException "trying to read an unknown interpolater" when the
     /// temporal interpolater is not a kind that doubles have.

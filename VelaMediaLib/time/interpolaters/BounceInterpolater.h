@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
@@ -8,8 +9,9 @@ namespace VelaMediaLib {
 
 /// Arrives like a dropped ball, bouncing on the value.
 template <typename T>
-class BounceInterpolater : public TweenableInterpolater<T>,
-                           public SharedInterpolaterInstance<BounceInterpolater<T>> {
+class VELAMEDIALIB_TEMPLATE_API BounceInterpolater
+    : public TweenableInterpolater<T>,
+      public SharedInterpolaterInstance<BounceInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::bounce(u); }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// A quadratic in-out curve.
 template <typename T>
-class EaseInOutDoubleExponentialSigmoidInterpolater
+class VELAMEDIALIB_TEMPLATE_API EaseInOutDoubleExponentialSigmoidInterpolater
     : public TweenableInterpolater<T>,
       public SharedInterpolaterInstance<EaseInOutDoubleExponentialSigmoidInterpolater<T>> {
 public:

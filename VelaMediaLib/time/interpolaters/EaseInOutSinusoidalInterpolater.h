@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// Half a sine wave: slow, fast, slow.
 template <typename T>
-class EaseInOutSinusoidalInterpolater
+class VELAMEDIALIB_TEMPLATE_API EaseInOutSinusoidalInterpolater
     : public TweenableInterpolater<T>,
       public SharedInterpolaterInstance<EaseInOutSinusoidalInterpolater<T>> {
 public:

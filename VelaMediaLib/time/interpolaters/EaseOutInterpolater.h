@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/ExponentialEaseInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 
@@ -7,8 +8,9 @@ namespace VelaMediaLib {
 
 /// Ends slowly: the square root of u.
 template <typename T>
-class EaseOutInterpolater : public ExponentialEaseInterpolater<T>,
-                            public SharedInterpolaterInstance<EaseOutInterpolater<T>> {
+class VELAMEDIALIB_TEMPLATE_API EaseOutInterpolater
+    : public ExponentialEaseInterpolater<T>,
+      public SharedInterpolaterInstance<EaseOutInterpolater<T>> {
 private:
     friend class SharedInterpolaterInstance<EaseOutInterpolater<T>>;
     EaseOutInterpolater() : ExponentialEaseInterpolater<T>(InterpolaterNameConstants::s_easeOutName, 0.5) {}

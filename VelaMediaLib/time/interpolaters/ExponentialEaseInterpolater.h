@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
 
@@ -7,7 +8,7 @@ namespace VelaMediaLib {
 
 /// Ease in and ease out differ only in the exponent of u.
 template <typename T>
-class ExponentialEaseInterpolater : public TweenableInterpolater<T> {
+class VELAMEDIALIB_TEMPLATE_API ExponentialEaseInterpolater : public TweenableInterpolater<T> {
 public:
     double exponent() const { return exponent_; }
     double ease(double u) const override { return InterpolaterUtil::easeExponential(u, exponent_); }

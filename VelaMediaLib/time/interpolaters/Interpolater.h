@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
 #include <boost/shared_ptr.hpp>
@@ -17,7 +18,7 @@ namespace VelaMediaLib {
 /// later keyframe (never before the earlier one) and the value holds at the
 /// earlier keyframe's value until then.
 template <typename T>
-class Interpolater {
+class VELAMEDIALIB_TEMPLATE_API Interpolater {
 public:
     virtual ~Interpolater() = default;
 
@@ -54,7 +55,7 @@ private:
 
 /// The one shared instance of an interpolater kind.
 template <typename Kind>
-class SharedInterpolaterInstance {
+class VELAMEDIALIB_TEMPLATE_API SharedInterpolaterInstance {
 public:
     static boost::shared_ptr<Kind> getInstance() {
         static const boost::shared_ptr<Kind> instance(new Kind());

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/time/interpolaters/BezierInterpolater.h>
 #include <VelaMediaLib/time/interpolaters/BounceInterpolater.h>
@@ -18,7 +19,7 @@ namespace VelaMediaLib {
 /// ValueTraits<T>::interpolation gives it. A name the type does not have
 /// throws ParserException "trying to read an unknown interpolater".
 template <typename T>
-class InterpolaterFactory {
+class VELAMEDIALIB_TEMPLATE_API InterpolaterFactory {
 public:
     typedef boost::shared_ptr<Interpolater<T>> Pointer;
 

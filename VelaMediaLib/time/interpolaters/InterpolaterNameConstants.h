@@ -1,9 +1,11 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 namespace VelaMediaLib {
 
 /// The four-character names by which documents refer to interpolater kinds.
-struct InterpolaterNameConstants {
+struct VELAMEDIALIB_API InterpolaterNameConstants {
     static constexpr const char* s_leftName = "left";
     static constexpr const char* s_linearName = "linr";
     static constexpr const char* s_easeInName = "esIn";

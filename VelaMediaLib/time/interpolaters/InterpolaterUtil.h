@@ -1,9 +1,11 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 namespace VelaMediaLib {
 
 /// The easing curves, each mapping u in [0, 1] to a weight.
-class InterpolaterUtil {
+class VELAMEDIALIB_API InterpolaterUtil {
 public:
     static double linear(double u) { return u; }
     /// The same function as linear: the real ease-out curve is the exponent of EaseOutInterpolater.

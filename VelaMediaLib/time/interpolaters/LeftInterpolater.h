@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
@@ -8,7 +9,8 @@ namespace VelaMediaLib {
 
 /// A step: the value stays at the earlier keyframe's until the next is reached.
 template <typename T>
-class LeftInterpolater : public Interpolater<T>, public SharedInterpolaterInstance<LeftInterpolater<T>> {
+class VELAMEDIALIB_TEMPLATE_API LeftInterpolater : public Interpolater<T>,
+                                                   public SharedInterpolaterInstance<LeftInterpolater<T>> {
 public:
     T doInterpolate(const T& a, const T&, const RationalTime&, const RationalTime&, double) const override {
         return a;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterUtil.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
@@ -8,8 +9,9 @@ namespace VelaMediaLib {
 
 /// Straight-line motion.
 template <typename T>
-class LinearInterpolater : public TweenableInterpolater<T>,
-                           public SharedInterpolaterInstance<LinearInterpolater<T>> {
+class VELAMEDIALIB_TEMPLATE_API LinearInterpolater
+    : public TweenableInterpolater<T>,
+      public SharedInterpolaterInstance<LinearInterpolater<T>> {
 public:
     double ease(double u) const override { return InterpolaterUtil::linear(u); }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterNameConstants.h>
 #include <VelaMediaLib/time/interpolaters/SpringResponse.h>
 #include <VelaMediaLib/time/interpolaters/TweenableInterpolater.h>
@@ -9,8 +10,9 @@ namespace VelaMediaLib {
 /// Arrives like a mass on a spring (damping 10, stiffness 100 for the shared
 /// instance), overshooting the value and settling on it.
 template <typename T>
-class SpringInterpolater : public TweenableInterpolater<T>,
-                           public SharedInterpolaterInstance<SpringInterpolater<T>> {
+class VELAMEDIALIB_TEMPLATE_API SpringInterpolater
+    : public TweenableInterpolater<T>,
+      public SharedInterpolaterInstance<SpringInterpolater<T>> {
 public:
     /// Throws ValueException<double> when damping or stiffness is zero or less.
     SpringInterpolater(double damping, double stiffness)

@@ -1,12 +1,14 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 namespace VelaMediaLib {
 
 /// The step response of a damped harmonic oscillator (mass 1), scaled so that
 /// an easing weight runs from 0 at u = 0 to exactly 1 at u = 1: u is mapped
 /// onto the settling time, the first time after which the response stays
 /// within one thousandth of 1, and the response is divided by its value there.
-class SpringResponse {
+class VELAMEDIALIB_API SpringResponse {
 public:
     static constexpr double kSettlingTolerance = 0.001;
 

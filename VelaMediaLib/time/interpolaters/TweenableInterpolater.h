@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
 #include <VelaMediaLib/time/parameters/ValueTraits.h>
 
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// The kinds that blend the two values by an easing weight:
 /// u = (t - t0) / (t1 - t0), w = ease(u), value = w*b + (1 - w)*a.
 template <typename T>
-class TweenableInterpolater : public Interpolater<T> {
+class VELAMEDIALIB_TEMPLATE_API TweenableInterpolater : public Interpolater<T> {
     static_assert(ValueTraits<T>::interpolation != Interpolation::Step, "the value type does not tween");
 
 public:

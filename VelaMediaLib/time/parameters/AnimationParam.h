@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 
 #include <vector>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// One animation of an animation track: a transition over a span of time
 /// (start and duration) with the interpolater that shapes it.
-struct Animation {
+struct VELAMEDIALIB_API Animation {
     Range<RationalTime> span;
     std::string interpolaterName;
 };
@@ -20,7 +21,7 @@ struct Animation {
 /// in force at its time (the last one at or before it, else the first). So
 /// that what is written reads back, every keyframe but the first has a lead-in.
 template <typename T>
-class AnimationParam : public InterpolatingParam<T> {
+class VELAMEDIALIB_TEMPLATE_API AnimationParam : public InterpolatingParam<T> {
 public:
     typedef typename ParameterImpl<T>::KeyFramePtr KeyFramePtr;
     using InterpolatingParam<T>::InterpolatingParam;

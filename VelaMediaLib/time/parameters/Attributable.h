@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
@@ -14,7 +15,7 @@ class XMLOptions;
 /// Named, typed, observable attributes of a model object ("width", "mixToMono",
 /// a track's "solo"). Each name holds one type; asking for it as another type
 /// answers null, adding it as another type throws TypeException.
-class Attributable : public virtual ProjectToken {
+class VELAMEDIALIB_API Attributable : public virtual ProjectToken {
 public:
     typedef boost::shared_ptr<AttributeInterface> AttributePtr;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/ValueTraits.h>
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 #include <VelaMediaLib/time/sync/Subject.h>
@@ -13,7 +14,8 @@ namespace VelaMediaLib {
 /// The type-independent face of an attribute: its name and its value as
 /// document text. Attributes are held by shared pointer; that pointer is
 /// their lifeline.
-class AttributeInterface : public Subject, public boost::enable_shared_from_this<AttributeInterface> {
+class VELAMEDIALIB_API AttributeInterface : public Subject,
+                                            public boost::enable_shared_from_this<AttributeInterface> {
 public:
     using Subject::Subject;
     boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
@@ -29,7 +31,7 @@ public:
 /// project's read lock and writes its write lock; setting the value it
 /// already has changes nothing and tells nobody.
 template <typename T>
-class Attribute : public AttributeInterface {
+class VELAMEDIALIB_TEMPLATE_API Attribute : public AttributeInterface {
 public:
     Attribute(std::string name, T value,
               const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>())

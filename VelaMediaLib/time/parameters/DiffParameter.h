@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/time/parameters/ParameterImpl.h>
 
 #include <set>
@@ -13,7 +15,7 @@ namespace VelaMediaLib {
 /// and follows the source when the source changes. Any edit made through the
 /// parameter's operations is kept as a difference.
 template <typename T>
-class DiffParameter : public ParameterImpl<T> {
+class VELAMEDIALIB_TEMPLATE_API DiffParameter : public ParameterImpl<T> {
 public:
     typedef ParameterImpl<T> Base;
     typedef typename Base::KeyFrameMap KeyFrameMap;
@@ -112,34 +114,7 @@ protected:
         if (!edit.interpolaterName().empty()) options.key("interp") << edit.interpolater()->asJson();
     }
 
-    void readKeyFrames(const Json::Value& json) override {
-        KeyFrameMap edits;
-        for (const Json::Value& entry : json["edits"]) {
-            if (!entry.isObject() || !entry.isMember("time") || !entry.isMember("value"))
-                throw ParserException("Invalid project json - an edit of " + this->identifier() +
-                                      " needs a time and a value");
-            const RationalTime time = JSONReader::jsonValueAsRationalTime(entry["time"]);
-            const RationalTime leadIn = entry.isMember("duration")
-                                            ? JSONReader::jsonValueAsRationalTime(entry["duration"])
-                                            : RationalTime(0);
-            if (leadIn < RationalTime(0))
-                throw ParserException("Invalid project json - an edit of " + this->identifier() +
-                                      " has a negative duration");
-            const typename Base::KeyFramePtr keyframe =
-                this->newKeyFrame(time, ValueTraits<T>::read(entry["value"]), leadIn);
-            if (entry.isMember("interp"))
-                keyframe->setInterpolater(InterpolaterFactory<T>::byName(
-                    ParameterDocument::requiredString(entry["interp"], "interp")));
-            MapUtil::put(edits, time, keyframe);
-        }
-        std::set<RationalTime> deletions;
-        for (const Json::Value& time : json["deletions"])
-            deletions.insert(JSONReader::jsonValueAsRationalTime(time));
-        edits_.swap(edits);
-        deletions_.swap(deletions);
-        ignoreSource_ = json["ignoreSource"].isBool() && json["ignoreSource"].asBool();
-        rebuild();
-    }
+    void readKeyFrames(const Json::Value& json) override; // detail/DiffParameterDocument.h
 
     void takeStateFrom(Base& read) override {
         Base::takeStateFrom(read);
@@ -213,4 +188,12 @@ private:
     SourceObserver sourceObserver_;
 };
 
+} // namespace VelaMediaLib
+
+// Built once in the library for every value type.
+namespace VelaMediaLib {
+#define VELA_EXTERN_DIFF_PARAMETER(Type)                                                                     \
+    extern template class VELAMEDIALIB_EXTERN_TEMPLATE DiffParameter<Type>;
+VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_EXTERN_DIFF_PARAMETER)
+#undef VELA_EXTERN_DIFF_PARAMETER
 } // namespace VelaMediaLib

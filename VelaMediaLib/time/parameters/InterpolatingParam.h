@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/ParameterImpl.h>
 
 namespace VelaMediaLib {
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// follow unless they name one; the document carries it as the parameter's
 /// "interp".
 template <typename T>
-class InterpolatingParam : public ParameterImpl<T> {
+class VELAMEDIALIB_TEMPLATE_API InterpolatingParam : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
 #include <VelaMediaLib/time/parameters/KeyFrameInterface.h>
 #include <VelaMediaLib/time/parameters/ValueTraits.h>
@@ -13,7 +14,7 @@ class ParameterImpl;
 /// transition that ends at this keyframe; an empty one means the parameter's
 /// own default.
 template <typename T>
-class KeyFrame : public KeyFrameInterface {
+class VELAMEDIALIB_TEMPLATE_API KeyFrame : public KeyFrameInterface {
 public:
     typedef boost::shared_ptr<Interpolater<T>> InterpolaterPtr;
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/MetaDatable.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
@@ -15,7 +16,7 @@ class XMLOptions;
 /// document's "duration") and hence when that transition starts (the
 /// document's "time"). Keyframes belong to their parameter and change only
 /// through its operations; reading them takes the project's read lock.
-class KeyFrameInterface : public MetaDatable {
+class VELAMEDIALIB_API KeyFrameInterface : public MetaDatable {
 public:
     KeyFrameInterface(const boost::weak_ptr<const ThreadSafe>& token, const RationalTime& endTime,
                       const RationalTime& leadIn);

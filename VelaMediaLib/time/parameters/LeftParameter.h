@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/ParameterImpl.h>
 
 namespace VelaMediaLib {
@@ -7,7 +8,7 @@ namespace VelaMediaLib {
 /// A parameter that only steps: every segment holds the earlier keyframe's
 /// value until the next keyframe, whatever interpolater a keyframe names.
 template <typename T>
-class LeftParameter : public ParameterImpl<T> {
+class VELAMEDIALIB_TEMPLATE_API LeftParameter : public ParameterImpl<T> {
 public:
     typedef typename ParameterImpl<T>::InterpolaterPtr InterpolaterPtr;
     using ParameterImpl<T>::ParameterImpl;

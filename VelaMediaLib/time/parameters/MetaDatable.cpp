@@ -4,6 +4,8 @@
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 
+#include <json/value.h>
+
 namespace VelaMediaLib {
 
 MetaDatable::MetaDatable(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }

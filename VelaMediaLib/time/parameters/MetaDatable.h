@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
 
@@ -15,7 +16,7 @@ class XMLOptions;
 
 /// String metadata of an object: each key holds an observable attribute.
 /// Reads and writes take the project lock through the object's token.
-class MetaDatable : public virtual ProjectToken {
+class VELAMEDIALIB_API MetaDatable : public virtual ProjectToken {
 public:
     typedef boost::shared_ptr<Attribute<std::string>> AttributePtr;
 

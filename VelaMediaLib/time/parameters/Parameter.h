@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/time/parameters/KeyFrame.h>
 #include <VelaMediaLib/time/parameters/ParameterInterface.h>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// The typed operations of a keyframed parameter of value type T.
 template <typename T>
-class Parameter : public ParameterInterface {
+class VELAMEDIALIB_TEMPLATE_API Parameter : public ParameterInterface {
 public:
     typedef T ValueType;
     typedef KeyFrame<T> KeyFrameType;

@@ -17,6 +17,7 @@
 //   takes the write lock; what they add to a constant parameter's document
 //   form counts only when it holds something.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 #include <VelaMediaLib/time/parameters/KeyFrameMapUtil.h>
@@ -35,18 +36,18 @@ namespace VelaMediaLib {
 
 /// The minimum, maximum and default a user interface offers for a parameter.
 template <typename T>
-struct ValueBounds {
+struct VELAMEDIALIB_TEMPLATE_API ValueBounds {
     T minValue, maxValue, defaultValue;
 };
 
 /// How a user interface presents a parameter: its control and its unit.
-struct UIHints {
+struct VELAMEDIALIB_API UIHints {
     std::string userInterfaceType;
     std::string unitType;
 };
 
 template <typename T>
-class ParameterImpl : public Parameter<T> {
+class VELAMEDIALIB_TEMPLATE_API ParameterImpl : public Parameter<T> {
 public:
     typedef Parameter<T> Base;
     typedef typename Base::KeyFramePtr KeyFramePtr;
@@ -283,11 +284,10 @@ private:
 
 #include <VelaMediaLib/time/parameters/detail/ParameterImplQueries.h>
 #include <VelaMediaLib/time/parameters/detail/ParameterImplEdits.h>
-#include <VelaMediaLib/time/parameters/detail/ParameterImplDocument.h>
 
 // Built once in the library for every value type.
 namespace VelaMediaLib {
-#define VELA_EXTERN_PARAMETER(Type) extern template class ParameterImpl<Type>;
+#define VELA_EXTERN_PARAMETER(Type) extern template class VELAMEDIALIB_EXTERN_TEMPLATE ParameterImpl<Type>;
 VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_EXTERN_PARAMETER)
 #undef VELA_EXTERN_PARAMETER
 } // namespace VelaMediaLib

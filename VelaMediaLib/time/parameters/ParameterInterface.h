@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/parameters/KeyFrameInterface.h>
@@ -10,9 +11,13 @@
 
 #include <boost/enable_shared_from_this.hpp>
 #include <functional>
-#include <json/value.h>
 #include <map>
 #include <vector>
+
+// Documents are read from jsoncpp values; only the library needs their definition.
+namespace Json {
+class Value;
+} // namespace Json
 
 namespace VelaMediaLib {
 
@@ -23,7 +28,8 @@ class XMLOptions;
 /// Queries take the project's read lock, edits its write lock; observers are
 /// told after each edit that changed something. Parameters are held by shared
 /// pointer; that pointer is their lifeline.
-class ParameterInterface : public Subject, public boost::enable_shared_from_this<ParameterInterface> {
+class VELAMEDIALIB_API ParameterInterface : public Subject,
+                                            public boost::enable_shared_from_this<ParameterInterface> {
 public:
     explicit ParameterInterface(const boost::weak_ptr<const ThreadSafe>& token) : Subject(token) {}
     boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }

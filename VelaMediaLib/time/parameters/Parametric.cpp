@@ -4,6 +4,7 @@
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 
+#include <json/value.h>
 #include <algorithm>
 #include <utility>
 

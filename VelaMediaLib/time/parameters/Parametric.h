@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/time/sync/LazyCreation.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
@@ -22,7 +23,9 @@ class XMLOptions;
 /// the read lock (the new parameter holds the default they would have
 /// answered) and never asks for the write lock, so a reader's snapshot stays
 /// one.
-class Parametric : public virtual XMLIdentified, public virtual TimeScalable, public virtual ProjectToken {
+class VELAMEDIALIB_API Parametric : public virtual XMLIdentified,
+                                    public virtual TimeScalable,
+                                    public virtual ProjectToken {
 public:
     explicit Parametric(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/time/parameters/Parameter.h>
 
@@ -14,7 +15,7 @@ namespace VelaMediaLib {
 /// as one kind answers an empty pointer when asked for as a kind it is not
 /// (a Source asked for as a Media); a clip can be asked for as any of its
 /// kinds (Media, Parametric, its own class).
-class SymbolTable {
+class VELAMEDIALIB_API SymbolTable {
 public:
     /// For sources, timelines, groups, effects, clips and vector nodes.
     template <typename T>

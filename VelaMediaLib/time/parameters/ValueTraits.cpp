@@ -3,6 +3,7 @@
 #include <VelaMediaLib/document/format/JSONWriter.h>
 
 #include <ostream>
+#include <json/value.h>
 
 namespace VelaMediaLib {
 

@@ -15,6 +15,7 @@
 //   one line.
 // The parameter value types are listed once, at the end, for instantiation.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/CaptionData.h>
 #include <VelaMediaLib/base/KeystrokeData.h>
@@ -64,13 +65,13 @@ inline bool close(double a, double b, double relative) {
 
 /// Values compared exactly, both for similarity and sameness.
 template <typename T>
-struct ExactValue {
+struct VELAMEDIALIB_TEMPLATE_API ExactValue {
     static bool similar(const T& a, const T& b) { return a == b; }
     static bool same(const T& a, const T& b) { return a == b; }
 };
 
 template <>
-struct ValueTraits<bool> : ExactValue<bool> { // attributes only
+struct VELAMEDIALIB_API ValueTraits<bool> : ExactValue<bool> { // attributes only
     static const char* typeName() { return "bool"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& o, int indent, bool v) { writeJSONValue(o, indent, v); }
@@ -78,7 +79,7 @@ struct ValueTraits<bool> : ExactValue<bool> { // attributes only
 };
 
 template <>
-struct ValueTraits<int> : ExactValue<int> {
+struct VELAMEDIALIB_API ValueTraits<int> : ExactValue<int> {
     static const char* typeName() { return "int"; }
     static constexpr Interpolation interpolation = Interpolation::Curves;
     static int blend(int a, int b, double w) { return int(std::lround(w * b + (1.0 - w) * a)); }
@@ -87,7 +88,7 @@ struct ValueTraits<int> : ExactValue<int> {
 };
 
 template <>
-struct ValueTraits<long long> : ExactValue<long long> {
+struct VELAMEDIALIB_API ValueTraits<long long> : ExactValue<long long> {
     static const char* typeName() { return "int64"; }
     static constexpr Interpolation interpolation = Interpolation::Eases;
     static long long blend(long long a, long long b, double w) {
@@ -98,7 +99,7 @@ struct ValueTraits<long long> : ExactValue<long long> {
 };
 
 template <>
-struct ValueTraits<float> {
+struct VELAMEDIALIB_API ValueTraits<float> {
     static const char* typeName() { return "?"; }
     static bool similar(float a, float b) { return ValueTolerance::close(a, b, 1e-6); }
     static bool same(float a, float b) { return a == b; }
@@ -109,7 +110,7 @@ struct ValueTraits<float> {
 };
 
 template <>
-struct ValueTraits<double> {
+struct VELAMEDIALIB_API ValueTraits<double> {
     static const char* typeName() { return "double"; }
     static bool similar(double a, double b) { return ValueTolerance::close(a, b, 1e-9); }
     static bool same(double a, double b) { return a == b; }
@@ -120,7 +121,7 @@ struct ValueTraits<double> {
 };
 
 template <>
-struct ValueTraits<std::string> : ExactValue<std::string> {
+struct VELAMEDIALIB_API ValueTraits<std::string> : ExactValue<std::string> {
     static const char* typeName() { return "string"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& o, int indent, const std::string& v) { writeJSONValue(o, indent, v); }
@@ -128,7 +129,7 @@ struct ValueTraits<std::string> : ExactValue<std::string> {
 };
 
 template <>
-struct ValueTraits<SafeRational> : ExactValue<SafeRational> {
+struct VELAMEDIALIB_API ValueTraits<SafeRational> : ExactValue<SafeRational> {
     static const char* typeName() { return "rational"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& o, int indent, const SafeRational& v) { writeJSONValue(o, indent, v); }
@@ -136,7 +137,7 @@ struct ValueTraits<SafeRational> : ExactValue<SafeRational> {
 };
 
 template <>
-struct ValueTraits<Rect<float>> {
+struct VELAMEDIALIB_API ValueTraits<Rect<float>> {
     typedef ValueTraits<float> Member;
     static const char* typeName() { return "rect"; }
     static bool similar(const Rect<float>& a, const Rect<float>& b) {
@@ -154,7 +155,7 @@ struct ValueTraits<Rect<float>> {
 };
 
 template <>
-struct ValueTraits<TemplatedColor<int>> : ExactValue<TemplatedColor<int>> {
+struct VELAMEDIALIB_API ValueTraits<TemplatedColor<int>> : ExactValue<TemplatedColor<int>> {
     typedef ValueTraits<int> Member;
     static const char* typeName() { return "color"; }
     static constexpr Interpolation interpolation = Interpolation::Curves;
@@ -167,7 +168,7 @@ struct ValueTraits<TemplatedColor<int>> : ExactValue<TemplatedColor<int>> {
 };
 
 template <>
-struct ValueTraits<Point3d> {
+struct VELAMEDIALIB_API ValueTraits<Point3d> {
     typedef ValueTraits<double> Member;
     static const char* typeName() { return "point"; }
     static bool similar(const Point3d& a, const Point3d& b) {
@@ -183,7 +184,7 @@ struct ValueTraits<Point3d> {
 };
 
 template <>
-struct ValueTraits<AudioPosition> {
+struct VELAMEDIALIB_API ValueTraits<AudioPosition> {
     typedef ValueTraits<double> Member;
     static const char* typeName() { return "audioPosition"; }
     static bool similar(const AudioPosition& a, const AudioPosition& b) {
@@ -199,7 +200,7 @@ struct ValueTraits<AudioPosition> {
 };
 
 template <>
-struct ValueTraits<TransformMatrix> {
+struct VELAMEDIALIB_API ValueTraits<TransformMatrix> {
     typedef ValueTraits<double> Member;
     static const char* typeName() { return "matrix"; }
     static bool similar(const TransformMatrix& a, const TransformMatrix& b) {
@@ -220,7 +221,7 @@ struct ValueTraits<TransformMatrix> {
 };
 
 template <>
-struct ValueTraits<CaptionData> : ExactValue<CaptionData> {
+struct VELAMEDIALIB_API ValueTraits<CaptionData> : ExactValue<CaptionData> {
     static const char* typeName() { return "caption"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& options, int indent, const CaptionData& value);
@@ -228,7 +229,7 @@ struct ValueTraits<CaptionData> : ExactValue<CaptionData> {
 };
 
 template <>
-struct ValueTraits<KeystrokeData> : ExactValue<KeystrokeData> {
+struct VELAMEDIALIB_API ValueTraits<KeystrokeData> : ExactValue<KeystrokeData> {
     static const char* typeName() { return "keystroke"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& options, int indent, const KeystrokeData& value);
@@ -236,7 +237,7 @@ struct ValueTraits<KeystrokeData> : ExactValue<KeystrokeData> {
 };
 
 template <>
-struct ValueTraits<TextAttributeList> : ExactValue<TextAttributeList> {
+struct VELAMEDIALIB_API ValueTraits<TextAttributeList> : ExactValue<TextAttributeList> {
     static const char* typeName() { return "textAttributeList"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& options, int indent, const TextAttributeList& value);
@@ -244,7 +245,7 @@ struct ValueTraits<TextAttributeList> : ExactValue<TextAttributeList> {
 };
 
 template <>
-struct ValueTraits<std::vector<double>> {
+struct VELAMEDIALIB_API ValueTraits<std::vector<double>> {
     typedef ValueTraits<double> Member;
     static const char* typeName() { return "vector"; }
     static bool similar(const std::vector<double>& a, const std::vector<double>& b) {
@@ -257,7 +258,7 @@ struct ValueTraits<std::vector<double>> {
 };
 
 template <>
-struct ValueTraits<std::list<Rect<float>>> {
+struct VELAMEDIALIB_API ValueTraits<std::list<Rect<float>>> {
     typedef ValueTraits<Rect<float>> Member;
     static const char* typeName() { return "rectList"; }
     static bool similar(const std::list<Rect<float>>& a, const std::list<Rect<float>>& b) {
@@ -274,7 +275,7 @@ struct ValueTraits<std::list<Rect<float>>> {
 /// curve); one is written as its name and read back through the shared
 /// instances; an empty reference is written as null.
 template <typename X>
-struct ValueTraits<boost::shared_ptr<Interpolater<X>>> {
+struct VELAMEDIALIB_TEMPLATE_API ValueTraits<boost::shared_ptr<Interpolater<X>>> {
     typedef boost::shared_ptr<Interpolater<X>> Pointer;
     static const char* typeName() { return "interpolater"; }
     static bool same(const Pointer& a, const Pointer& b) {
@@ -287,7 +288,7 @@ struct ValueTraits<boost::shared_ptr<Interpolater<X>>> {
         options.stream() << (value ? value->asJson() : std::string("null"));
     }
     static Pointer read(const Json::Value& json) {
-        if (json.isNull()) return Pointer();
+        if (jsonValueIsNull(json)) return Pointer();
         return InterpolaterFactory<X>::byName(jsonValueAsString(json));
     }
 };

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/parameters/ParameterImpl.h>
 
 #include <vector>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// A parameter whose value is a vector of doubles (a curve, a set of weights).
 /// Vectors step from keyframe to keyframe.
-class VectorParam : public ParameterImpl<std::vector<double>> {
+class VELAMEDIALIB_API VectorParam : public ParameterImpl<std::vector<double>> {
 public:
     using ParameterImpl<std::vector<double>>::ParameterImpl;
 

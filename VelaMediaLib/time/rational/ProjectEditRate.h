@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/rational.hpp>
 #include <cstdint>
 
@@ -8,7 +10,7 @@ namespace VelaMediaLib {
 class Observer;
 
 /// Tells the whole project its tick rate and who to tell when it changes.
-class ProjectEditRate {
+class VELAMEDIALIB_API ProjectEditRate {
 public:
     virtual ~ProjectEditRate() = default;
     /// Ticks per second of the project.

@@ -1,12 +1,14 @@
 #pragma once
 // A small pair used for start-and-duration ranges throughout the library.
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <ostream>
 
 namespace VelaMediaLib {
 
 template <typename T>
-class Range {
+class VELAMEDIALIB_TEMPLATE_API Range {
 public:
     Range() : first_(), second_() {}
     Range(T first, T second) : first_(first), second_(second) {}

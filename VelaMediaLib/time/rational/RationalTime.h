@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
 
 #include <ostream>
@@ -7,7 +8,7 @@
 namespace VelaMediaLib {
 
 /// A time held as an exact rational: the time of keyframes and parameters.
-class RationalTime {
+class VELAMEDIALIB_API RationalTime {
 public:
     RationalTime() = default;
     RationalTime(long long numerator, long long denominator) : value_(numerator, denominator) {}

@@ -1,6 +1,7 @@
 #pragma once
 // Exact rounding of rationals and conversions to ticks and doubles.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
 
@@ -8,7 +9,7 @@
 
 namespace VelaMediaLib {
 
-class RationalUtil {
+class VELAMEDIALIB_API RationalUtil {
 public:
     /// Greatest integer not above x.
     static SafeRational Floor(const SafeRational& x);

@@ -4,12 +4,14 @@
 // computation of the same operation) is replaced by a decimal approximation
 // rather than reported.
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/rational.hpp>
 #include <iosfwd>
 
 namespace VelaMediaLib {
 
-class SafeRational {
+class VELAMEDIALIB_API SafeRational {
 public:
     SafeRational() : num_(0), den_(1) {}
     SafeRational(long long n) : num_(n), den_(1) {} // NOLINT: integers are rationals
@@ -48,14 +50,14 @@ private:
     long long den_;
 };
 
-SafeRational operator+(const SafeRational& a, const SafeRational& b);
-SafeRational operator-(const SafeRational& a, const SafeRational& b);
-SafeRational operator*(const SafeRational& a, const SafeRational& b);
-SafeRational operator/(const SafeRational& a, const SafeRational& b);
-SafeRational abs(const SafeRational& x);
+VELAMEDIALIB_API SafeRational operator+(const SafeRational& a, const SafeRational& b);
+VELAMEDIALIB_API SafeRational operator-(const SafeRational& a, const SafeRational& b);
+VELAMEDIALIB_API SafeRational operator*(const SafeRational& a, const SafeRational& b);
+VELAMEDIALIB_API SafeRational operator/(const SafeRational& a, const SafeRational& b);
+VELAMEDIALIB_API SafeRational abs(const SafeRational& x);
 
 /// Exact three-way comparison: negative, zero or positive.
-int compare(const SafeRational& a, const SafeRational& b);
+VELAMEDIALIB_API int compare(const SafeRational& a, const SafeRational& b);
 
 inline bool operator==(const SafeRational& a, const SafeRational& b) {
     return a.numerator() == b.numerator() && a.denominator() == b.denominator();
@@ -79,8 +81,8 @@ inline bool operator>(long long a, const SafeRational& b) { return SafeRational(
 inline bool operator>=(long long a, const SafeRational& b) { return SafeRational(a) >= b; }
 
 /// Written as numerator '/' denominator ("1/30", "0/1").
-std::ostream& operator<<(std::ostream& out, const SafeRational& value);
+VELAMEDIALIB_API std::ostream& operator<<(std::ostream& out, const SafeRational& value);
 /// Reads an integer and, when a '/' follows, a denominator (1 when missing).
-std::istream& operator>>(std::istream& in, SafeRational& value);
+VELAMEDIALIB_API std::istream& operator>>(std::istream& in, SafeRational& value);
 
 } // namespace VelaMediaLib

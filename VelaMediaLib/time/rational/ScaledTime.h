@@ -1,11 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <iosfwd>
 
 namespace VelaMediaLib {
 
 /// An integer time with its own scale (ticks per second).
-class ScaledTime {
+class VELAMEDIALIB_API ScaledTime {
 public:
     /// Ticks per second of a flick, the scale that divides every common frame and sample rate.
     static const long long kFlickScale = 705600000;
@@ -45,6 +47,6 @@ inline bool operator==(const ScaledTime& a, long long flicks) { return a.toFlick
 inline bool operator==(long long flicks, const ScaledTime& a) { return a.toFlicks() == flicks; }
 
 /// "{ time: 1, scale: 30}"
-std::ostream& operator<<(std::ostream& out, const ScaledTime& value);
+VELAMEDIALIB_API std::ostream& operator<<(std::ostream& out, const ScaledTime& value);
 
 } // namespace VelaMediaLib

@@ -1,12 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/ScaledTime.h>
 
 namespace VelaMediaLib {
 
 /// A start and a duration sharing one scale.
-class ScaledTimeRange {
+class VELAMEDIALIB_API ScaledTimeRange {
 public:
     ScaledTimeRange(long long scale, long long start, long long duration);
     ScaledTimeRange(long long scale, const Range<long long>& startAndDuration);
@@ -42,6 +43,6 @@ inline bool operator==(const ScaledTimeRange& a, const Range<long long>& b) { re
 inline bool operator==(const Range<long long>& a, const ScaledTimeRange& b) { return a == b.range(); }
 
 /// "{ start: { time: 0, scale: 30}, duration: { time: 30, scale: 30}}"
-std::ostream& operator<<(std::ostream& out, const ScaledTimeRange& value);
+VELAMEDIALIB_API std::ostream& operator<<(std::ostream& out, const ScaledTimeRange& value);
 
 } // namespace VelaMediaLib

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/ProjectEditRate.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
 
@@ -11,7 +12,7 @@ namespace VelaMediaLib {
 /// project keeps its rate in one of these. Every rate that reaches it is a
 /// reduced rational: a zero numerator is the rate 0/1, and a zero denominator
 /// never gets this far (the rational refuses it, see rateOf).
-class SimpleProjectEditRate : public ProjectEditRate {
+class VELAMEDIALIB_API SimpleProjectEditRate : public ProjectEditRate {
 public:
     explicit SimpleProjectEditRate(const boost::rational<unsigned long>& rate);
 

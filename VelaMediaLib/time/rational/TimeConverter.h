@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
 
 #include <boost/shared_ptr.hpp>
@@ -12,7 +13,7 @@ namespace VelaMediaLib {
 /// lost its container), and the recursive helpers compose the single steps
 /// along that chain. The chain is walked through shared pointers, so a
 /// container that goes away during a walk stays alive until the walk ends.
-class TimeConverter {
+class VELAMEDIALIB_API TimeConverter {
 public:
     virtual ~TimeConverter() = default;
 

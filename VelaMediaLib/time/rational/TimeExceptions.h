@@ -1,6 +1,7 @@
 #pragma once
 // The exceptions that carry a time or a range of ticks.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/time/rational/Range.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 
 /// A trim that would leave the clip outside its limits: the offset asked for
 /// and the clip's track range (start, duration) at the time.
-class InvalidTrimRangeException : public ValueException<long long> {
+class VELAMEDIALIB_API InvalidTrimRangeException : public ValueException<long long> {
 public:
     InvalidTrimRangeException(std::string message, long long offset,
                               Range<long long> trackRange = Range<long long>())
@@ -22,7 +23,7 @@ private:
 
 /// A keyframe operation that could not be carried out: the time it was asked
 /// for and the identifying text of the parameter.
-class KeyFrameException : public VelaMediaLibException {
+class VELAMEDIALIB_API KeyFrameException : public VelaMediaLibException {
 public:
     explicit KeyFrameException(std::string message, RationalTime time = RationalTime(),
                                std::string identifier = std::string())

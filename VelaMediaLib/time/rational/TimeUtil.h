@@ -1,13 +1,14 @@
 #pragma once
 // Conversions between ticks, seconds and scaled durations.
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/rational/SafeRational.h>
 
 #include <boost/rational.hpp>
 
 namespace VelaMediaLib {
 
-class TimeUtil {
+class VELAMEDIALIB_API TimeUtil {
 public:
     /// Round(duration * scalar) in ticks, with any partial editing unit dropped.
     static long long durationWithScalarRoundedToEditingUnit(const SafeRational& duration,

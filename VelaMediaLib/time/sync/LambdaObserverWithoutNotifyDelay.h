@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Observable.h>
 
 #include <boost/function.hpp>
@@ -10,7 +11,7 @@ namespace VelaMediaLib {
 
 /// An observer that calls a stored function and is never held back by a
 /// notify delay.
-class LambdaObserverWithoutNotifyDelay : public Observer {
+class VELAMEDIALIB_API LambdaObserverWithoutNotifyDelay : public Observer {
 public:
     typedef boost::function<void(Observable*)> Function;
 

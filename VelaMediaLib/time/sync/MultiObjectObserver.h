@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Observable.h>
 
 #include <boost/function.hpp>
@@ -12,7 +13,7 @@ namespace VelaMediaLib {
 /// Observes several subjects of one project with one function, and detaches
 /// from those still alive when it goes. Its notifications follow the
 /// project's notify delays like any ordinary observer's.
-class MultiObjectObserver : public Observer {
+class VELAMEDIALIB_API MultiObjectObserver : public Observer {
 public:
     typedef boost::function<void(Observable*)> Function;
 

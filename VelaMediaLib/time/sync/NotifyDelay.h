@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/shared_ptr.hpp>
 #include <boost/weak_ptr.hpp>
 #include <condition_variable>
@@ -51,7 +53,7 @@ private:
 /// object it belongs to lives until its observers have heard; a subject whose
 /// lifeline has expired by then is being destroyed and is skipped. The last
 /// reference may then be let go by the delivering thread, after the read lock.
-class NotifyDelay {
+class VELAMEDIALIB_API NotifyDelay {
 public:
     /// Throws VelaMediaLibException "nested delays not supported" when opened
     /// by an observer while the project's held-back notifications are delivered.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Observer.h>
 
 #include <boost/weak_ptr.hpp>
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 
 /// The base of every subject. Observers are held by plain pointer: an observer
 /// detaches itself before it goes (the scoped observers below do so).
-class Observable {
+class VELAMEDIALIB_API Observable {
 public:
     virtual ~Observable() = default;
     virtual void attach(Observer* observer) = 0;

@@ -1,11 +1,13 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 namespace VelaMediaLib {
 
 class Observable;
 
 /// Anything that wants to hear that a subject changed.
-class Observer {
+class VELAMEDIALIB_API Observer {
 public:
     virtual ~Observer() = default;
     virtual void update(Observable* subject) = 0;

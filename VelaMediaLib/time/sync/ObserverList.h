@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <atomic>
 #include <functional>
 #include <thread>
@@ -27,7 +29,7 @@ class ReadWriteMutex;
 ///   the thread that calls it, returns at once.
 ///
 /// The lists are allocated with the first observer: most subjects have none.
-class ObserverList {
+class VELAMEDIALIB_API ObserverList {
 public:
     enum Kind { Ordinary = 0, WithoutDelay = 1 };
     typedef std::function<bool()> StillHere;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/weak_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -14,7 +16,7 @@ class ThreadSafe;
 /// All parts of one object are given the same token. A part constructed with
 /// a token records it; one constructed without leaves the token the other
 /// parts recorded, so the order in which the parts are built does not matter.
-class ProjectToken {
+class VELAMEDIALIB_API ProjectToken {
 public:
     /// The project's token; empty for an object of no project, expired once
     /// the project has gone.

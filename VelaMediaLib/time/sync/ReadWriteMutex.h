@@ -14,6 +14,8 @@
 // when the write lock ends, so two upgrading readers cannot deadlock; what it
 // read before may have changed by then.
 
+#include <VelaMediaLib/base/Export.h>
+
 #include <boost/weak_ptr.hpp>
 #include <atomic>
 #include <boost/shared_ptr.hpp>
@@ -22,7 +24,7 @@ namespace VelaMediaLib {
 
 class ThreadSafe;
 
-class ReadWriteMutex {
+class VELAMEDIALIB_API ReadWriteMutex {
 public:
     ReadWriteMutex();
     ReadWriteMutex(const ReadWriteMutex&) = delete;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Observable.h>
 #include <VelaMediaLib/time/sync/ObserverList.h>
 #include <VelaMediaLib/time/sync/ProjectToken.h>
@@ -34,7 +35,7 @@ class NotifyDelay;
 /// the delivery to end (by then the parts of any object it belongs to are
 /// gone: such objects give a lifeline); one destroyed by its own observer
 /// ends its delivery.
-class SubjectBase : public virtual Observable {
+class VELAMEDIALIB_API SubjectBase : public virtual Observable {
 public:
     SubjectBase() = default;
     ~SubjectBase() override = default;
@@ -99,7 +100,7 @@ private:
 
 /// A subject on its own (a parameter, an attribute, a keyframe's owner): it
 /// keeps the project's token itself.
-class Subject : public SubjectBase {
+class VELAMEDIALIB_API Subject : public SubjectBase {
 public:
     explicit Subject(const boost::weak_ptr<const ThreadSafe>& token = boost::weak_ptr<const ThreadSafe>());
     ~Subject() override;
@@ -119,7 +120,7 @@ private:
 
 /// The subject part of an object whose parts share one ProjectToken (a clip,
 /// a track, the timeline): it keeps no token of its own.
-class ObjectSubject : public SubjectBase, public virtual ProjectToken {
+class VELAMEDIALIB_API ObjectSubject : public SubjectBase, public virtual ProjectToken {
 public:
     explicit ObjectSubject(const boost::weak_ptr<const ThreadSafe>& token) { recordProjectToken(token); }
     ~ObjectSubject() override;
@@ -131,7 +132,7 @@ protected:
 /// A further subject of an object (a clip's transition subject) that
 /// notifies under the token of the object it is a part of, keeping no copy.
 /// The object outlives it: it is a member of that object.
-class PartSubject : public SubjectBase {
+class VELAMEDIALIB_API PartSubject : public SubjectBase {
 public:
     explicit PartSubject(const ProjectToken& object) : object_(object) {}
     ~PartSubject() override;

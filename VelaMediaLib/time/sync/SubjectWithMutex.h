@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/Subject.h>
 
 namespace VelaMediaLib {
@@ -9,7 +10,7 @@ namespace VelaMediaLib {
 /// rate). Every subject now guards its lists alike (see ObserverList): once
 /// detach has returned on a thread that holds no project lock, the observer is
 /// not running and will not be called; the name stays for these subjects.
-class SubjectWithMutex : public Subject {
+class VELAMEDIALIB_API SubjectWithMutex : public Subject {
 public:
     using Subject::Subject;
 };

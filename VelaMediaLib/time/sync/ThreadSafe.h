@@ -1,5 +1,6 @@
 #pragma once
 
+#include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 
@@ -8,7 +9,7 @@ namespace VelaMediaLib {
 /// The thread-safety token: the project derives from it, so the project itself
 /// is the token every model object holds (weakly) to find the project's lock.
 /// It also keeps the project's notify-delay state, so that state goes with it.
-class ThreadSafe {
+class VELAMEDIALIB_API ThreadSafe {
 public:
     ThreadSafe() = default;
     virtual ~ThreadSafe();

@@ -6,6 +6,9 @@
 
 #include <VelaMediaLib/document/format/JSONReader.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
+#include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
+
+#include <json/value.h>
 
 namespace VelaMediaLib {
 
