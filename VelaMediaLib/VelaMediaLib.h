@@ -35,7 +35,7 @@
 #include <VelaMediaLib/commands/framework/LambdaMultiCommand.h>
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/commands/framework/NullCmd.h>
-#include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/JSONReader.h>
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/document/format/VersionInfo.h>

@@ -1,5 +1,5 @@
 #include <VelaMediaLib/base/VelaMediaLibException.h>
-#include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/JSONReader.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 #include <VelaMediaLib/time/parameters/ValueTraits.h>

@@ -38,6 +38,15 @@ VELAMEDIALIB_API void writeJSONValue(XMLOptions& options, int indent, const Rati
 /// A tick range as [start, duration].
 VELAMEDIALIB_API void writeJSONValue(XMLOptions& options, int indent, const Range<long long>& value);
 
+/// An integer (n/1) or a string "n/d" whose halves are base-10 64-bit
+/// integers. A malformed half throws std::invalid_argument or
+/// std::out_of_range, a zero denominator boost::bad_rational, any other JSON
+/// type ParserException "Invalid project json - unsupported json type for
+/// VelaRational: " and the value.
+VELAMEDIALIB_API SafeRational jsonValueAsVelaRational(const Json::Value& value);
+VELAMEDIALIB_API RationalTime jsonValueAsRationalTime(const Json::Value& value);
+/// A count of ticks: a 64-bit integer (a whole-valued rational is accepted too).
+VELAMEDIALIB_API long long jsonValueAsVelaTime(const Json::Value& value);
 VELAMEDIALIB_API bool jsonValueAsBool(const Json::Value& json);
 VELAMEDIALIB_API int jsonValueAsInt(const Json::Value& json);
 VELAMEDIALIB_API long long jsonValueAsInt64(const Json::Value& json);

@@ -24,7 +24,6 @@
 #include <VelaMediaLib/base/TemplatedColor.h>
 #include <VelaMediaLib/base/TextAttributeList.h>
 #include <VelaMediaLib/base/TransformMatrix.h>
-#include <VelaMediaLib/document/format/JSONReader.h>
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/time/interpolaters/Interpolater.h>
@@ -133,7 +132,7 @@ struct VELAMEDIALIB_API ValueTraits<SafeRational> : ExactValue<SafeRational> {
     static const char* typeName() { return "rational"; }
     static constexpr Interpolation interpolation = Interpolation::Step;
     static void write(XMLOptions& o, int indent, const SafeRational& v) { writeJSONValue(o, indent, v); }
-    static SafeRational read(const Json::Value& json) { return JSONReader::jsonValueAsVelaRational(json); }
+    static SafeRational read(const Json::Value& json) { return jsonValueAsVelaRational(json); }
 };
 
 template <>

@@ -16,10 +16,9 @@ void DiffParameter<T>::readKeyFrames(const Json::Value& json) {
         if (!entry.isObject() || !entry.isMember("time") || !entry.isMember("value"))
             throw ParserException("Invalid project json - an edit of " + this->identifier() +
                                   " needs a time and a value");
-        const RationalTime time = JSONReader::jsonValueAsRationalTime(entry["time"]);
-        const RationalTime leadIn = entry.isMember("duration")
-                                        ? JSONReader::jsonValueAsRationalTime(entry["duration"])
-                                        : RationalTime(0);
+        const RationalTime time = jsonValueAsRationalTime(entry["time"]);
+        const RationalTime leadIn =
+            entry.isMember("duration") ? jsonValueAsRationalTime(entry["duration"]) : RationalTime(0);
         if (leadIn < RationalTime(0))
             throw ParserException("Invalid project json - an edit of " + this->identifier() +
                                   " has a negative duration");
@@ -31,8 +30,7 @@ void DiffParameter<T>::readKeyFrames(const Json::Value& json) {
         MapUtil::put(edits, time, keyframe);
     }
     std::set<RationalTime> deletions;
-    for (const Json::Value& time : json["deletions"])
-        deletions.insert(JSONReader::jsonValueAsRationalTime(time));
+    for (const Json::Value& time : json["deletions"]) deletions.insert(jsonValueAsRationalTime(time));
     edits_.swap(edits);
     deletions_.swap(deletions);
     ignoreSource_ = json["ignoreSource"].isBool() && json["ignoreSource"].asBool();

@@ -4,7 +4,7 @@
 // "keyframes", each where it applies. Reading goes into a scratch copy that
 // takes this parameter's place only when the whole value was read.
 
-#include <VelaMediaLib/document/format/JSONReader.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
 
@@ -179,12 +179,11 @@ void ParameterImpl<T>::readKeyFrame(const Json::Value& json) {
     if (!json.isObject() || !json.isMember("value"))
         throw ParserException("Invalid project json - a keyframe of " + identifier_ + " has no value");
     const RationalTime leadIn =
-        json.isMember("duration") ? JSONReader::jsonValueAsRationalTime(json["duration"]) : RationalTime(0);
+        json.isMember("duration") ? jsonValueAsRationalTime(json["duration"]) : RationalTime(0);
     if (!json.isMember("endTime") && !json.isMember("time"))
         throw ParserException("Invalid project json - a keyframe of " + identifier_ + " has no time");
-    const RationalTime end = json.isMember("endTime")
-                                 ? JSONReader::jsonValueAsRationalTime(json["endTime"])
-                                 : JSONReader::jsonValueAsRationalTime(json["time"]) + leadIn;
+    const RationalTime end = json.isMember("endTime") ? jsonValueAsRationalTime(json["endTime"])
+                                                      : jsonValueAsRationalTime(json["time"]) + leadIn;
     const T value = ValueTraits<T>::read(json["value"]);
     InterpolaterPtr interpolater;
     if (json.isMember("interp"))
