@@ -1,20 +1,12 @@
+#include "../time/TimeTestSupport.h"
+
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 
 #include <gtest/gtest.h>
 
 using namespace VelaMediaLib;
-
-namespace {
-
-typedef boost::rational<unsigned long> Rate;
-
-struct RateReader : Observer {
-    const ProjectEditRate* rate = nullptr;
-    std::vector<Rate> seen;
-    void update(Observable*) override { seen.push_back(rate->editRate()); }
-};
-
-} // namespace
+using VelaMediaLib::testing::Rate;
+using VelaMediaLib::testing::RateReader;
 
 // Creating a project and setting its rate follow the one rule of every edit
 // rate: a zero numerator gives 0/1 (with the frame and sample rates of a rate

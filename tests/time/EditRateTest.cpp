@@ -8,18 +8,8 @@
 
 using namespace VelaMediaLib;
 using VelaMediaLib::testing::Deadline;
-
-namespace {
-
-typedef boost::rational<unsigned long> Rate;
-
-struct RateReader : Observer {
-    const ProjectEditRate* rate = nullptr;
-    std::vector<Rate> seen;
-    void update(Observable*) override { seen.push_back(rate->editRate()); }
-};
-
-} // namespace
+using VelaMediaLib::testing::Rate;
+using VelaMediaLib::testing::RateReader;
 
 // Every entry point builds a rate alike: reduced, a zero numerator giving 0/1,
 // a zero denominator refused by the rational itself.

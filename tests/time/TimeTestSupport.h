@@ -1,12 +1,16 @@
 #pragma once
-// Helpers for the time and document tests: a small parametric kind, and the
-// deadline for tests that run threads.
+// Helpers for the time and document tests: a small parametric kind, an
+// edit-rate observer, and the deadline for tests that run threads.
 
 #include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/time/parameters/Attributable.h>
 #include <VelaMediaLib/time/parameters/Parametric.h>
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/rational/ProjectEditRate.h>
+#include <VelaMediaLib/time/sync/Observer.h>
+
+#include <vector>
 
 namespace VelaMediaLib {
 namespace testing {
@@ -24,6 +28,15 @@ protected:
         return Parametric::createDefaultParameter(name);
     }
     std::vector<std::string> defaultParameterNames() const override { return {"level", "pan"}; }
+};
+
+typedef boost::rational<unsigned long> Rate;
+
+/// Records the rate it reads each time the edit rate tells it of a change.
+struct RateReader : Observer {
+    const ProjectEditRate* rate = nullptr;
+    std::vector<Rate> seen;
+    void update(Observable*) override { seen.push_back(rate->editRate()); }
 };
 
 } // namespace testing

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/document/format/JSONValues.h> // declares Json::Value
 #include <VelaMediaLib/time/rational/TimeExceptions.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/parameters/KeyFrameInterface.h>
@@ -13,11 +14,6 @@
 #include <functional>
 #include <map>
 #include <vector>
-
-// Documents are read from jsoncpp values; only the library needs their definition.
-namespace Json {
-class Value;
-} // namespace Json
 
 namespace VelaMediaLib {
 
