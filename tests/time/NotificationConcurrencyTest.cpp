@@ -1,5 +1,6 @@
 #include "TimeTestSupport.h"
 
+#include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/AddObserverList.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
@@ -313,4 +314,86 @@ TEST(NotificationConcurrency, AddObserverListsFollowTheSamePolicy) {
     teller.join();
     EXPECT_FALSE(detachedWhileRunning);
     EXPECT_EQ(counted, 1);
+}
+
+namespace {
+
+// Detaches another subject's observer from inside its own call, once that
+// observer is running too.
+struct CrossDetacher : Observer {
+    std::atomic<bool> running{false};
+    CrossDetacher* other = nullptr;
+    Subject* otherSubject = nullptr;
+    void update(Observable*) override {
+        running = true;
+        waitFor(other->running, std::chrono::seconds(5));
+        otherSubject->detach(other);
+    }
+};
+
+} // namespace
+
+// Two observers running on two threads detach each other: neither waits for
+// the other, since each is inside an observer's call.
+TEST(NotificationConcurrency, ObserversDetachingEachOtherDoNotWaitForEachOther) {
+    Deadline deadline(std::chrono::seconds(60));
+    Subject first, second; // no project: nothing else keeps them apart
+    CrossDetacher a, b;
+    a.other = &b;
+    a.otherSubject = &second;
+    b.other = &a;
+    b.otherSubject = &first;
+    first.attach(&a);
+    second.attach(&b);
+    std::thread other([&] { second.notify(); });
+    first.notify();
+    other.join();
+    EXPECT_TRUE(a.running && b.running);
+}
+
+// The edit rate tells its observers under the project's read lock like every
+// subject of the project, so a thread holding the write lock may detach one
+// while another thread sets the rate.
+TEST(NotificationConcurrency, EditRateObserversDetachUnderTheWriteLock) {
+    Deadline deadline(std::chrono::seconds(60));
+    const ProjectPtr project = Project::create(30, 1);
+    struct Reader : Observer {
+        ProjectPtr project;
+        std::atomic<bool> entered{false};
+        void update(Observable*) override {
+            entered = true;
+            ScopedReadLock lock(project->token()); // looks at the model
+        }
+    } reader;
+    reader.project = project;
+    project->attachEditRateObserver(&reader);
+    std::thread setter;
+    {
+        ScopedWriteLock lock(project->token());
+        setter = std::thread([&] { project->setEditRate(boost::rational<unsigned long>(25)); });
+        waitFor(reader.entered, std::chrono::milliseconds(100)); // gives the setter its chance
+        project->detachEditRateObserver(&reader);
+    }
+    setter.join();
+    EXPECT_FALSE(reader.entered) << "told outside the project's lock";
+    EXPECT_EQ(project->editRate(), boost::rational<unsigned long>(25));
+}
+
+// An observer that destroys its subject ends the walk: the observers after it
+// are not told, and nothing freed is touched (AddressSanitizer sees to that).
+TEST(NotificationConcurrency, AnObserverDestroyingItsSubjectEndsTheNotification) {
+    struct Destroyer : Observer {
+        Subject* subject = nullptr;
+        void update(Observable*) override {
+            delete subject;
+            subject = nullptr;
+        }
+    } destroyer;
+    AtomicCounter after;
+    destroyer.subject = new Subject();
+    destroyer.subject->attachWithoutNotifyDelay(&destroyer);
+    destroyer.subject->attachWithoutNotifyDelay(&after);
+    destroyer.subject->notify();
+    EXPECT_EQ(destroyer.subject, nullptr);
+    EXPECT_EQ(after.count.load(), 0);
 }

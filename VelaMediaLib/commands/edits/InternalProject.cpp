@@ -47,6 +47,7 @@ int InternalProject::defaultAudioSampleRate(const boost::rational<unsigned long>
 void InternalProject::init() {
     const boost::weak_ptr<const ThreadSafe> projectToken = token();
     setMetaDataProjectMutex(projectToken); // the one token of the project's own parts
+    editRate_.setProjectMutex(projectToken);
     subject_.setOwner(this);
     sourceBin_.reset(new SourceBin(projectToken));
     timeline_ = Timeline::create(projectToken);

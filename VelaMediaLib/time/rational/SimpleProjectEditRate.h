@@ -30,6 +30,9 @@ public:
     void detachEditRateObserver(Observer* observer) const override { subject_.detach(observer); }
     /// Stores the rate, then notifies every attached observer.
     void setEditRate(const boost::rational<unsigned long>& rate) override;
+    /// The project whose lock and delays its observers are told under, like
+    /// every other subject of that project. Set before the rate is shared.
+    void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) { subject_.setProjectMutex(token); }
 
 private:
     // Numerator and denominator change together: a reader never sees half of

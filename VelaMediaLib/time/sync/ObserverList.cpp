@@ -29,9 +29,51 @@ void removeFrom(std::vector<void*>& list, void* observer) {
     list.erase(std::remove(list.begin(), list.end(), observer), list.end());
 }
 
+// How many observer calls this thread is inside (nested notifications count).
+thread_local int callsOnThisThread = 0;
+
 } // namespace
 
-ObserverList::~ObserverList() { delete lists_.load(std::memory_order_acquire); }
+// Shared by the subject and the walks over it: freed by whichever lets go
+// last, so a walk whose subject an observer destroyed touches nothing freed.
+// Counted under the subject's list mutex.
+struct ObserverList::Lists {
+    std::vector<void*> of[2];
+    std::vector<std::pair<void*, std::thread::id>> calling; // calls running now
+    ListMutex* guard; // the subject's mutex, kept for walks that outlive it
+    int holders = 1;
+    bool gone = false; // the subject was destroyed
+};
+
+ObserverList::~ObserverList() {
+    Lists* lists = lists_.load(std::memory_order_acquire);
+    if (!lists) return;
+    bool last = false;
+    {
+        std::lock_guard<std::mutex> lock(lists->guard->mutex);
+        lists->gone = true;
+        lists->of[Ordinary].clear();
+        lists->of[WithoutDelay].clear();
+        last = --lists->holders == 0;
+    }
+    if (last) delete lists;
+}
+
+ObserverList::Walk::Walk(const ObserverList& list) {
+    std::lock_guard<std::mutex> lock(listMutex(&list).mutex);
+    lists_ = list.lists_.load(std::memory_order_relaxed);
+    if (lists_) ++lists_->holders;
+}
+
+ObserverList::Walk::~Walk() {
+    if (!lists_) return;
+    bool last = false;
+    {
+        std::lock_guard<std::mutex> lock(lists_->guard->mutex);
+        last = --lists_->holders == 0;
+    }
+    if (last) delete lists_;
+}
 
 bool ObserverList::contains(const std::vector<void*>& list, void* observer) {
     return std::find(list.begin(), list.end(), observer) != list.end();
@@ -42,6 +84,7 @@ void ObserverList::add(Kind kind, void* observer) {
     Lists* lists = lists_.load(std::memory_order_relaxed);
     if (!lists) {
         lists = new Lists;
+        lists->guard = &listMutex(this);
         lists_.store(lists, std::memory_order_release);
     }
     removeFrom(lists->of[kind == Ordinary ? WithoutDelay : Ordinary], observer);
@@ -55,7 +98,7 @@ void ObserverList::remove(void* observer, const ReadWriteMutex* projectLock) {
     if (!lists) return;
     removeFrom(lists->of[Ordinary], observer);
     removeFrom(lists->of[WithoutDelay], observer);
-    if (projectLock && projectLock->heldByThisThread()) return;
+    if (callsOnThisThread > 0 || (projectLock && projectLock->heldByThisThread())) return;
     const std::thread::id me = std::this_thread::get_id();
     guard.callEnded.wait(lock, [&] {
         return std::none_of(lists->calling.begin(), lists->calling.end(),
@@ -71,25 +114,28 @@ std::vector<void*> ObserverList::snapshot(Kind kind) const {
     return lists ? lists->of[kind] : std::vector<void*>();
 }
 
-bool ObserverList::beginCall(Kind kind, void* observer) const {
-    std::lock_guard<std::mutex> lock(listMutex(this).mutex);
-    Lists* lists = lists_.load(std::memory_order_relaxed);
-    if (!lists || !contains(lists->of[kind], observer)) return false;
-    lists->calling.emplace_back(observer, std::this_thread::get_id());
+bool ObserverList::Walk::beginCall(Kind kind, void* observer) const {
+    if (!lists_) return false;
+    std::lock_guard<std::mutex> lock(lists_->guard->mutex);
+    if (!contains(lists_->of[kind], observer)) return false;
+    lists_->calling.emplace_back(observer, std::this_thread::get_id());
+    ++callsOnThisThread;
     return true;
 }
 
-void ObserverList::endCall(void* observer) const {
-    ListMutex& guard = listMutex(this);
+bool ObserverList::Walk::endCall(void* observer) const {
+    --callsOnThisThread;
+    bool gone = false;
     {
-        std::lock_guard<std::mutex> lock(guard.mutex);
-        std::vector<std::pair<void*, std::thread::id>>& calling =
-            lists_.load(std::memory_order_relaxed)->calling;
+        std::lock_guard<std::mutex> lock(lists_->guard->mutex);
+        std::vector<std::pair<void*, std::thread::id>>& calling = lists_->calling;
         const auto call =
             std::find(calling.begin(), calling.end(), std::make_pair(observer, std::this_thread::get_id()));
         if (call != calling.end()) calling.erase(call);
+        gone = lists_->gone;
     }
-    guard.callEnded.notify_all();
+    lists_->guard->callEnded.notify_all();
+    return !gone;
 }
 
 } // namespace VelaMediaLib

@@ -23,10 +23,16 @@ class ReadWriteMutex;
 ///   observer throws is dropped (the change has happened), the others still
 ///   hear.
 /// - Detach returns only once the observer's calls on other threads have
-///   ended, except on a thread holding the project's lock (a running observer
-///   may be waiting for that lock; under the write lock none runs, as
-///   observers run under the read lock). An observer detached by itself, or on
-///   the thread that calls it, returns at once.
+///   ended, except on a thread that holds the project's lock (a running
+///   observer may be waiting for that lock; under the write lock none runs,
+///   as observers run under the read lock) and on a thread that is itself
+///   inside an observer's call (two observers detaching each other would
+///   wait for each other). An observer detached by itself, or on the thread
+///   that calls it, returns at once. So a host that destroys an observer
+///   while holding the read lock, or from inside another observer, must not
+///   let it be told on another thread at the same time.
+/// - A subject destroyed by one of its observers ends the walk: the lists
+///   live until the last walk over them lets go.
 ///
 /// The lists are allocated with the first observer: most subjects have none.
 class VELAMEDIALIB_API ObserverList {
@@ -54,8 +60,9 @@ public:
     template <typename Call>
     bool tell(Kind kind, const std::vector<void*>& observers, std::vector<void*>& told, Call call,
               const StillHere* stillHere = nullptr) const {
+        const Walk walk(*this);
         for (void* observer : observers) {
-            if (contains(told, observer) || !beginCall(kind, observer)) continue;
+            if (contains(told, observer) || !walk.beginCall(kind, observer)) continue;
             told.push_back(observer);
             try {
                 call(observer);
@@ -63,21 +70,31 @@ public:
                 // The change has happened: an observer's failure is its own, and
                 // must neither undo the edit's success nor silence the others.
             }
-            if (stillHere && !(*stillHere)()) return false; // the lists went with the owner
-            endCall(observer);
+            const bool ownerGone = stillHere && !(*stillHere)();
+            if (!walk.endCall(observer) || ownerGone) return false; // the subject went
         }
         return true;
     }
 
 private:
-    struct Lists {
-        std::vector<void*> of[2];
-        std::vector<std::pair<void*, std::thread::id>> calling; // calls running now
+    struct Lists;
+    /// Holds the lists alive for one walk, and counts this thread as inside an
+    /// observer's call while it calls one.
+    class VELAMEDIALIB_API Walk {
+    public:
+        explicit Walk(const ObserverList& list);
+        ~Walk();
+        Walk(const Walk&) = delete;
+        Walk& operator=(const Walk&) = delete;
+        /// Whether the observer is still in the list; if so, records its call.
+        bool beginCall(Kind kind, void* observer) const;
+        /// Ends the call; false when the subject was destroyed meanwhile.
+        bool endCall(void* observer) const;
+
+    private:
+        Lists* lists_;
     };
     static bool contains(const std::vector<void*>& list, void* observer);
-    /// Whether the observer is still in the list; if so, records its call.
-    bool beginCall(Kind kind, void* observer) const;
-    void endCall(void* observer) const;
 
     std::atomic<Lists*> lists_{nullptr};
 };

@@ -39,7 +39,7 @@ void SubjectBase::notify() {
     ScopedReadLock lock(token);
     if (!notifiesEnabled() || observers_.empty()) return;
     std::vector<void*> told;
-    tell(ObserverList::WithoutDelay, told, nullptr);
+    if (!tell(ObserverList::WithoutDelay, told, nullptr)) return; // an observer destroyed the subject
     if (observers_.snapshot(ObserverList::Ordinary).empty()) return;
     const boost::shared_ptr<const ThreadSafe> project = token.lock();
     if (project && NotifyDelay::addSubject(this, project)) return;
