@@ -16,6 +16,11 @@ public:
 
     /// The project's lock, or null once the project has gone.
     virtual ReadWriteMutex* mutex() const { return metaDataMutex(); }
+    /// The project's token: the object's one ProjectToken, answered through
+    /// the model's interface.
+    virtual const boost::weak_ptr<const ThreadSafe>& projectMutex() const {
+        return ProjectToken::projectMutex();
+    }
 };
 
 } // namespace VelaMediaLib

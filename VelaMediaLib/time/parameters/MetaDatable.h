@@ -39,7 +39,9 @@ public:
     /// projectMutex()), and the lock it leads to (null once the project has gone).
     const boost::weak_ptr<const ThreadSafe>& metaDataProjectMutex() const { return projectMutex(); }
     ReadWriteMutex* metaDataMutex() const;
-    /// Sets the token of the whole object and of its metadata attributes.
+    /// Sets the token of the whole object and of its metadata attributes, for
+    /// an object being built: parameters and attributes already made keep
+    /// the token they were made with.
     void setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token);
 
     /// Writes the keys as the "metadata" member of the object being written
