@@ -397,3 +397,36 @@ TEST(NotificationConcurrency, AnObserverDestroyingItsSubjectEndsTheNotification)
     EXPECT_EQ(destroyer.subject, nullptr);
     EXPECT_EQ(after.count.load(), 0);
 }
+
+// Inside an observer's call, detaching an observer of another subject still
+// waits for that observer's call on another thread: only a cycle of waits
+// lets a detach return early.
+TEST(NotificationConcurrency, DetachInsideAnObserverStillWaitsOutsideACycle) {
+    Deadline deadline(std::chrono::seconds(60));
+    Subject first, second;
+    std::atomic<bool> slowRunning{false}, release{false}, slowFinished{false};
+    BlockingObserver slow;
+    slow.body = [&](Observable*) {
+        slowRunning = true;
+        waitFor(release, std::chrono::seconds(30));
+        slowFinished = true;
+    };
+    second.attach(&slow);
+    std::thread teller([&] { second.notify(); });
+    ASSERT_TRUE(waitFor(slowRunning, std::chrono::seconds(30)));
+    std::thread releaser([&] {
+        std::this_thread::sleep_for(std::chrono::milliseconds(50));
+        release = true;
+    });
+    bool finishedWhenDetached = false;
+    BlockingObserver detacher;
+    detacher.body = [&](Observable*) {
+        second.detach(&slow);
+        finishedWhenDetached = slowFinished;
+    };
+    first.attach(&detacher);
+    first.notify();
+    teller.join();
+    releaser.join();
+    EXPECT_TRUE(finishedWhenDetached);
+}

@@ -17,7 +17,7 @@ public:
     /// The project's lock, or null once the project has gone.
     virtual ReadWriteMutex* mutex() const { return metaDataMutex(); }
     /// The project's token: the object's one ProjectToken, answered through
-    /// the model's interface.
+    /// the model's interface. Final: the object's parts ask ProjectToken.
     virtual const boost::weak_ptr<const ThreadSafe>& projectMutex() const {
         return ProjectToken::projectMutex();
     }

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <condition_variable>
 #include <cstdint>
+#include <map>
 #include <mutex>
 
 namespace VelaMediaLib {
@@ -29,8 +30,35 @@ void removeFrom(std::vector<void*>& list, void* observer) {
     list.erase(std::remove(list.begin(), list.end(), observer), list.end());
 }
 
-// How many observer calls this thread is inside (nested notifications count).
-thread_local int callsOnThisThread = 0;
+// Which threads each detaching thread waits for, so that a detach that would
+// close a cycle of waits (observers detaching each other) returns instead.
+std::mutex waitsMutex;
+std::map<std::thread::id, std::vector<std::thread::id>> waitsFor;
+
+bool waitsOn(std::thread::id from, std::thread::id target, int depth = 0) {
+    if (from == target) return true;
+    const auto found = waitsFor.find(from);
+    if (found == waitsFor.end() || depth > 64) return false;
+    for (const std::thread::id next : found->second)
+        if (waitsOn(next, target, depth + 1)) return true;
+    return false;
+}
+
+// Registers that this thread is about to wait for the threads; false (and
+// nothing registered) when one of them already waits, directly or not, for it.
+bool registerWait(const std::vector<std::thread::id>& threads) {
+    const std::thread::id me = std::this_thread::get_id();
+    std::lock_guard<std::mutex> lock(waitsMutex);
+    for (const std::thread::id other : threads)
+        if (waitsOn(other, me)) return false;
+    waitsFor[me] = threads;
+    return true;
+}
+
+void endWait() {
+    std::lock_guard<std::mutex> lock(waitsMutex);
+    waitsFor.erase(std::this_thread::get_id());
+}
 
 } // namespace
 
@@ -98,14 +126,25 @@ void ObserverList::remove(void* observer, const ReadWriteMutex* projectLock) {
     if (!lists) return;
     removeFrom(lists->of[Ordinary], observer);
     removeFrom(lists->of[WithoutDelay], observer);
-    if (callsOnThisThread > 0 || (projectLock && projectLock->heldByThisThread())) return;
+    if (projectLock && projectLock->heldByThisThread()) return;
     const std::thread::id me = std::this_thread::get_id();
-    guard.callEnded.wait(lock, [&] {
-        return std::none_of(lists->calling.begin(), lists->calling.end(),
-                            [&](const std::pair<void*, std::thread::id>& call) {
-                                return call.first == observer && call.second != me;
-                            });
-    });
+    const auto callers = [&] {
+        std::vector<std::thread::id> threads;
+        for (const auto& call : lists->calling)
+            if (call.first == observer && call.second != me) threads.push_back(call.second);
+        return threads;
+    };
+    const std::vector<std::thread::id> awaited = callers();
+    if (awaited.empty()) return;
+    ++lists->holders; // the subject may be destroyed while this thread waits
+    lock.unlock();
+    const bool waiting = registerWait(awaited);
+    lock.lock();
+    if (waiting) guard.callEnded.wait(lock, [&] { return lists->gone || callers().empty(); });
+    const bool last = --lists->holders == 0;
+    lock.unlock();
+    if (waiting) endWait();
+    if (last) delete lists;
 }
 
 std::vector<void*> ObserverList::snapshot(Kind kind) const {
@@ -119,23 +158,19 @@ bool ObserverList::Walk::beginCall(Kind kind, void* observer) const {
     std::lock_guard<std::mutex> lock(lists_->guard->mutex);
     if (!contains(lists_->of[kind], observer)) return false;
     lists_->calling.emplace_back(observer, std::this_thread::get_id());
-    ++callsOnThisThread;
     return true;
 }
 
-bool ObserverList::Walk::endCall(void* observer) const {
-    --callsOnThisThread;
-    bool gone = false;
+void ObserverList::Walk::endCall(void* observer) const {
     {
         std::lock_guard<std::mutex> lock(lists_->guard->mutex);
         std::vector<std::pair<void*, std::thread::id>>& calling = lists_->calling;
         const auto call =
             std::find(calling.begin(), calling.end(), std::make_pair(observer, std::this_thread::get_id()));
         if (call != calling.end()) calling.erase(call);
-        gone = lists_->gone;
+        gone_ = lists_->gone;
     }
     lists_->guard->callEnded.notify_all();
-    return !gone;
 }
 
 } // namespace VelaMediaLib

@@ -25,12 +25,10 @@ class ReadWriteMutex;
 /// - Detach returns only once the observer's calls on other threads have
 ///   ended, except on a thread that holds the project's lock (a running
 ///   observer may be waiting for that lock; under the write lock none runs,
-///   as observers run under the read lock) and on a thread that is itself
-///   inside an observer's call (two observers detaching each other would
-///   wait for each other). An observer detached by itself, or on the thread
-///   that calls it, returns at once. So a host that destroys an observer
-///   while holding the read lock, or from inside another observer, must not
-///   let it be told on another thread at the same time.
+///   as observers run under the read lock), and where waiting would close a
+///   cycle of detaching threads waiting for each other (observers detaching
+///   each other): the detach closing it returns at once. An observer detached
+///   by itself, or on the thread that calls it, returns at once.
 /// - A subject destroyed by one of its observers ends the walk: the lists
 ///   live until the last walk over them lets go.
 ///
@@ -61,17 +59,22 @@ public:
     bool tell(Kind kind, const std::vector<void*>& observers, std::vector<void*>& told, Call call,
               const StillHere* stillHere = nullptr) const {
         const Walk walk(*this);
+        told.reserve(told.size() + observers.size());
         for (void* observer : observers) {
             if (contains(told, observer) || !walk.beginCall(kind, observer)) continue;
             told.push_back(observer);
-            try {
-                call(observer);
-            } catch (...) {
-                // The change has happened: an observer's failure is its own, and
-                // must neither undo the edit's success nor silence the others.
+            bool ownerGone = false;
+            {
+                const CallEnd end{walk, observer};
+                try {
+                    call(observer);
+                } catch (...) {
+                    // The change has happened: an observer's failure is its own, and
+                    // must neither undo the edit's success nor silence the others.
+                }
+                ownerGone = stillHere && !(*stillHere)();
             }
-            const bool ownerGone = stillHere && !(*stillHere)();
-            if (!walk.endCall(observer) || ownerGone) return false; // the subject went
+            if (ownerGone || walk.subjectGone()) return false; // the subject went
         }
         return true;
     }
@@ -88,11 +91,19 @@ private:
         Walk& operator=(const Walk&) = delete;
         /// Whether the observer is still in the list; if so, records its call.
         bool beginCall(Kind kind, void* observer) const;
-        /// Ends the call; false when the subject was destroyed meanwhile.
-        bool endCall(void* observer) const;
+        /// Ends the call, noting whether the subject was destroyed meanwhile.
+        void endCall(void* observer) const;
+        bool subjectGone() const { return gone_; }
 
     private:
         Lists* lists_;
+        mutable bool gone_ = false;
+    };
+    /// Ends a call however the observer left it.
+    struct CallEnd {
+        const Walk& walk;
+        void* observer;
+        ~CallEnd() { walk.endCall(observer); }
     };
     static bool contains(const std::vector<void*>& list, void* observer);
 
