@@ -430,3 +430,34 @@ TEST(NotificationConcurrency, DetachInsideAnObserverStillWaitsOutsideACycle) {
     releaser.join();
     EXPECT_TRUE(finishedWhenDetached);
 }
+
+// A detach that waited for a call counts that wait no longer once the call
+// has ended: the thread that ended it, detaching in turn an observer the
+// first thread is still running, waits for it like any other.
+TEST(NotificationConcurrency, AFinishedWaitClosesNoCycle) {
+    Deadline deadline(std::chrono::seconds(60));
+    Subject first, second;
+    std::atomic<bool> xRunning{false}, yFinished{false};
+    BlockingObserver x, y;
+    x.body = [&](Observable*) {
+        xRunning = true;
+        std::this_thread::sleep_for(std::chrono::milliseconds(50)); // the other thread starts waiting
+    };
+    y.body = [&](Observable*) {
+        waitFor(xRunning, std::chrono::seconds(30));
+        second.detach(&x); // waits for x's call on the other thread
+        std::this_thread::sleep_for(std::chrono::milliseconds(50));
+        yFinished = true;
+    };
+    first.attach(&y);
+    second.attach(&x);
+    bool finishedWhenDetached = false;
+    std::thread other([&] {
+        second.notify();
+        first.detach(&y);
+        finishedWhenDetached = yFinished;
+    });
+    first.notify();
+    other.join();
+    EXPECT_TRUE(finishedWhenDetached);
+}

@@ -18,7 +18,7 @@ public:
     virtual ReadWriteMutex* mutex() const { return metaDataMutex(); }
     /// The project's token: the object's one ProjectToken, answered through
     /// the model's interface. Final: the object's parts ask ProjectToken.
-    virtual const boost::weak_ptr<const ThreadSafe>& projectMutex() const {
+    virtual const boost::weak_ptr<const ThreadSafe>& projectMutex() const final {
         return ProjectToken::projectMutex();
     }
 };

@@ -30,34 +30,63 @@ void removeFrom(std::vector<void*>& list, void* observer) {
     list.erase(std::remove(list.begin(), list.end(), observer), list.end());
 }
 
-// Which threads each detaching thread waits for, so that a detach that would
-// close a cycle of waits (observers detaching each other) returns instead.
+// Which calls each detaching thread waits for: a detach whose wait would
+// close a cycle of threads waiting for each other (observers detaching each
+// other) does not wait for that call. An entry leaves when its call ends, so
+// no finished call counts. Taken after a list mutex, never before one.
+struct AwaitedCall {
+    std::thread::id thread;
+    const void* observer;
+};
 std::mutex waitsMutex;
-std::map<std::thread::id, std::vector<std::thread::id>> waitsFor;
+std::map<std::thread::id, std::vector<AwaitedCall>> waitsFor;
+std::atomic<int> waitingThreads{0};
 
 bool waitsOn(std::thread::id from, std::thread::id target, int depth = 0) {
     if (from == target) return true;
     const auto found = waitsFor.find(from);
     if (found == waitsFor.end() || depth > 64) return false;
-    for (const std::thread::id next : found->second)
-        if (waitsOn(next, target, depth + 1)) return true;
+    for (const AwaitedCall& call : found->second)
+        if (waitsOn(call.thread, target, depth + 1)) return true;
     return false;
 }
 
-// Registers that this thread is about to wait for the threads; false (and
-// nothing registered) when one of them already waits, directly or not, for it.
-bool registerWait(const std::vector<std::thread::id>& threads) {
+// Of the calls, the threads this thread may wait for (those not waiting,
+// directly or not, for it), registered as awaited.
+std::vector<std::thread::id> registerWait(const std::vector<AwaitedCall>& calls) {
     const std::thread::id me = std::this_thread::get_id();
+    std::vector<AwaitedCall> kept;
+    std::vector<std::thread::id> threads;
     std::lock_guard<std::mutex> lock(waitsMutex);
-    for (const std::thread::id other : threads)
-        if (waitsOn(other, me)) return false;
-    waitsFor[me] = threads;
-    return true;
+    for (const AwaitedCall& call : calls)
+        if (!waitsOn(call.thread, me)) {
+            kept.push_back(call);
+            threads.push_back(call.thread);
+        }
+    if (!kept.empty()) {
+        waitsFor[me] = kept;
+        ++waitingThreads;
+    }
+    return threads;
 }
 
 void endWait() {
     std::lock_guard<std::mutex> lock(waitsMutex);
-    waitsFor.erase(std::this_thread::get_id());
+    if (waitsFor.erase(std::this_thread::get_id())) --waitingThreads;
+}
+
+// The call has ended: no one waits for it any longer.
+void forgetAwaitedCall(const void* observer) {
+    if (waitingThreads.load() == 0) return;
+    const std::thread::id me = std::this_thread::get_id();
+    std::lock_guard<std::mutex> lock(waitsMutex);
+    for (auto& waiter : waitsFor) {
+        std::vector<AwaitedCall>& calls = waiter.second;
+        const auto call = std::find_if(calls.begin(), calls.end(), [&](const AwaitedCall& each) {
+            return each.thread == me && each.observer == observer;
+        });
+        if (call != calls.end()) calls.erase(call);
+    }
 }
 
 } // namespace
@@ -128,22 +157,23 @@ void ObserverList::remove(void* observer, const ReadWriteMutex* projectLock) {
     removeFrom(lists->of[WithoutDelay], observer);
     if (projectLock && projectLock->heldByThisThread()) return;
     const std::thread::id me = std::this_thread::get_id();
-    const auto callers = [&] {
-        std::vector<std::thread::id> threads;
-        for (const auto& call : lists->calling)
-            if (call.first == observer && call.second != me) threads.push_back(call.second);
-        return threads;
-    };
-    const std::vector<std::thread::id> awaited = callers();
-    if (awaited.empty()) return;
-    ++lists->holders; // the subject may be destroyed while this thread waits
-    lock.unlock();
-    const bool waiting = registerWait(awaited);
-    lock.lock();
-    if (waiting) guard.callEnded.wait(lock, [&] { return lists->gone || callers().empty(); });
+    std::vector<AwaitedCall> calls;
+    for (const auto& call : lists->calling)
+        if (call.first == observer && call.second != me) calls.push_back(AwaitedCall{call.second, observer});
+    if (calls.empty()) return;
+    const std::vector<std::thread::id> awaited = registerWait(calls);
+    if (awaited.empty()) return; // every caller waits for this thread
+    ++lists->holders;            // the subject may be destroyed meanwhile
+    guard.callEnded.wait(lock, [&] {
+        return std::none_of(lists->calling.begin(), lists->calling.end(),
+                            [&](const std::pair<void*, std::thread::id>& call) {
+                                return call.first == observer && std::find(awaited.begin(), awaited.end(),
+                                                                           call.second) != awaited.end();
+                            });
+    });
     const bool last = --lists->holders == 0;
     lock.unlock();
-    if (waiting) endWait();
+    endWait();
     if (last) delete lists;
 }
 
@@ -171,6 +201,7 @@ void ObserverList::Walk::endCall(void* observer) const {
         gone_ = lists_->gone;
     }
     lists_->guard->callEnded.notify_all();
+    forgetAwaitedCall(observer);
 }
 
 } // namespace VelaMediaLib
