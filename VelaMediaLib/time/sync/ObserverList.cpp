@@ -36,18 +36,28 @@ void removeFrom(std::vector<void*>& list, void* observer) {
 // no finished call counts. Taken after a list mutex, never before one.
 struct AwaitedCall {
     std::thread::id thread;
+    const void* lists; // the subject's lists the call walks
     const void* observer;
 };
 std::mutex waitsMutex;
 std::map<std::thread::id, std::vector<AwaitedCall>> waitsFor;
 std::atomic<int> waitingThreads{0};
 
-bool waitsOn(std::thread::id from, std::thread::id target, int depth = 0) {
-    if (from == target) return true;
-    const auto found = waitsFor.find(from);
-    if (found == waitsFor.end() || depth > 64) return false;
-    for (const AwaitedCall& call : found->second)
-        if (waitsOn(call.thread, target, depth + 1)) return true;
+// Whether `from` waits, directly or through other waiting threads, for
+// `target`. The table holds no cycle (none is ever registered), so the walk
+// ends; each thread is visited once.
+bool waitsOn(std::thread::id from, std::thread::id target) {
+    std::vector<std::thread::id> pending{from}, seen;
+    while (!pending.empty()) {
+        const std::thread::id next = pending.back();
+        pending.pop_back();
+        if (next == target) return true;
+        if (std::find(seen.begin(), seen.end(), next) != seen.end()) continue;
+        seen.push_back(next);
+        const auto found = waitsFor.find(next);
+        if (found != waitsFor.end())
+            for (const AwaitedCall& call : found->second) pending.push_back(call.thread);
+    }
     return false;
 }
 
@@ -76,14 +86,14 @@ void endWait() {
 }
 
 // The call has ended: no one waits for it any longer.
-void forgetAwaitedCall(const void* observer) {
+void forgetAwaitedCall(const void* lists, const void* observer) {
     if (waitingThreads.load() == 0) return;
     const std::thread::id me = std::this_thread::get_id();
     std::lock_guard<std::mutex> lock(waitsMutex);
     for (auto& waiter : waitsFor) {
         std::vector<AwaitedCall>& calls = waiter.second;
         const auto call = std::find_if(calls.begin(), calls.end(), [&](const AwaitedCall& each) {
-            return each.thread == me && each.observer == observer;
+            return each.thread == me && each.lists == lists && each.observer == observer;
         });
         if (call != calls.end()) calls.erase(call);
     }
@@ -153,16 +163,17 @@ void ObserverList::remove(void* observer, const ReadWriteMutex* projectLock) {
     std::unique_lock<std::mutex> lock(guard.mutex);
     Lists* lists = lists_.load(std::memory_order_relaxed);
     if (!lists) return;
+    const std::thread::id me = std::this_thread::get_id();
+    std::vector<AwaitedCall> calls; // collected first: nothing below the removal allocates
+    if (!(projectLock && projectLock->heldByThisThread()))
+        for (const auto& call : lists->calling)
+            if (call.first == observer && call.second != me)
+                calls.push_back(AwaitedCall{call.second, lists, observer});
+    const std::vector<std::thread::id> awaited =
+        calls.empty() ? std::vector<std::thread::id>() : registerWait(calls);
     removeFrom(lists->of[Ordinary], observer);
     removeFrom(lists->of[WithoutDelay], observer);
-    if (projectLock && projectLock->heldByThisThread()) return;
-    const std::thread::id me = std::this_thread::get_id();
-    std::vector<AwaitedCall> calls;
-    for (const auto& call : lists->calling)
-        if (call.first == observer && call.second != me) calls.push_back(AwaitedCall{call.second, observer});
-    if (calls.empty()) return;
-    const std::vector<std::thread::id> awaited = registerWait(calls);
-    if (awaited.empty()) return; // every caller waits for this thread
+    if (awaited.empty()) return; // nothing runs it elsewhere, or every caller waits for this thread
     ++lists->holders;            // the subject may be destroyed meanwhile
     guard.callEnded.wait(lock, [&] {
         return std::none_of(lists->calling.begin(), lists->calling.end(),
@@ -201,7 +212,7 @@ void ObserverList::Walk::endCall(void* observer) const {
         gone_ = lists_->gone;
     }
     lists_->guard->callEnded.notify_all();
-    forgetAwaitedCall(observer);
+    forgetAwaitedCall(lists_, observer);
 }
 
 } // namespace VelaMediaLib
