@@ -133,6 +133,11 @@ TEST_F(MediaTiming, UnboundedLimitsExtendWithoutLimit) {
 TEST_F(MediaTiming, TransitionsKeepOneTickLessOnTheTemporalEditor) {
     auto temporal = clip(timing(0, 100, 0, 100, 1, 0, 1000));
     auto fixed = ColorMedia::create(project, rate, 0, 100);
+    // Without transitions the limit is the clip itself.
+    EXPECT_FALSE(fixed->validTrimEnd(100));
+    EXPECT_TRUE(fixed->validTrimEnd(99));
+    EXPECT_FALSE(temporal->validTrimEnd(101));
+    EXPECT_FALSE(temporal->validTrimStart(101));
     for (const boost::shared_ptr<Media>& media :
          {boost::shared_ptr<Media>(temporal), boost::shared_ptr<Media>(fixed)}) {
         media->setLeftTransition(TransitionPtr(new Transition("fade", 20)));

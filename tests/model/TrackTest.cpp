@@ -123,6 +123,11 @@ TEST_F(TrackTest, SoloDecidesOverMuteAndHide) {
     EXPECT_TRUE(tracks[0]->isVisible());
     EXPECT_FALSE(tracks[1]->isVisible());
     EXPECT_TRUE(tracks[2]->isRenderable());
+    EXPECT_TRUE(tracks[0]->isRenderable()); // muted, still seen
+    EXPECT_TRUE(tracks[1]->isRenderable()); // hidden, still heard
+    tracks[1]->audioMutedAttribute()->setValue(true);
+    EXPECT_TRUE(tracks[1]->isDisabled()); // neither
+    tracks[1]->audioMutedAttribute()->setValue(false);
     tracks[0]->soloAttribute()->setValue(true);
     EXPECT_TRUE(mixer->isInSoloMode());
     EXPECT_TRUE(tracks[0]->isAudible()); // solo overrides its mute

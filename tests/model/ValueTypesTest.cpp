@@ -1,10 +1,54 @@
+#include <VelaMediaLib/base/AudioPosition.h>
+#include <VelaMediaLib/base/CaptionData.h>
+#include <VelaMediaLib/base/KeystrokeData.h>
+#include <VelaMediaLib/base/Rect.h>
+#include <VelaMediaLib/base/TemplatedColor.h>
 #include <VelaMediaLib/base/TextAttributeList.h>
 #include <VelaMediaLib/base/TransformMatrix.h>
+#include <VelaMediaLib/time/rational/ScaledTimeRange.h>
 
 #include <cmath>
 #include <gtest/gtest.h>
 
 using namespace VelaMediaLib;
+
+namespace {
+
+// A value equals itself and differs from each value that changes one member.
+template <typename T>
+void expectEachMemberCounts(const T& value, const std::vector<T>& oneMemberChanged) {
+    EXPECT_TRUE(value == value);
+    EXPECT_FALSE(value != value);
+    for (const T& other : oneMemberChanged) {
+        EXPECT_FALSE(value == other) << other;
+        EXPECT_TRUE(value != other) << other;
+    }
+}
+
+} // namespace
+
+TEST(ValueTypes, EveryMemberTakesPartInEquality) {
+    expectEachMemberCounts(Rect<float>(1, 2, 3, 4), {{9, 2, 3, 4}, {1, 9, 3, 4}, {1, 2, 9, 4}, {1, 2, 3, 9}});
+    expectEachMemberCounts(TemplatedColor<int>(1, 2, 3, 4),
+                           {{9, 2, 3, 4}, {1, 9, 3, 4}, {1, 2, 9, 4}, {1, 2, 3, 9}});
+    expectEachMemberCounts(Point3d(1, 2, 3), {{9, 2, 3}, {1, 9, 3}, {1, 2, 9}});
+    expectEachMemberCounts(AudioPosition(0.5, 0.25), {{0.1, 0.25}, {0.5, 0.1}});
+    expectEachMemberCounts(CaptionData("hi", "en"), {{"ho", "en"}, {"hi", "fr"}});
+    expectEachMemberCounts(KeystrokeData("k", 1), {{"j", 1}, {"k", 2}});
+    TransformMatrix::Elements elements{};
+    std::vector<TransformMatrix> changed;
+    for (size_t i = 0; i < elements.size(); ++i) {
+        TransformMatrix::Elements one = elements;
+        one[i] = 1;
+        changed.emplace_back(one);
+    }
+    expectEachMemberCounts(TransformMatrix(elements), changed);
+    const ScaledTimeRange range(30, 10, 5);
+    EXPECT_TRUE(range == ScaledTimeRange(30, 10, 5));
+    EXPECT_FALSE(range != ScaledTimeRange(30, 10, 5));
+    EXPECT_TRUE(range != ScaledTimeRange(30, 11, 5));
+    EXPECT_TRUE(range != ScaledTimeRange(30, 10, 6));
+}
 
 TEST(TransformMatrix, ComposesRightToLeft) {
     EXPECT_EQ(TransformMatrix() * TransformMatrix::scaling(2, 3, 4), TransformMatrix::scaling(2, 3, 4));
