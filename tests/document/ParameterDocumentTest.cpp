@@ -108,6 +108,15 @@ TEST(ParameterDocument, ReadingKeyFramesFollowsItsSteps) {
     parameter->readFromJSON(VelaMediaLib::testing::parseJson("2.5"));
     EXPECT_EQ(*parameter->keyframeTimes(), std::vector<RationalTime>{RationalTime(0)});
     EXPECT_EQ(parameter->valueAtTime(RationalTime(9)), 2.5);
+
+    // An object without "keyframes" leaves the curve and reads the rest.
+    EXPECT_FALSE(parameter->hasValueBounds());
+    EXPECT_FALSE(parameter->hasUIHints());
+    parameter->readFromJSON(VelaMediaLib::testing::parseJson(
+        R"({"type": "double", "uiHints": {"userInterfaceType": "slider", "unitType": "percent"}})"));
+    EXPECT_EQ(parameter->valueAtTime(RationalTime(9)), 2.5);
+    EXPECT_TRUE(parameter->hasUIHints());
+    EXPECT_FALSE(parameter->hasValueBounds());
 }
 
 TEST(ParameterDocument, AFailedReadChangesNothing) {
@@ -285,4 +294,9 @@ TEST(ParameterDocument, ADiffParameterWritesOnlyItsDifference) {
     auto read = DiffParameter<double>::create(project, "d", source);
     read->readFromJSON(json);
     EXPECT_TRUE(*read == *diff);
+    for (const char* edit : {R"({"value": 1})", R"({"time": 1})", "1"}) {
+        const std::string text = std::string(R"({"edits": [)") + edit + "]}";
+        EXPECT_THROW(read->readFromJSON(VelaMediaLib::testing::parseJson(text)), ParserException) << text;
+    }
+    EXPECT_TRUE(*read == *diff); // a refused read changes nothing
 }

@@ -157,6 +157,8 @@ TEST_F(TrackTest, MixerIndexRulesAndPuttingATrackBack) {
     mixer->addTrack(c, 0);
     EXPECT_EQ(mixer->tracks(), (std::vector<TrackPtr>{c, a, b}));
     EXPECT_TRUE(Mixer::sortTracksByIndex(c, b));
+    EXPECT_FALSE(Mixer::sortTracksByIndex(b, c));
+    EXPECT_FALSE(Mixer::sortTracksByIndex(b, b)); // a strict order
     const RemoveTrackInfo info = mixer->removeTrackImpl(a);
     EXPECT_EQ(info.index, 1);
     EXPECT_FALSE(a->parentMixer());

@@ -118,6 +118,8 @@ TEST(BezierInterpolater, FollowsTheCurveAndSurvivesItsName) {
     EXPECT_EQ(parsed->asJson(), "\"bezr(esIn;0.0,8.0,0.0;8.0,8.5,-1.0)\"");
     EXPECT_EQ(InterpolaterFactory<Point3d>::byName("bezr(esIn;0.0,8.0,0.0;8.0,8.5,-1.0)")->asJson(),
               parsed->asJson());
-    EXPECT_FALSE(BezierInterpolater::fromName("bezr(linr;1,2;3,4,5)"));
+    for (const char* malformed : {"bezr(linr;1,2;3,4,5)", "bezr(linr;1,x,2;3,4,5)", "bezr(linr;1,2,3;3,4,5,)",
+                                  "bezr(linr;1,2,3 ;3,4,5)", "bezr(linr;1,2,3)", "bezr(linr;1,2,3;3,4,5"})
+        EXPECT_FALSE(BezierInterpolater::fromName(malformed)) << malformed;
     EXPECT_THROW(BezierInterpolater(Point3d(), Point3d(), "what"), ParserException);
 }

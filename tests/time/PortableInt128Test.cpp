@@ -38,6 +38,10 @@ TEST(PortableInt128, AgreesWithTheBuiltInTypeOnProductsOfTwo64BitValues) {
         EXPECT_EQ(p < q, n < m);
         EXPECT_EQ(p > q, n > m);
         EXPECT_EQ(p == q, n == m);
+        EXPECT_EQ(p != q, n != m);
+        EXPECT_EQ(p <= q, n <= m);
+        EXPECT_EQ(p >= q, n >= m);
+        EXPECT_TRUE(p <= p && p >= p && !(p < p) && !(p > p) && !(p != p)); // equal values
         EXPECT_EQ((long long)(p + q - q), (long long)(n + m - m));
     }
 }
