@@ -125,3 +125,20 @@ TEST_F(TimingCommands, UndoingAnAddGivesTheClipBackItsEarlierState) {
     project->redo();
     EXPECT_EQ(loose->startTime(), 50);
 }
+
+// Two moves of one clip fold into one move by their sum, which undoes to the
+// state before the first; a move of another clip does not fold into a move.
+TEST_F(TimingCommands, TwoMovesOfOneClipCombineIntoOneMoveByTheirSum) {
+    const MediaPtr a = place(0, 10), b = place(50, 10);
+    const auto first = MoveCmd::create(track, a, 5), second = MoveCmd::create(track, a, 7);
+    ASSERT_TRUE(project->execute(first));
+    ASSERT_TRUE(project->execute(second));
+    const auto both = boost::dynamic_pointer_cast<MoveCmd>(first->combine(second));
+    ASSERT_TRUE(both);
+    CommandHandler& handler = project->edgeModCommandHandler();
+    EXPECT_TRUE(both->unexecute(&handler));
+    EXPECT_EQ(a->startTime(), 0);
+    EXPECT_TRUE(both->execute(&handler));
+    EXPECT_EQ(a->startTime(), 12);
+    EXPECT_FALSE(boost::dynamic_pointer_cast<MoveCmd>(first->combine(MoveCmd::create(track, b, 1))));
+}

@@ -75,6 +75,7 @@ TEST_F(MediaContent, TransformsComposeTheParametersAtParametricTime) {
         Point3d(0, 0, 7));
     const auto scaleAndRotation = media->mediaToModelScaleAndRotation(RationalTime(100));
     EXPECT_EQ(scaleAndRotation.first, Point3d(2, 2, 1));
+    EXPECT_EQ(scaleAndRotation.second, Point3d(0, 0, M_PI / 2));
     media->geometryCropParam()->setDefaultValue(Rect<float>(1, 2, 3, 4));
     EXPECT_EQ(media->geometryCropRectAtTime(RationalTime(0)), Rect<float>(1, 2, 3, 4));
     EXPECT_EQ(media->sourceCropRectAtTime(RationalTime(0)), Rect<float>(0, 0, 0, 0));

@@ -325,6 +325,8 @@ TEST_F(MediaTiming, DefaultStateKeepsTheDurationRule) {
     longer->trimStart(10);
     EXPECT_EQ(longer->defaultState().trackRange(), Range<VelaTime>(10, 50));
     EXPECT_EQ(longer->defaultState().scalar, SafeRational(1));
+    EXPECT_EQ(longer->defaultState().mediaStart, SafeRational(0)); // all the media again
+    EXPECT_EQ(longer->defaultState().mediaDuration, SafeRational(50));
 }
 
 TEST_F(MediaTiming, AnEditorsStretchCanBeReplacedByAKind) {

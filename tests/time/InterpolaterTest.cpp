@@ -52,8 +52,17 @@ TEST(Interpolater, SpringSettlesOnTheValueAfterOvershooting) {
     for (const double damping : {20.0, 40.0}) {
         const SpringInterpolater<double> spring2(damping, 100.0);
         EXPECT_DOUBLE_EQ(spring2.ease(1.0), 1.0);
+        double previous = 0.0;
+        for (double u = 0.05; u <= 1.0; u += 0.05) {
+            EXPECT_GE(spring2.ease(u), previous) << damping << " at " << u; // rises
+            previous = spring2.ease(u);
+        }
         EXPECT_LT(spring2.ease(0.5), 1.0);
     }
+    // By hand: critical r(0.1) = 1 - e^-1 (1 + 1); overdamped (half 20, root of 300)
+    // r(0.1) = 1 - (fast e^(-slow 0.1) - slow e^(-fast 0.1)) / (fast - slow).
+    EXPECT_NEAR(SpringResponse(20.0, 100.0).response(0.1), 0.264241, 1e-6);
+    EXPECT_NEAR(SpringResponse(40.0, 100.0).response(0.1), 0.177737, 1e-6);
     EXPECT_THROW(SpringInterpolater<double>(0.0, 100.0), VelaMediaLibException);
     EXPECT_THROW(SpringInterpolater<double>(10.0, -1.0), VelaMediaLibException);
 }
