@@ -85,7 +85,16 @@ TEST_F(MediaContent, EffectsKeepTheirOrder) {
     media->addEffect(boost::make_shared<NamedEffect>("blur"));
     media->addEffect(boost::make_shared<NamedEffect>("tint"));
     media->insertEffect(boost::make_shared<NamedEffect>("blur"), 1);
+    struct Counter : Observer {
+        int heard = 0;
+        void update(Observable*) override { ++heard; }
+    } counter;
+    media->attach(&counter);
+    media->swapEffectOrder(1, 1); // changes nothing: tells nobody
+    EXPECT_EQ(counter.heard, 0);
     media->swapEffectOrder(0, 2);
+    EXPECT_EQ(counter.heard, 1);
+    media->detach(&counter);
     EXPECT_EQ(media->effectAtIndex(0)->effectName(), "tint");
     EXPECT_EQ(media->effectsWithName("blur").size(), 2u);
     EXPECT_EQ(std::distance(media->effectBegin(), media->effectEnd()), 3);
@@ -121,6 +130,10 @@ TEST_F(MediaContent, AudioFadesAreEdgeModifications) {
     EXPECT_EQ(audio->volume()->valueAtTime(RationalTime(0)), 1.0);
     EXPECT_EQ(audio->gain()->value(), 1.0);
     EXPECT_FALSE(audio->mixToMono()->value());
+    EXPECT_FALSE(audio->hasCaptions());
+    audio->setCaptions({CaptionData("hello", "en")});
+    EXPECT_TRUE(audio->hasCaptions());
+    EXPECT_EQ(audio->captions(), std::vector<CaptionData>{CaptionData("hello", "en")});
     audio->mixToMono()->setValue(true);
     EXPECT_TRUE(audio->attributeValue("mixToMono", false));
 }

@@ -305,6 +305,7 @@ TEST_F(MediaTiming, RestoreRefusesWhatConstructionRefuses) {
     bad.duration = 1;
     expectRefusedState(bad, "restored scalar is not greater than 0");
     EXPECT_THROW(clip(timing(0, 10, 0, 0, 1, 0, 10)), ValueException<double>);
+    EXPECT_THROW(clip(timing(0, 10, 0, 10, 0, 0, 10)), ValueException<double>); // scalar 0
 }
 
 TEST_F(MediaTiming, StretchPreviewsRefuseWhatTheStretchRefuses) {

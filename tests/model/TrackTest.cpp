@@ -75,6 +75,9 @@ TEST_F(TrackTest, MediaAtTimeGivesTheClipOrBothTouchingClips) {
     EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::vector<MediaPtr>{first, third}),
               std::vector<MediaPtr>{second});
     EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::set<MediaPtr>{second}).size(), 2u);
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(20, 10)),
+              std::vector<MediaPtr>()); // touching only
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(19, 11)), (std::vector<MediaPtr>{second}));
     const auto parts = track->subSection(Range<VelaTime>(5, 27));
     ASSERT_EQ(parts.size(), 3u);
     EXPECT_EQ(parts[0].range, Range<VelaTime>(5, 5));
@@ -242,15 +245,21 @@ TEST_F(TrackTest, AMixerBelongsToATimelineOrAGroupNeverBoth) {
 }
 
 TEST_F(TrackTest, CopiesAndLocks) {
-    const MediaPtr first = placed(0, 10), second = placed(10, 10);
+    const MediaPtr first = placed(2, 10), second = placed(12, 10);
     track->setIsLocked(true);
     track->magneticAttribute()->setValue(true);
     std::map<MediaPtr, MediaPtr> copied;
-    const TrackPtr portion = track->copyPortion(Range<VelaTime>(5, 10), &copied);
+    const TrackPtr portion = track->copyPortion(Range<VelaTime>(5, 10), &copied); // ticks [5, 15)
     ASSERT_EQ(portion->numMedias(), 2u);
-    EXPECT_EQ(copied[first]->trackRange(), Range<VelaTime>(0, 5));
-    EXPECT_EQ(copied[second]->trackRange(), Range<VelaTime>(5, 5));
+    EXPECT_EQ(copied[first]->trackRange(), Range<VelaTime>(0, 7));
+    EXPECT_EQ(copied[first]->rationalMediaRange().start(), SafeRational(3));
+    EXPECT_EQ(copied[second]->trackRange(), Range<VelaTime>(7, 3));
     EXPECT_EQ(copied[second]->rationalMediaRange().start(), SafeRational(0));
+    copied.clear();
+    const TrackPtr spaced = track->copyPortion(std::vector<MediaPtr>{second, first}, &copied);
+    ASSERT_EQ(spaced->numMedias(), 2u);
+    EXPECT_EQ(copied[first]->trackRange(), Range<VelaTime>(0, 10)); // spacing kept from the earliest
+    EXPECT_EQ(copied[second]->trackRange(), Range<VelaTime>(10, 10));
     EXPECT_TRUE(portion->isLocked());
     EXPECT_TRUE(portion->attributeValue("magnetic", false));
     EXPECT_EQ(first->duration(), 10);
@@ -279,6 +288,15 @@ TEST_F(TrackTest, TransitionsAreJoinedAgainWhenTouchingClipsMeet) {
 TEST(TimelineCamera, RightAndLeftHandedTransforms) {
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const auto timeline = Timeline::create(project, 1920, 1080);
+    EXPECT_EQ(timeline->eyeLookAtPositionParam()->valueAtTime(RationalTime(0)), Point3d(0, 0, 0));
+    EXPECT_EQ(timeline->eyeUpVectorParam()->valueAtTime(RationalTime(0)), Point3d(0, 1, 0));
+    EXPECT_EQ(timeline->fovParam()->valueAtTime(RationalTime(0)), 45.0);
+    EXPECT_EQ(timeline->farClipDistanceParam()->valueAtTime(RationalTime(0)), 100000.0);
+    EXPECT_EQ(timeline->newTrack()->volume()->valueAtTime(RationalTime(0)), 1.0);
+    const auto track = timeline->newTrack();
+    timeline->addTrack(timeline->newMixer("main"), track);
+    track->addMedia(PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 10), 0);
+    EXPECT_EQ(timeline->swapSourceForTimelineMedias(nullptr, nullptr), 0u); // no clip has a source
     timeline->eyePositionParam()->setDefaultValue(Point3d(0, 0, 10));
     const Point3d origin = timeline->cameraTransformAtTime(RationalTime(0)).apply(Point3d(0, 0, 0));
     EXPECT_NEAR(origin.z, -10.0, 1e-12);
