@@ -117,8 +117,8 @@ TEST(BezierInterpolater, FollowsTheCurveAndSurvivesItsName) {
         straight.interpolate(Point3d(0, 0, 0), Point3d(30, 0, 0), RationalTime(0), RationalTime(2), 1.0);
     EXPECT_NEAR(middle.x, 15.0, 1e-12);
     // A bent curve at s = 0.5: (a + 3 cp1 + 3 cp2 + b) / 8.
-    const BezierInterpolater bent(Point3d(0, 8, 0), Point3d(8, 8, 0), "linr");
-    EXPECT_EQ(bent.pointAt(Point3d(0, 0, 0), Point3d(8, 0, 0), 0.5), Point3d(4, 6, 0));
+    const BezierInterpolater bent(Point3d(0, 8, 4), Point3d(8, 8, 4), "linr");
+    EXPECT_EQ(bent.pointAt(Point3d(0, 0, 0), Point3d(8, 0, 0), 0.5), Point3d(4, 6, 3));
 
     const auto parsed = BezierInterpolater::fromName("bezr(esIn;0,8,0;8,8.5,-1)");
     ASSERT_TRUE(parsed);
