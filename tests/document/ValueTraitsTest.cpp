@@ -161,6 +161,11 @@ TEST(ValueTraits, SimilarityHasEachMembersTolerance) {
     EXPECT_TRUE(ValueTraits<Rect<float>>::similar(Rect<float>(1, 1, 1, 1), Rect<float>(1, 1, 1, 1.0000005f)));
     EXPECT_FALSE(ValueTraits<Point3d>::similar(Point3d(1, 1, 1), Point3d(1, 1, 1.000001)));
     EXPECT_FALSE(ValueTraits<int>::similar(1000000, 1000001));
+    EXPECT_TRUE(ValueTraits<double>::similar(0.0, 1e-9)); // the tolerance itself is within it
+    TransformMatrix::Elements elements{};
+    elements[15] = 1e-3;
+    EXPECT_FALSE(ValueTraits<TransformMatrix>::similar(TransformMatrix(), TransformMatrix(elements)));
+    EXPECT_TRUE(ValueTraits<TransformMatrix>::similar(TransformMatrix(), TransformMatrix()));
     // Interpolaters are the same when they move values alike, as two Bézier instances of one curve do.
     const auto curve = InterpolaterFactory<Point3d>::byName("bezr(linr;0,0,0;1,1,1)");
     EXPECT_NE(curve, InterpolaterFactory<Point3d>::byName("bezr(linr;0,0,0;1,1,1)"));

@@ -26,6 +26,10 @@ TEST(Interpolater, TweenedKindsAgainstHandComputedValues) {
     EXPECT_DOUBLE_EQ(tween<LeftInterpolater<double>>(1.999), 10.0);
     EXPECT_DOUBLE_EQ(EaseInInterpolater<double>::getInstance()->exponent(), 2.0);
     EXPECT_DOUBLE_EQ(EaseOutInterpolater<double>::getInstance()->exponent(), 0.5);
+    // A curve does what it does; another curve does not.
+    const auto easeIn = EaseInInterpolater<double>::getInstance();
+    EXPECT_TRUE(easeIn->sameAs(*easeIn));
+    EXPECT_FALSE(easeIn->sameAs(*EaseOutInterpolater<double>::getInstance()));
 }
 
 TEST(Interpolater, BounceEndsOnTheValueAndBouncesOnTheWay) {

@@ -15,10 +15,13 @@ VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_CHECK_VALUE_TRAITS)
 namespace {
 
 // Arrays of numbers: [a, b, c].
-template <typename Number, size_t N>
-void writeNumbers(std::ostream& out, const Number (&values)[N]) {
-    out << "[";
-    for (size_t i = 0; i < N; ++i) out << (i ? ", " : "") << formatDouble(values[i]);
+template <typename Numbers>
+void writeNumbers(std::ostream& out, const Numbers& values) {
+    const char* separator = "[";
+    for (const double value : values) {
+        out << separator << formatDouble(value);
+        separator = ", ";
+    }
     out << "]";
 }
 
@@ -53,9 +56,7 @@ Point3d ValueTraits<Point3d>::read(const Json::Value& json) {
 }
 
 void ValueTraits<TransformMatrix>::write(XMLOptions& options, int, const TransformMatrix& m) {
-    double values[16];
-    for (int i = 0; i < 16; ++i) values[i] = m.elements()[i];
-    writeNumbers(options.stream(), values);
+    writeNumbers(options.stream(), m.elements());
 }
 TransformMatrix ValueTraits<TransformMatrix>::read(const Json::Value& json) {
     jsonArrayOf(json, 16, "a matrix of 16 numbers");
