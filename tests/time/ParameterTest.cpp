@@ -153,6 +153,21 @@ TEST_F(ParameterTest, CopyPortionCutsTheCurveAtTheRangeEdges) {
                   ->copyPortion(Range<RationalTime>(RationalTime(7), RationalTime(1)))
                   ->numKeyFrames(),
               1u);
+    // An empty range copies the value there alone.
+    const auto empty = parameter->copyPortion(Range<RationalTime>(RationalTime(4), RationalTime(0)));
+    EXPECT_EQ(*empty->keyframeTimes(), std::vector<RationalTime>{RationalTime(0)});
+    EXPECT_EQ(empty->valueAtTime(RationalTime(0)), 4.0);
+}
+
+// A shared clone takes this parameter's bounds and hints, none included.
+TEST_F(ParameterTest, ASharedCloneTakesTheBoundsItsSourceHas) {
+    const auto source = ramp(), clone = ramp();
+    clone->setValueBounds(0.0, 1.0, 0.5);
+    source->setupSharedClone(clone);
+    EXPECT_FALSE(clone->hasValueBounds());
+    source->setValueBounds(-1.0, 1.0, 0.0);
+    source->setupSharedClone(clone);
+    EXPECT_TRUE(clone->hasValueBounds());
 }
 
 TEST_F(ParameterTest, KindsStepInterpolateAndDiffer) {
