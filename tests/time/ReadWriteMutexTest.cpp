@@ -51,7 +51,9 @@ void runMixedLoad(int threadCount, int iterations) {
             ScopedReadLock lock(mutex); // every thread reads at once before the mix begins
             ++started;
             while (started.load() < threadCount) std::this_thread::yield();
+            if (!mutex.heldByThisThread()) ++violations; // owned slot or shared, it knows
         }
+        if (mutex.heldByThisThread()) ++violations;
         for (int i = 0; i < iterations; ++i) {
             if ((i + seed) % 4 == 0) {
                 write();
