@@ -2,7 +2,8 @@
 // What tests that run threads share: a deadline for tests whose failure mode
 // is a hang (a broken lock), past which the test program says so and ends
 // instead of spinning until the runner's own timeout; a bounded wait for a
-// flag; and an observer that runs a given body.
+// flag; an observer that runs a given body; and two drivers of a delivery
+// racing another thread.
 
 #include <VelaMediaLib/time/sync/Observer.h>
 
@@ -57,6 +58,48 @@ struct BlockingObserver : Observer {
     std::function<void(Observable*)> body;
     void update(Observable* changed) override { body(changed); }
 };
+
+/// Runs `notify` on another thread and, once the attached `slow` is inside
+/// its call, `detach` on this one; says whether detach returned before that
+/// call had ended.
+template <typename Notify, typename Detach>
+bool detachReturnsWhileTheObserverRuns(BlockingObserver& slow, Notify notify, Detach detach) {
+    std::atomic<bool> entered{false}, detached{false};
+    bool detachedWhileRunning = true;
+    slow.body = [&](Observable*) {
+        entered = true;
+        detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
+    };
+    std::thread notifier(notify);
+    waitFor(entered, std::chrono::seconds(30));
+    detach();
+    detached = true;
+    notifier.join();
+    return detachedWhileRunning;
+}
+
+/// Has another thread let go of `held` while the attached `reader` is told
+/// of the held-back change `changeInADelay` makes; the reader then runs
+/// `read` on what changed. Says whether letting go returned during the call.
+template <typename Pointer, typename Change>
+bool letGoDuringDelivery(Pointer& held, BlockingObserver& reader, std::function<void(Observable*)> read,
+                         Change changeInADelay) {
+    std::atomic<bool> delivering{false}, letGo{false};
+    bool duringDelivery = false;
+    reader.body = [&](Observable* changed) {
+        delivering = true;
+        duringDelivery = waitFor(letGo, std::chrono::seconds(5));
+        if (duringDelivery) read(changed);
+    };
+    std::thread host([&] {
+        waitFor(delivering, std::chrono::seconds(30));
+        held.reset();
+        letGo = true;
+    });
+    changeInADelay();
+    host.join();
+    return duringDelivery;
+}
 
 } // namespace testing
 } // namespace VelaMediaLib

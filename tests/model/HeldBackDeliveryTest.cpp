@@ -7,51 +7,33 @@
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 
-#include <atomic>
-#include <chrono>
-#include <functional>
 #include <gtest/gtest.h>
-#include <thread>
 
 using namespace VelaMediaLib;
-using VelaMediaLib::testing::BlockingObserver;
-using VelaMediaLib::testing::Deadline;
-using VelaMediaLib::testing::waitFor;
+using namespace VelaMediaLib::testing;
 
 // The host lets go of a clip while its held-back notification is delivered on
 // another thread: the observer, which is told the clip itself, finds it whole,
 // and the clip goes once its observers have heard.
 TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsObserversHaveHeard) {
-    Deadline deadline(std::chrono::seconds(60));
+    Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
     MediaPtr clip =
         PlaceholderMedia::createFromMediaRange(project->token(), project->editRateToken(), 0, 0, 10, 1);
     const boost::weak_ptr<Media> watched = clip;
-    std::atomic<bool> delivering{false}, letGo{false};
-    bool letGoDuringDelivery = false;
     std::string name;
-    VelaTime limit = 0;
+    VelaTime limit = -1;
     BlockingObserver reader;
-    reader.body = [&](Observable* changed) {
-        delivering = true;
-        letGoDuringDelivery = waitFor(letGo, std::chrono::seconds(5));
-        if (!letGoDuringDelivery) return;
+    clip->attach(&reader);
+    const auto read = [&](Observable* changed) {
         Media& media = dynamic_cast<Media&>(*changed);
         name = media.identifier();
         limit = media.trimEndLimit();
     };
-    clip->attach(&reader);
-    std::thread host([&] {
-        waitFor(delivering, std::chrono::seconds(30));
-        clip.reset();
-        letGo = true;
-    });
-    {
+    EXPECT_TRUE(letGoDuringDelivery(clip, reader, read, [&] {
         NotifyDelay delay(project->token().lock());
         clip->setIdentifier("renamed");
-    }
-    host.join();
-    EXPECT_TRUE(letGoDuringDelivery) << "letting go waited for the delivery";
+    })) << "letting go waited for the delivery";
     EXPECT_EQ(name, "renamed");
     EXPECT_EQ(limit, 0);
     EXPECT_TRUE(watched.expired());
@@ -60,21 +42,11 @@ TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsOb
 // The command history notifies through a subject with a mutex of its own and
 // no project: detaching on another thread returns once the observer is done.
 TEST(ModelDeliveryConcurrency, HistoryDetachReturnsOnlyOnceItsObserverHasFinished) {
-    Deadline deadline(std::chrono::seconds(60));
+    Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
     const boost::shared_ptr<CommandHistory> history = project->commandHistory();
-    std::atomic<bool> entered{false}, detached{false};
-    bool detachedWhileRunning = true;
     BlockingObserver slow;
-    slow.body = [&](Observable*) {
-        entered = true;
-        detachedWhileRunning = waitFor(detached, std::chrono::milliseconds(200));
-    };
     history->attach(&slow);
-    std::thread notifier([&] { history->setUndoLimit(5); });
-    waitFor(entered, std::chrono::seconds(30));
-    history->detach(&slow);
-    detached = true;
-    notifier.join();
-    EXPECT_FALSE(detachedWhileRunning);
+    EXPECT_FALSE(detachReturnsWhileTheObserverRuns(
+        slow, [&] { history->setUndoLimit(5); }, [&] { history->detach(&slow); }));
 }
