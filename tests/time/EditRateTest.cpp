@@ -5,6 +5,7 @@
 #include <atomic>
 #include <gtest/gtest.h>
 #include <thread>
+#include <tuple>
 
 using namespace VelaMediaLib;
 using VelaMediaLib::testing::Deadline;
@@ -22,10 +23,13 @@ TEST(EditRate, RatesAreBuiltByOneRule) {
 }
 
 // A zero rate is a rate like any other: kept as 0/1 and told to observers,
-// at construction and when set.
+// at construction and when set. The frame and sample answers stay fixed.
 TEST(EditRate, AZeroRateIsKeptAndTold) {
     SimpleProjectEditRate rate(Rate(0));
     EXPECT_EQ(rate.editRate(), Rate(0, 1));
+    EXPECT_EQ(std::make_tuple(rate.videoFrameRate(), rate.audioSampleRate(), rate.durationPerFrame()),
+              std::make_tuple(30, 44100, 1));
+    EXPECT_EQ(rate.editingUnit(), 1u);
     RateReader reader;
     reader.rate = &rate;
     rate.attachEditRateObserver(&reader);
@@ -40,7 +44,7 @@ TEST(EditRate, AZeroRateIsKeptAndTold) {
 // thread sees one of the rates set, never the numerator of one with the
 // denominator of the other.
 TEST(EditRateConcurrency, ReadersNeverSeeHalfOfANewRate) {
-    Deadline deadline(std::chrono::seconds(60));
+    Deadline deadline;
     const Rate ntsc(30000, 1001), whole(30, 1);
     SimpleProjectEditRate rate(whole);
     std::atomic<bool> done{false};
