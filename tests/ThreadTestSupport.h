@@ -1,9 +1,7 @@
 #pragma once
-// What tests that run threads share: a deadline for tests whose failure mode
-// is a hang (a broken lock), past which the test program says so and ends
-// instead of spinning until the runner's own timeout; a bounded wait for a
-// flag; an observer that runs a given body; and two drivers of a delivery
-// racing another thread.
+// What tests that run threads share: a deadline for tests whose failure mode is a hang (a broken lock), past
+// which the test program says so and ends instead of spinning until the runner's own timeout; a bounded wait
+// for a flag; an observer that runs a given body; and two drivers of a delivery racing another thread.
 
 #include <VelaMediaLib/time/sync/Observer.h>
 
@@ -59,9 +57,8 @@ struct BlockingObserver : Observer {
     void update(Observable* changed) override { body(changed); }
 };
 
-/// Runs `notify` on another thread and, once the attached `slow` is inside
-/// its call, `detach` on this one; says whether detach returned before that
-/// call had ended.
+/// Runs `notify` on another thread and, once the attached `slow` is inside its call, `detach` on this one;
+/// says whether detach returned before that call had ended.
 template <typename Notify, typename Detach>
 bool detachReturnsWhileTheObserverRuns(BlockingObserver& slow, Notify notify, Detach detach) {
     std::atomic<bool> entered{false}, detached{false};
@@ -78,9 +75,9 @@ bool detachReturnsWhileTheObserverRuns(BlockingObserver& slow, Notify notify, De
     return detachedWhileRunning;
 }
 
-/// Has another thread let go of `held` while the attached `reader` is told
-/// of the held-back change `changeInADelay` makes; the reader then runs
-/// `read` on what changed. Says whether letting go returned during the call.
+/// Has another thread let go of `held` while the attached `reader` is told of the held-back change
+/// `changeInADelay` makes; the reader then runs `read` on what changed. Says whether letting go returned
+/// during the call.
 template <typename Pointer, typename Change>
 bool letGoDuringDelivery(Pointer& held, BlockingObserver& reader, std::function<void(Observable*)> read,
                          Change changeInADelay) {

@@ -1,5 +1,5 @@
-// Held-back notifications keep what they deliver alive, and observers of
-// subjects with a mutex of their own are done once detach has returned.
+// Held-back notifications keep what they deliver alive, and observers of subjects with a mutex of their own
+// are done once detach has returned.
 #include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/commands/framework/CommandHistory.h>
@@ -12,9 +12,8 @@
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
 
-// The host lets go of a clip while its held-back notification is delivered on
-// another thread: the observer, which is told the clip itself, finds it whole,
-// and the clip goes once its observers have heard.
+// The host lets go of a clip while its held-back notification is delivered on another thread: the observer,
+// which is told the clip itself, finds it whole, and the clip goes once its observers have heard.
 TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsObserversHaveHeard) {
     Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
@@ -39,8 +38,8 @@ TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsOb
     EXPECT_TRUE(watched.expired());
 }
 
-// The command history notifies through a subject with a mutex of its own and
-// no project: detaching on another thread returns once the observer is done.
+// The command history notifies through a subject with a mutex of its own and no project: detaching on another
+// thread returns once the observer is done.
 TEST(ModelDeliveryConcurrency, HistoryDetachReturnsOnlyOnceItsObserverHasFinished) {
     Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);

@@ -12,8 +12,8 @@ using VelaMediaLib::testing::Deadline;
 using VelaMediaLib::testing::Rate;
 using VelaMediaLib::testing::RateReader;
 
-// Every entry point builds a rate alike: reduced, a zero numerator giving 0/1,
-// a zero denominator refused by the rational itself.
+// Every entry point builds a rate alike: reduced, a zero numerator giving 0/1, a zero denominator refused by
+// the rational itself.
 TEST(EditRate, RatesAreBuiltByOneRule) {
     EXPECT_EQ(SimpleProjectEditRate::rateOf(60, 2), Rate(30, 1));
     EXPECT_EQ(SimpleProjectEditRate::rateOf(30000, 1001), Rate(30000, 1001));
@@ -22,8 +22,8 @@ TEST(EditRate, RatesAreBuiltByOneRule) {
     EXPECT_THROW(SimpleProjectEditRate::rateOf(0, 0), boost::bad_rational);
 }
 
-// A zero rate is a rate like any other: kept as 0/1 and told to observers,
-// at construction and when set. The frame and sample answers stay fixed.
+// A zero rate is a rate like any other: kept as 0/1 and told to observers, at construction and when set. The
+// frame and sample answers stay fixed.
 TEST(EditRate, AZeroRateIsKeptAndTold) {
     SimpleProjectEditRate rate(Rate(0));
     EXPECT_EQ(rate.editRate(), Rate(0, 1));
@@ -40,9 +40,8 @@ TEST(EditRate, AZeroRateIsKeptAndTold) {
     rate.detachEditRateObserver(&reader);
 }
 
-// The numerator and the denominator change together: a reader on another
-// thread sees one of the rates set, never the numerator of one with the
-// denominator of the other.
+// The numerator and the denominator change together: a reader on another thread sees one of the rates set,
+// never the numerator of one with the denominator of the other.
 TEST(EditRateConcurrency, ReadersNeverSeeHalfOfANewRate) {
     Deadline deadline;
     const Rate ntsc(30000, 1001), whole(30, 1);

@@ -63,8 +63,8 @@ TEST(Interpolater, SpringSettlesOnTheValueAfterOvershooting) {
         }
         EXPECT_LT(spring2.ease(0.5), 1.0);
     }
-    // By hand: critical r(0.1) = 1 - e^-1 (1 + 1); overdamped (half 20, root of 300)
-    // r(0.1) = 1 - (fast e^(-slow 0.1) - slow e^(-fast 0.1)) / (fast - slow).
+    // By hand: critical r(0.1) = 1 - e^-1 (1 + 1); overdamped (half 20, root of 300) r(0.1) = 1 - (fast
+    // e^(-slow 0.1) - slow e^(-fast 0.1)) / (fast - slow).
     EXPECT_NEAR(SpringResponse(20.0, 100.0).response(0.1), 0.264241, 1e-6);
     EXPECT_NEAR(SpringResponse(40.0, 100.0).response(0.1), 0.177737, 1e-6);
     EXPECT_THROW(SpringInterpolater<double>(0.0, 100.0), VelaMediaLibException);

@@ -26,8 +26,8 @@ struct AtomicCounter : Observer {
 
 } // namespace
 
-// One thread notifies while another attaches and detaches observers of the
-// same subject: the observer attached throughout hears every notification.
+// One thread notifies while another attaches and detaches observers of the same subject: the observer
+// attached throughout hears every notification.
 TEST(NotificationConcurrency, AttachAndDetachWhileAnotherThreadNotifies) {
     Deadline deadline;
     Subject subject(boost::make_shared<ThreadSafe>());
@@ -48,8 +48,8 @@ TEST(NotificationConcurrency, AttachAndDetachWhileAnotherThreadNotifies) {
     EXPECT_EQ(steady.count.load(), 20000);
 }
 
-// A delay of the project ends on one thread while another thread's subject
-// changes: whether it is held back or told at once, it is told exactly once.
+// A delay of the project ends on one thread while another thread's subject changes: whether it is held back
+// or told at once, it is told exactly once.
 TEST(NotificationConcurrency, ADelayEndingWhileASubjectChangesLosesNothing) {
     Deadline deadline;
     const auto project = boost::make_shared<ThreadSafe>();
@@ -72,10 +72,9 @@ TEST(NotificationConcurrency, ADelayEndingWhileASubjectChangesLosesNothing) {
     EXPECT_EQ(lost, 0);
 }
 
-// Once detach (or the destructor of a subject without a lifeline) has returned
-// on another thread, the observer's call has ended: told at once or at the end
-// of a delay, with a project or without. Project subjects notify under the
-// project's read lock, so a detach under its write lock waits too.
+// Once detach (or the destructor of a subject without a lifeline) has returned on another thread, the
+// observer's call has ended: told at once or at the end of a delay, with a project or without. Project
+// subjects notify under the project's read lock, so a detach under its write lock waits too.
 TEST(NotificationConcurrency, DetachReturnsOnlyOnceTheObserverHasFinished) {
     Deadline deadline;
     const auto project = boost::make_shared<ThreadSafe>();
@@ -105,9 +104,8 @@ TEST(NotificationConcurrency, DetachReturnsOnlyOnceTheObserverHasFinished) {
     }
 }
 
-// Another thread lets go of the last reference to an attribute while its
-// held-back notification is delivered: the attribute lives, whole, until its
-// observers have heard, and goes afterwards.
+// Another thread lets go of the last reference to an attribute while its held-back notification is delivered:
+// the attribute lives, whole, until its observers have heard, and goes afterwards.
 TEST(NotificationConcurrency, AnAttributeLetGoOfDuringItsDeliveryLivesUntilItsObserversHaveHeard) {
     Deadline deadline;
     const auto project = boost::make_shared<ThreadSafe>();
@@ -127,9 +125,8 @@ TEST(NotificationConcurrency, AnAttributeLetGoOfDuringItsDeliveryLivesUntilItsOb
     EXPECT_TRUE(watched.expired());
 }
 
-// A thread holding the project's lock does not wait in detach: the observer
-// it would wait for may itself be waiting for that lock (here it asks for the
-// write lock, which waits for the detaching thread's read share).
+// A thread holding the project's lock does not wait in detach: the observer it would wait for may itself be
+// waiting for that lock (here it asks for the write lock, which waits for the detaching thread's read share).
 TEST(NotificationConcurrency, DetachUnderTheProjectLockDoesNotWaitForAnObserverWaitingForIt) {
     Deadline deadline;
     const auto project = boost::make_shared<ThreadSafe>();
@@ -157,8 +154,8 @@ TEST(NotificationConcurrency, DetachUnderTheProjectLockDoesNotWaitForAnObserverW
     subject.detach(&later);
 }
 
-// Observers are never called under a lock of the lists, so one may wait for
-// another thread that attaches to (or detaches from) the same subject.
+// Observers are never called under a lock of the lists, so one may wait for another thread that attaches to
+// (or detaches from) the same subject.
 TEST(NotificationConcurrency, AnObserverMayWaitForAThreadAttachingToItsSubject) {
     Deadline deadline;
     SubjectWithMutex subject(boost::make_shared<ThreadSafe>());
@@ -179,9 +176,8 @@ TEST(NotificationConcurrency, AnObserverMayWaitForAThreadAttachingToItsSubject) 
     subject.detach(&other);
 }
 
-// Add-observer lists share the subjects' policy: detach on another thread
-// waits for a running call, and an observer that throws leaves the others
-// hearing.
+// Add-observer lists share the subjects' policy: detach on another thread waits for a running call, and an
+// observer that throws leaves the others hearing.
 TEST(NotificationConcurrency, AddObserverListsFollowTheSamePolicy) {
     Deadline deadline;
     AddObserverList<BlockingObserver> list;
@@ -196,8 +192,8 @@ TEST(NotificationConcurrency, AddObserverListsFollowTheSamePolicy) {
     EXPECT_EQ(counted, 1);
 }
 
-// Two observers running on two threads detach each other: neither waits for
-// the other, since each is inside an observer's call.
+// Two observers running on two threads detach each other: neither waits for the other, since each is inside
+// an observer's call.
 TEST(NotificationConcurrency, ObserversDetachingEachOtherDoNotWaitForEachOther) {
     Deadline deadline;
     Subject first, second; // no project: nothing else keeps them apart
@@ -221,9 +217,8 @@ TEST(NotificationConcurrency, ObserversDetachingEachOtherDoNotWaitForEachOther) 
     EXPECT_TRUE(aRunning && bRunning);
 }
 
-// The edit rate tells its observers under the project's read lock like every
-// subject of the project, so a thread holding the write lock may detach one
-// while another thread sets the rate.
+// The edit rate tells its observers under the project's read lock like every subject of the project, so a
+// thread holding the write lock may detach one while another thread sets the rate.
 TEST(NotificationConcurrency, EditRateObserversDetachUnderTheWriteLock) {
     Deadline deadline;
     const ProjectPtr project = Project::create(30, 1);
@@ -246,9 +241,8 @@ TEST(NotificationConcurrency, EditRateObserversDetachUnderTheWriteLock) {
     EXPECT_EQ(project->editRate(), Rate(25));
 }
 
-// Inside an observer's call, detaching an observer of another subject still
-// waits for that observer's call on another thread: only a cycle of waits
-// lets a detach return early.
+// Inside an observer's call, detaching an observer of another subject still waits for that observer's call on
+// another thread: only a cycle of waits lets a detach return early.
 TEST(NotificationConcurrency, DetachInsideAnObserverStillWaitsOutsideACycle) {
     Deadline deadline;
     Subject first, second;
@@ -278,9 +272,8 @@ TEST(NotificationConcurrency, DetachInsideAnObserverStillWaitsOutsideACycle) {
     EXPECT_TRUE(finishedWhenDetached);
 }
 
-// A detach that waited for a call counts that wait no longer once the call
-// has ended: the thread that ended it, detaching in turn an observer the
-// first thread is still running, waits for it like any other.
+// A detach that waited for a call counts that wait no longer once the call has ended: the thread that ended
+// it, detaching in turn an observer the first thread is still running, waits for it like any other.
 TEST(NotificationConcurrency, AFinishedWaitClosesNoCycle) {
     Deadline deadline;
     Subject first, second;

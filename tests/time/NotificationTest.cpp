@@ -34,8 +34,8 @@ protected:
 
 } // namespace
 
-// Disablers nest, an observer in both lists is told once and detached from
-// either, and a subject outliving its project still notifies.
+// Disablers nest, an observer in both lists is told once and detached from either, and a subject outliving
+// its project still notifies.
 TEST_F(Notification, DisablersNestAndAnObserverIsToldOnce) {
     subject->attach(&observer);
     subject->attachWithoutNotifyDelay(&observer);
@@ -103,9 +103,8 @@ TEST_F(Notification, ADelayOpenedDuringDeliveryFails) {
     NotifyDelay afterwards(project); // the registry is idle again
 }
 
-// Checking for an open delay and parking are one step: a subject is never
-// parked where no delay will deliver it. One destroyed while held back is
-// forgotten.
+// Checking for an open delay and parking are one step: a subject is never parked where no delay will deliver
+// it. One destroyed while held back is forgotten.
 TEST_F(Notification, ASubjectIsHeldBackOnlyWhileADelayIsOpenAndWhileItLives) {
     subject->attach(&observer);
     EXPECT_FALSE(NotifyDelay::addSubject(subject.get(), project));
@@ -215,10 +214,9 @@ TEST_F(Notification, AttributesAndMetadataTellOnlyRealChanges) {
     EXPECT_EQ(flag.name(), "solo");
 }
 
-// An observer that destroys a subject without a lifeline ends that subject's
-// walk, told at once or held back: the observers after it are not told,
-// nothing freed is touched (AddressSanitizer sees to that), and the other
-// held-back subjects are still told.
+// An observer that destroys a subject without a lifeline ends that subject's walk, told at once or held back:
+// the observers after it are not told, nothing freed is touched (AddressSanitizer sees to that), and the
+// other held-back subjects are still told.
 TEST_F(Notification, AnObserverThatDestroysItsSubjectEndsItsDelivery) {
     subject->attach(&observer);
     for (const bool delayed : {false, true}) {
@@ -241,8 +239,8 @@ TEST_F(Notification, AnObserverThatDestroysItsSubjectEndsItsDelivery) {
     EXPECT_EQ(observer.count, 2);
 }
 
-// A subject held by shared pointer is kept alive through its delivery: an
-// observer letting go of the last reference leaves the others hearing it whole.
+// A subject held by shared pointer is kept alive through its delivery: an observer letting go of the last
+// reference leaves the others hearing it whole.
 TEST_F(Notification, AnObserverThatLetsGoOfItsSubjectLeavesTheOthersHearingItWhole) {
     boost::shared_ptr<Attribute<std::string>> attribute(new Attribute<std::string>("name", "a", project));
     const boost::weak_ptr<Attribute<std::string>> watched = attribute;

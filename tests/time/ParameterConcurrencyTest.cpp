@@ -11,8 +11,8 @@
 
 using namespace VelaMediaLib;
 
-// Readers evaluate while one writer moves, changes, adds and removes
-// keyframes. Every value a reader sees lies between the curve's bounds.
+// Readers evaluate while one writer moves, changes, adds and removes keyframes. Every value a reader sees
+// lies between the curve's bounds.
 TEST(ParameterConcurrency, ReadersSeeWholeCurvesWhileAWriterEdits) {
     VelaMediaLib::testing::Deadline deadline;
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();

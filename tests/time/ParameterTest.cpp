@@ -203,8 +203,8 @@ TEST_F(ParameterTest, MovesAndDifferencesKeepEveryLeadInWithinItsSegment) {
     EXPECT_EQ(observer.count, 1);
     parameter->detach(&observer);
 
-    // A source keyframe arriving inside an edit's lead-in cuts that lead-in
-    // to start at it: the values stay, and the curve may stand as it is.
+    // A source keyframe arriving inside an edit's lead-in cuts that lead-in to start at it: the values stay,
+    // and the curve may stand as it is.
     auto source = ramp();
     auto diff = DiffParameter<double>::create(project, "diff", source);
     diff->addKeyFrame(20, 0.0, 8);

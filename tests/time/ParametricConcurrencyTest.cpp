@@ -23,11 +23,10 @@ struct AtomicCounter : Observer {
 
 } // namespace
 
-// Readers take snapshots of objects whose parameters, identifier attributes,
-// metadata and attributes they touch first inside the snapshot, while one
-// thread attaches and detaches observers on those parameters and another
-// edits them (some edits under a notify delay). Within a snapshot a reader's
-// answers agree, and the observer attached throughout hears of every round.
+// Readers take snapshots of objects whose parameters, identifier attributes, metadata and attributes they
+// touch first inside the snapshot, while one thread attaches and detaches observers on those parameters and
+// another edits them (some edits under a notify delay). Within a snapshot a reader's answers agree, and the
+// observer attached throughout hears of every round.
 TEST(ParametricConcurrency, ReadersFirstTouchPartsWhileObserversComeAndGoAndEditsRun) {
     Deadline deadline(std::chrono::seconds(60));
     const auto project = boost::make_shared<ThreadSafe>();

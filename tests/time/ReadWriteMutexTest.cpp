@@ -16,8 +16,8 @@ TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
     VelaMediaLib::testing::Deadline watchdog;
     ReadWriteMutex mutex;
     std::atomic<int> inside{0};
-    // Each reader waits, holding the lock, until the other is inside too:
-    // readers that serialised would never both get there.
+    // Each reader waits, holding the lock, until the other is inside too: readers that serialised would never
+    // both get there.
     auto reader = [&] {
         ScopedReadLock lock(mutex);
         ++inside;
@@ -33,8 +33,8 @@ TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
 
 namespace {
 
-// Threads that mix reads, nested reads, upgrades and writes, counting any
-// moment at which a writer shares the lock with anyone.
+// Threads that mix reads, nested reads, upgrades and writes, counting any moment at which a writer shares the
+// lock with anyone.
 void runMixedLoad(int threadCount, int iterations) {
     ReadWriteMutex mutex;
     std::atomic<int> readers{0}, writers{0}, violations{0};

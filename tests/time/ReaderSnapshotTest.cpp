@@ -12,9 +12,9 @@ using VelaMediaLib::testing::Knob;
 
 namespace {
 
-// A reader holds the read lock while a writer waits for the write lock. What
-// the reader first uses inside its snapshot (and is made on demand) must not
-// let the writer in: the writer's change stays unseen until the reader lets go.
+// A reader holds the read lock while a writer waits for the write lock. What the reader first uses inside its
+// snapshot (and is made on demand) must not let the writer in: the writer's change stays unseen until the
+// reader lets go.
 class ReaderSnapshot : public ::testing::Test {
 protected:
     void expectSnapshotHoldsAcross(const std::function<void()>& firstUse) {

@@ -181,9 +181,8 @@ TEST(TimeUtil, SecondsAndTicksAtNtscRates) {
     EXPECT_EQ(TimeUtil::durationWithScalarRoundedToEditingUnit(10, SafeRational(5, 4), 1), 13);
 }
 
-// The portable type is what compilers without a 128-bit integer use: it
-// must agree with the built-in one wherever the time code uses it
-// (products of two 64-bit values, then +, -, /, % and comparisons).
+// The portable type is what compilers without a 128-bit integer use: it must agree with the built-in one
+// wherever the time code uses it (products of two 64-bit values, then +, -, /, % and comparisons).
 #if defined(__SIZEOF_INT128__)
 TEST(PortableInt128, AgreesWithTheBuiltInTypeOnProductsOfTwo64BitValues) {
     using detail::PortableInt128;

@@ -34,8 +34,8 @@ TEST(ScaledTime, InvalidScaleCarriesTheScale) {
     EXPECT_THROW(ScaledTime(-30, 1), VelaMediaLibException);
 }
 
-// Frames of 30 per second on the flick grid: floor, ceiling and rounding
-// (half away from zero) mirror each other around zero.
+// Frames of 30 per second on the flick grid: floor, ceiling and rounding (half away from zero) mirror each
+// other around zero.
 TEST(ScaledTime, GridAlignmentIsSymmetricAroundZero) {
     const long long flick = ScaledTime::kFlickScale, frame = 23520000;
     const long long cases[][4] = {
@@ -69,8 +69,7 @@ TEST(ScaledTimeRange, EndsConversionsAndTextForm) {
 
 namespace {
 
-// A container that starts its content at `offset` and plays it at `speed`,
-// showing at most `length` of it.
+// A container that starts its content at `offset` and plays it at `speed`, showing at most `length` of it.
 class OffsetConverter : public TimeConverter {
 public:
     OffsetConverter(SafeRational offset, SafeRational speed, SafeRational length, TimeConverterPtr parent)

@@ -1,6 +1,6 @@
 #pragma once
-// Helpers for the time and document tests: a small parametric kind, an
-// edit-rate observer, and the deadline for tests that run threads.
+// Helpers for the time and document tests: a small parametric kind, an edit-rate observer, and the deadline
+// for tests that run threads.
 
 #include "../ThreadTestSupport.h"
 
@@ -15,8 +15,7 @@
 namespace VelaMediaLib {
 namespace testing {
 
-/// A kind with two declared parameters ("level" 1.0 and "pan" 0.0), made on
-/// first use, and attributes.
+/// A kind with two declared parameters ("level" 1.0 and "pan" 0.0), made on first use, and attributes.
 class Knob : public Parametric, public Attributable {
 public:
     explicit Knob(const boost::weak_ptr<const ThreadSafe>& token) : Parametric(token), Attributable(token) {}
