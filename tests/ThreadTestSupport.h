@@ -1,7 +1,7 @@
 #pragma once
 // What tests that run threads share: a deadline for tests whose failure mode is a hang (a broken lock), past
 // which the test program says so and ends instead of spinning until the runner's own timeout; a bounded wait
-// for a flag; an observer that runs a given body; and two drivers of a delivery racing another thread.
+// for a flag; an observer that runs a given body; and a driver of a detach racing that observer's call.
 
 #include <VelaMediaLib/time/sync/Observer.h>
 
@@ -73,29 +73,6 @@ bool detachReturnsWhileTheObserverRuns(BlockingObserver& slow, Notify notify, De
     detached = true;
     notifier.join();
     return detachedWhileRunning;
-}
-
-/// Has another thread let go of `held` while the attached `reader` is told of the held-back change
-/// `changeInADelay` makes; the reader then runs `read` on what changed. Says whether letting go returned
-/// during the call.
-template <typename Pointer, typename Change>
-bool letGoDuringDelivery(Pointer& held, BlockingObserver& reader, std::function<void(Observable*)> read,
-                         Change changeInADelay) {
-    std::atomic<bool> delivering{false}, letGo{false};
-    bool duringDelivery = false;
-    reader.body = [&](Observable* changed) {
-        delivering = true;
-        duringDelivery = waitFor(letGo, std::chrono::seconds(5));
-        if (duringDelivery) read(changed);
-    };
-    std::thread host([&] {
-        waitFor(delivering, std::chrono::seconds(30));
-        held.reset();
-        letGo = true;
-    });
-    changeInADelay();
-    host.join();
-    return duringDelivery;
 }
 
 } // namespace testing

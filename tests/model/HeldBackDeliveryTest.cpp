@@ -8,6 +8,7 @@
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 
 #include <gtest/gtest.h>
+#include <thread>
 
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
@@ -20,19 +21,31 @@ TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsOb
     MediaPtr clip =
         PlaceholderMedia::createFromMediaRange(project->token(), project->editRateToken(), 0, 0, 10, 1);
     const boost::weak_ptr<Media> watched = clip;
+    std::atomic<bool> delivering{false}, letGo{false};
+    bool letGoDuringDelivery = false;
     std::string name;
     VelaTime limit = -1;
     BlockingObserver reader;
-    clip->attach(&reader);
-    const auto read = [&](Observable* changed) {
+    reader.body = [&](Observable* changed) {
+        delivering = true;
+        letGoDuringDelivery = waitFor(letGo, std::chrono::seconds(5));
+        if (!letGoDuringDelivery) return;
         Media& media = dynamic_cast<Media&>(*changed);
         name = media.identifier();
         limit = media.trimEndLimit();
     };
-    EXPECT_TRUE(letGoDuringDelivery(clip, reader, read, [&] {
+    clip->attach(&reader);
+    std::thread host([&] {
+        waitFor(delivering, std::chrono::seconds(30));
+        clip.reset();
+        letGo = true;
+    });
+    {
         NotifyDelay delay(project->token().lock());
         clip->setIdentifier("renamed");
-    })) << "letting go waited for the delivery";
+    }
+    host.join();
+    EXPECT_TRUE(letGoDuringDelivery) << "letting go waited for the delivery";
     EXPECT_EQ(name, "renamed");
     EXPECT_EQ(limit, 0);
     EXPECT_TRUE(watched.expired());

@@ -1,7 +1,6 @@
 #include "TimeTestSupport.h"
 
 #include <VelaMediaLib/commands/edits/InternalProject.h>
-#include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/AddObserverList.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 #include <VelaMediaLib/time/sync/SubjectWithMutex.h>
@@ -102,27 +101,14 @@ TEST(NotificationConcurrency, DetachReturnsOnlyOnceTheObserverHasFinished) {
             }))
             << c.withProject << c.delayed << c.underWriteLock << c.destroy;
     }
-}
-
-// Another thread lets go of the last reference to an attribute while its held-back notification is delivered:
-// the attribute lives, whole, until its observers have heard, and goes afterwards.
-TEST(NotificationConcurrency, AnAttributeLetGoOfDuringItsDeliveryLivesUntilItsObserversHaveHeard) {
-    Deadline deadline;
-    const auto project = boost::make_shared<ThreadSafe>();
-    boost::shared_ptr<Attribute<std::string>> attribute(new Attribute<std::string>("name", "a", project));
-    const boost::weak_ptr<Attribute<std::string>> watched = attribute;
-    std::string seen;
-    BlockingObserver reader;
-    attribute->attach(&reader);
-    const auto read = [&](Observable* changed) {
-        seen = dynamic_cast<Attribute<std::string>&>(*changed).value();
-    };
-    EXPECT_TRUE(letGoDuringDelivery(attribute, reader, read, [&] {
-        NotifyDelay delay(project);
-        attribute->setValue("b");
-    })) << "letting go waited for the delivery";
-    EXPECT_EQ(seen, "b");
-    EXPECT_TRUE(watched.expired());
+    // Inside another observer's call, detach still waits: only a cycle of waits lets it return early.
+    Subject first, second;
+    BlockingObserver slow, detacher;
+    detacher.body = [&](Observable*) { second.detach(&slow); };
+    second.attach(&slow);
+    first.attach(&detacher);
+    EXPECT_FALSE(detachReturnsWhileTheObserverRuns(
+        slow, [&] { second.notify(); }, [&] { first.notify(); }));
 }
 
 // A thread holding the project's lock does not wait in detach: the observer it would wait for may itself be
@@ -239,37 +225,6 @@ TEST(NotificationConcurrency, EditRateObserversDetachUnderTheWriteLock) {
     setter.join();
     EXPECT_FALSE(entered) << "told outside the project's lock";
     EXPECT_EQ(project->editRate(), Rate(25));
-}
-
-// Inside an observer's call, detaching an observer of another subject still waits for that observer's call on
-// another thread: only a cycle of waits lets a detach return early.
-TEST(NotificationConcurrency, DetachInsideAnObserverStillWaitsOutsideACycle) {
-    Deadline deadline;
-    Subject first, second;
-    std::atomic<bool> slowRunning{false}, release{false}, slowFinished{false};
-    BlockingObserver slow, detacher;
-    slow.body = [&](Observable*) {
-        slowRunning = true;
-        waitFor(release, seconds(30));
-        slowFinished = true;
-    };
-    second.attach(&slow);
-    std::thread teller([&] { second.notify(); });
-    ASSERT_TRUE(waitFor(slowRunning, seconds(30)));
-    std::thread releaser([&] {
-        std::this_thread::sleep_for(std::chrono::milliseconds(50));
-        release = true;
-    });
-    bool finishedWhenDetached = false;
-    detacher.body = [&](Observable*) {
-        second.detach(&slow);
-        finishedWhenDetached = slowFinished;
-    };
-    first.attach(&detacher);
-    first.notify();
-    teller.join();
-    releaser.join();
-    EXPECT_TRUE(finishedWhenDetached);
 }
 
 // A detach that waited for a call counts that wait no longer once the call has ended: the thread that ended

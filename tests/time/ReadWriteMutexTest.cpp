@@ -11,9 +11,10 @@
 #include <vector>
 
 using namespace VelaMediaLib;
+using VelaMediaLib::testing::Deadline;
 
 TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
-    VelaMediaLib::testing::Deadline watchdog;
+    Deadline deadline;
     ReadWriteMutex mutex;
     std::atomic<int> inside{0};
     // Each reader waits, holding the lock, until the other is inside too: readers that serialised would never
@@ -21,14 +22,13 @@ TEST(ReadWriteMutexConcurrency, ReadersHoldTheLockTogether) {
     auto reader = [&] {
         ScopedReadLock lock(mutex);
         ++inside;
-        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
-        while (inside.load() < 2 && std::chrono::steady_clock::now() < deadline) std::this_thread::yield();
+        const auto until = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+        while (inside.load() < 2 && std::chrono::steady_clock::now() < until) std::this_thread::yield();
         return inside.load() >= 2;
     };
-    auto first = std::async(std::launch::async, reader);
-    auto second = std::async(std::launch::async, reader);
-    EXPECT_TRUE(first.get());
-    EXPECT_TRUE(second.get());
+    auto other = std::async(std::launch::async, reader);
+    EXPECT_TRUE(reader());
+    EXPECT_TRUE(other.get());
 }
 
 namespace {
@@ -37,9 +37,10 @@ namespace {
 // lock with anyone.
 void runMixedLoad(int threadCount, int iterations) {
     ReadWriteMutex mutex;
-    std::atomic<int> readers{0}, writers{0}, violations{0};
+    std::atomic<int> readers{0}, writers{0}, violations{0}, writes{0};
     long long sharedValue = 0; // written only under the write lock
     auto write = [&] {
+        ++writes;
         ScopedWriteLock lock(mutex);
         if (++writers != 1 || readers.load() != 0) ++violations;
         ++sharedValue;
@@ -76,21 +77,21 @@ void runMixedLoad(int threadCount, int iterations) {
     for (int t = 0; t < threadCount; ++t) threads.emplace_back(work, t);
     for (std::thread& thread : threads) thread.join();
     EXPECT_EQ(violations.load(), 0);
-    long long expected = 0;
-    for (int t = 0; t < threadCount; ++t)
-        for (int i = 0; i < iterations; ++i) expected += ((i + t) % 4 == 0 || (i + t) % 8 == 1) ? 1 : 0;
-    EXPECT_EQ(sharedValue, expected);
+    EXPECT_EQ(sharedValue, writes.load());
 }
 
 } // namespace
 
-TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) { runMixedLoad(4, 3000); }
+// With more threads than reader slots too: the extra threads share the counted slot.
+TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
+    Deadline deadline;
+    runMixedLoad(4, 3000);
+    runMixedLoad(72, 200);
+}
 
-// More threads than reader slots: the extra threads share the counted slot.
-TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElseBeyondTheOwnedSlots) { runMixedLoad(72, 200); }
-
-TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
-    VelaMediaLib::testing::Deadline watchdog;
+// One thread may nest reads and writes, upgrade and downgrade; a downgraded writer still excludes writers.
+TEST(ReadWriteMutexConcurrency, ReentrantReadWriteUpgradeAndDowngradeOnOneThread) {
+    Deadline deadline;
     ReadWriteMutex mutex;
     {
         ScopedWriteLock write(mutex);
@@ -102,18 +103,7 @@ TEST(ReadWriteMutexConcurrency, ReentrantReadWriteAndUpgradeOnOneThread) {
         ScopedReadLock nested(mutex);
         ScopedWriteLock upgraded(mutex);
     }
-    // Everything was released: another thread can write at once.
-    auto writer = std::async(std::launch::async, [&] {
-        ScopedWriteLock lock(mutex);
-        return true;
-    });
-    ASSERT_EQ(writer.wait_for(std::chrono::seconds(10)), std::future_status::ready);
-}
-
-TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
-    VelaMediaLib::testing::Deadline watchdog;
-    ReadWriteMutex mutex;
-    mutex.lockWrite();
+    mutex.lockWrite(); // everything above was released, or the writer below never gets in
     mutex.lockRead();
     mutex.unlockWrite(); // still reading
     std::atomic<bool> written{false};
@@ -129,7 +119,7 @@ TEST(ReadWriteMutexConcurrency, ADowngradedWriterStillExcludesWriters) {
 }
 
 TEST(ReadWriteMutexConcurrency, TokenLocksTakeNothingOnceTheProjectIsGone) {
-    VelaMediaLib::testing::Deadline watchdog;
+    Deadline deadline;
     boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const boost::weak_ptr<const ThreadSafe> token = project;
     {
