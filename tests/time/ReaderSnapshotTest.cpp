@@ -18,7 +18,7 @@ namespace {
 class ReaderSnapshot : public ::testing::Test {
 protected:
     void expectSnapshotHoldsAcross(const std::function<void()>& firstUse) {
-        Deadline deadline(std::chrono::seconds(30));
+        Deadline deadline;
         const auto witness = ParameterImpl<double>::create(project, "witness", 0.0);
         std::thread writer;
         {
@@ -39,25 +39,20 @@ protected:
 } // namespace
 
 TEST_F(ReaderSnapshot, PartsMadeOnFirstUseLetNoWriterIn) {
-    {
-        SCOPED_TRACE("a declared parameter");
-        expectSnapshotHoldsAcross(
-            [&] { EXPECT_EQ(knob.typedParameter<double>("level")->valueAtTime(0), 1.0); });
-        EXPECT_TRUE(knob.hasMadeParameter("level"));
-    }
     const auto parameter = ParameterImpl<double>::create(project, "gain", 2.0);
-    {
-        SCOPED_TRACE("a parameter's identifier attribute");
-        expectSnapshotHoldsAcross([&] { EXPECT_EQ(parameter->identAttribute()->value(), "gain"); });
+    const std::pair<const char*, std::function<void()>> firstUses[] = {
+        {"a declared parameter",
+         [&] { EXPECT_EQ(knob.typedParameter<double>("level")->valueAtTime(0), 1.0); }},
+        {"a parameter's identifier attribute",
+         [&] { EXPECT_EQ(parameter->identAttribute()->value(), "gain"); }},
+        {"a parameter's metadata", [&] { EXPECT_TRUE(parameter->metaDataPtr()->metaDataKeys().empty()); }},
+        {"an attribute made with its initial value",
+         [&] { EXPECT_FALSE(knob.attributeOrAdd<bool>("solo", false)->value()); }}};
+    for (const auto& firstUse : firstUses) {
+        SCOPED_TRACE(firstUse.first);
+        expectSnapshotHoldsAcross(firstUse.second);
     }
-    {
-        SCOPED_TRACE("a parameter's metadata");
-        expectSnapshotHoldsAcross([&] { EXPECT_TRUE(parameter->metaDataPtr()->metaDataKeys().empty()); });
-    }
-    {
-        SCOPED_TRACE("an attribute made with its initial value");
-        expectSnapshotHoldsAcross([&] { EXPECT_FALSE(knob.attributeOrAdd<bool>("solo", false)->value()); });
-    }
+    EXPECT_TRUE(knob.hasMadeParameter("level"));
     EXPECT_EQ(parameter->identAttribute(), parameter->identAttribute()); // made once
     EXPECT_EQ(parameter->metaDataPtr(), parameter->metaDataPtr());
 }
