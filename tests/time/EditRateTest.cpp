@@ -13,18 +13,14 @@ using VelaMediaLib::testing::Rate;
 using VelaMediaLib::testing::RateReader;
 
 // Every entry point builds a rate alike: reduced, a zero numerator giving 0/1, a zero denominator refused by
-// the rational itself.
-TEST(EditRate, RatesAreBuiltByOneRule) {
+// the rational itself. A zero rate is then a rate like any other: kept as 0/1 and told to observers, at
+// construction and when set. The frame and sample answers stay fixed.
+TEST(EditRate, RatesAreBuiltByOneRuleAndAZeroRateIsKeptAndTold) {
     EXPECT_EQ(SimpleProjectEditRate::rateOf(60, 2), Rate(30, 1));
     EXPECT_EQ(SimpleProjectEditRate::rateOf(30000, 1001), Rate(30000, 1001));
     EXPECT_EQ(SimpleProjectEditRate::rateOf(0, 7), Rate(0, 1));
     EXPECT_THROW(SimpleProjectEditRate::rateOf(30, 0), boost::bad_rational);
     EXPECT_THROW(SimpleProjectEditRate::rateOf(0, 0), boost::bad_rational);
-}
-
-// A zero rate is a rate like any other: kept as 0/1 and told to observers, at construction and when set. The
-// frame and sample answers stay fixed.
-TEST(EditRate, AZeroRateIsKeptAndTold) {
     SimpleProjectEditRate rate(Rate(0));
     EXPECT_EQ(rate.editRate(), Rate(0, 1));
     EXPECT_EQ(std::make_tuple(rate.videoFrameRate(), rate.audioSampleRate(), rate.durationPerFrame()),
