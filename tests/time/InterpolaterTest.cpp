@@ -111,7 +111,6 @@ TEST(BezierInterpolater, FollowsTheCurveAndSurvivesItsName) {
     // A bent curve at s = 0.5: (a + 3 cp1 + 3 cp2 + b) / 8.
     const BezierInterpolater bent(Point3d(0, 8, 4), Point3d(8, 8, 4), "linr");
     EXPECT_EQ(bent.pointAt(Point3d(0, 0, 0), Point3d(8, 0, 0), 0.5), Point3d(4, 6, 3));
-
     const auto parsed = BezierInterpolater::fromName("bezr(esIn;0,8,0;8,8.5,-1)");
     ASSERT_TRUE(parsed);
     EXPECT_EQ(parsed->controlPoint2(), Point3d(8, 8.5, -1));

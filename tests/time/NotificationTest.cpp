@@ -34,9 +34,9 @@ protected:
 
 } // namespace
 
-// Disablers nest, an observer in both lists is told once and detached from either, and a subject outliving
-// its project still notifies.
-TEST_F(Notification, DisablersNestAndAnObserverIsToldOnce) {
+// Disablers nest, an observer in both lists is told once and detached from either, a subject outliving its
+// project still notifies, and observers may change the lists from inside their update.
+TEST_F(Notification, DisablersNestAndTheListsHoldEachObserverOnce) {
     subject->attach(&observer);
     subject->attachWithoutNotifyDelay(&observer);
     subject->attach(&observer);
@@ -58,6 +58,17 @@ TEST_F(Notification, DisablersNestAndAnObserverIsToldOnce) {
     subject->detach(&observer);
     subject->notify();
     EXPECT_EQ(observer.count, 2);
+    int rearranged = 0;
+    Lambda rearranging([&](Observable*) {
+        ++rearranged;
+        subject->detach(&rearranging);
+        subject->attach(&observer);
+    });
+    subject->attach(&rearranging);
+    subject->notify();
+    subject->notify();
+    EXPECT_EQ(rearranged, 1);
+    EXPECT_EQ(observer.count, 3); // attached during the first walk, told from the second on
 }
 
 TEST_F(Notification, ADelayCoalescesChangesAndTheUndelayedHearAtOnce) {
@@ -104,7 +115,7 @@ TEST_F(Notification, ADelayOpenedDuringDeliveryFails) {
 }
 
 // Checking for an open delay and parking are one step: a subject is never parked where no delay will deliver
-// it. One destroyed while held back is forgotten.
+// it. One destroyed while held back is forgotten; one moved to another project takes its notification along.
 TEST_F(Notification, ASubjectIsHeldBackOnlyWhileADelayIsOpenAndWhileItLives) {
     subject->attach(&observer);
     EXPECT_FALSE(NotifyDelay::addSubject(subject.get(), project));
@@ -121,6 +132,15 @@ TEST_F(Notification, ASubjectIsHeldBackOnlyWhileADelayIsOpenAndWhileItLives) {
     }
     EXPECT_EQ(observer.count, 1);
     EXPECT_EQ(observer.last, subject.get());
+    const auto other = boost::make_shared<ThreadSafe>();
+    NotifyDelay delay(project);
+    subject->notify();
+    {
+        NotifyDelay otherDelay(other);
+        subject->setProjectMutex(other);
+        EXPECT_EQ(observer.count, 1);
+    }
+    EXPECT_EQ(observer.count, 2);
 }
 
 TEST_F(Notification, AnObserverThatThrowsSilencesNoneOfTheOthers) {
@@ -138,33 +158,6 @@ TEST_F(Notification, AnObserverThatThrowsSilencesNoneOfTheOthers) {
     subject->detach(&throwing);
 }
 
-TEST_F(Notification, ObserversMayChangeTheListsFromInsideTheirUpdate) {
-    int rearranged = 0;
-    Lambda rearranging([&](Observable*) {
-        ++rearranged;
-        subject->detach(&rearranging);
-        subject->attach(&observer);
-    });
-    subject->attach(&rearranging);
-    subject->notify();
-    subject->notify();
-    EXPECT_EQ(rearranged, 1);
-    EXPECT_EQ(observer.count, 1); // attached during the first walk, told from the second on
-}
-
-TEST_F(Notification, AHeldBackNotificationMovesWithItsSubject) {
-    const auto other = boost::make_shared<ThreadSafe>();
-    subject->attach(&observer);
-    NotifyDelay delay(project);
-    subject->notify();
-    {
-        NotifyDelay otherDelay(other);
-        subject->setProjectMutex(other);
-        EXPECT_EQ(observer.count, 0);
-    }
-    EXPECT_EQ(observer.count, 1);
-}
-
 TEST_F(Notification, ScopedObserversDetachThemselves) {
     int heard = 0;
     {
@@ -175,7 +168,6 @@ TEST_F(Notification, ScopedObserversDetachThemselves) {
     }
     subject->notify();
     EXPECT_EQ(heard, 1);
-
     auto second = boost::make_shared<Subject>(project);
     std::vector<Observable*> changed;
     {
@@ -205,7 +197,6 @@ TEST_F(Notification, AttributesAndMetadataTellOnlyRealChanges) {
     EXPECT_TRUE(metadata.removeMetaData("author"));
     EXPECT_FALSE(metadata.removeMetaData("author"));
     EXPECT_TRUE(metadata.metaDataKeys().empty());
-
     Attribute<bool> flag("solo", false, project);
     flag.attach(&observer);
     EXPECT_FALSE(flag.setValue(false));
@@ -217,7 +208,7 @@ TEST_F(Notification, AttributesAndMetadataTellOnlyRealChanges) {
 // An observer that destroys a subject without a lifeline ends that subject's walk, told at once or held back:
 // the observers after it are not told, nothing freed is touched (AddressSanitizer sees to that), and the
 // other held-back subjects are still told.
-TEST_F(Notification, AnObserverThatDestroysItsSubjectEndsItsDelivery) {
+TEST_F(Notification, AnObserverThatDestroysOrLetsGoOfItsSubject) {
     subject->attach(&observer);
     for (const bool delayed : {false, true}) {
         Subject* doomed = new Subject(project);
@@ -237,11 +228,8 @@ TEST_F(Notification, AnObserverThatDestroysItsSubjectEndsItsDelivery) {
         EXPECT_EQ(afterIt.count, 0) << delayed;
     }
     EXPECT_EQ(observer.count, 2);
-}
-
-// A subject held by shared pointer is kept alive through its delivery: an observer letting go of the last
-// reference leaves the others hearing it whole.
-TEST_F(Notification, AnObserverThatLetsGoOfItsSubjectLeavesTheOthersHearingItWhole) {
+    // A subject held by shared pointer is kept alive through its delivery: an observer letting go of the last
+    // reference leaves the others hearing it whole.
     boost::shared_ptr<Attribute<std::string>> attribute(new Attribute<std::string>("name", "a", project));
     const boost::weak_ptr<Attribute<std::string>> watched = attribute;
     std::string seen;

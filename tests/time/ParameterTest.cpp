@@ -62,7 +62,6 @@ TEST_F(ParameterTest, ValueAtTimeFollowsItsSteps) {
     parameter->setTimeScalable(boost::make_shared<TicksPerUnit>(2));
     EXPECT_EQ(parameter->valueAtTime(RationalTime(48, 5)), 10.0);
     EXPECT_DOUBLE_EQ(parameter->valueAtTime(RationalTime(19, 2)), 9.5); // exactly one tick before
-
     // The end keyframe's interpolater and lead-in shape the segment.
     parameter = ramp();
     parameter->keyframeAtTime(10)->setInterpolater(EaseInInterpolater<double>::getInstance());
@@ -147,7 +146,6 @@ TEST_F(ParameterTest, CopyPortionCutsTheCurveAtTheRangeEdges) {
     const auto empty = parameter->copyPortion(Range<RationalTime>(4, 0));
     EXPECT_EQ(*empty->keyframeTimes(), Times{0});
     EXPECT_EQ(empty->valueAtTime(0), 4.0);
-
     // A shared clone takes this parameter's bounds and hints, none included.
     const auto clone = ramp();
     clone->setValueBounds(0.0, 1.0, 0.5);
@@ -164,14 +162,12 @@ TEST_F(ParameterTest, KindsStepInterpolateAndDiffer) {
     step->addKeyFrame(10, 10.0, 0);
     step->keyframeAtTime(10)->setInterpolater(LinearInterpolater<double>::getInstance());
     EXPECT_EQ(step->valueAtTime(9), 0.0);
-
     auto eased =
         InterpolatingParam<double>::create(project, "eased", 0.0, EaseInInterpolater<double>::getInstance());
     eased->addKeyFrame(10, 10.0, 0);
     EXPECT_DOUBLE_EQ(eased->valueAtTime(5), 2.5);
     eased->setParameterInterpolater(LinearInterpolater<double>::getInstance());
     EXPECT_DOUBLE_EQ(eased->valueAtTime(5), 5.0);
-
     auto source = ramp();
     auto diff = DiffParameter<double>::create(project, "diff", source);
     EXPECT_EQ(diff->valueAtTime(5), 5.0);
@@ -202,7 +198,6 @@ TEST_F(ParameterTest, MovesAndDifferencesKeepEveryLeadInWithinItsSegment) {
     parameter->moveKeyframes(2, atTen);
     EXPECT_EQ(observer.count, 1);
     parameter->detach(&observer);
-
     // A source keyframe arriving inside an edit's lead-in cuts that lead-in to start at it: the values stay,
     // and the curve may stand as it is.
     auto source = ramp();
@@ -230,7 +225,6 @@ TEST_F(ParameterTest, EqualityComparesWholeKeyFrames) {
     EXPECT_TRUE(*a == *b); // the same curve: linear is what the keyframe followed
     b->keyframeAtTime(10)->setInterpolater(EaseInInterpolater<double>::getInstance());
     EXPECT_FALSE(*a == *b);
-
     // Bezier paths compare their control points and temporal curve.
     const auto curve = [&](const Point3d& cp2, const char* temporal) {
         auto parameter = ParameterImpl<Point3d>::create(project, "p", Point3d(0, 0, 0));

@@ -31,7 +31,6 @@ protected:
         writer.join();
         EXPECT_EQ(witness->valueAtTime(RationalTime(0)), 1.0);
     }
-
     boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     Knob knob{project};
 };
