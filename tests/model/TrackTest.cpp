@@ -5,18 +5,15 @@
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
-#include <gtest/gtest.h>
-
 using namespace VelaMediaLib;
+using namespace VelaMediaLib::testing;
 
 namespace {
 
-class TrackTest : public ::testing::Test {
+class TrackTest : public ModelTest {
 protected:
-    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    boost::shared_ptr<ProjectEditRate> rate =
-        boost::make_shared<SimpleProjectEditRate>(boost::rational<unsigned long>(30));
     boost::shared_ptr<GenericTrack> track = GenericTrack::create(project);
+    TimelinePtr timeline = Timeline::create(project);
 
     MediaPtr clip(VelaTime duration) { return PlaceholderMedia::create(project, rate, 0, duration); }
     MediaPtr placed(VelaTime start, VelaTime duration) {
@@ -33,11 +30,16 @@ void expectCollision(const MediaPtr& media, Edit edit) {
     EXPECT_TRUE(media->state() == before);
 }
 
+// Audible, Visible, Renderable, Disabled.
+std::string flags(const Track& track) {
+    return std::string(track.isAudible() ? "A" : "-") + (track.isVisible() ? "V" : "-") +
+           (track.isRenderable() ? "R" : "-") + (track.isDisabled() ? "D" : "-");
+}
+
 } // namespace
 
 TEST_F(TrackTest, TouchingClipsFitOverlappingOnesCollide) {
-    const MediaPtr first = placed(0, 10);
-    const MediaPtr second = clip(10);
+    const MediaPtr first = placed(0, 10), second = clip(10);
     try {
         track->addMedia(second, 9);
         FAIL();
@@ -59,25 +61,23 @@ TEST_F(TrackTest, TouchingClipsFitOverlappingOnesCollide) {
 }
 
 TEST_F(TrackTest, MediaAtTimeGivesTheClipOrBothTouchingClips) {
-    const MediaPtr first = placed(0, 10), second = placed(10, 10), third = placed(30, 5);
-    EXPECT_EQ(track->mediaAtTime(10), Track::Pair(first, second));
-    EXPECT_EQ(track->mediaAtTime(5), Track::Pair(first, MediaPtr()));
-    EXPECT_EQ(track->mediaAtTime(25), Track::Pair());
-    EXPECT_EQ(track->mediaAtTime(20), Track::Pair()); // the end of a clip is not in it
-    EXPECT_EQ(track->mediaAtTime(30), Track::Pair(third, MediaPtr()));
-    EXPECT_EQ(track->mediaAtTime(-1), Track::Pair());
+    const MediaPtr first = placed(0, 10), second = placed(10, 10), third = placed(30, 5), none;
+    // The end of a clip is not in it.
+    for (const auto& at :
+         {std::make_pair(10, Track::Pair(first, second)), std::make_pair(5, Track::Pair(first, none)),
+          std::make_pair(25, Track::Pair()), std::make_pair(20, Track::Pair()),
+          std::make_pair(30, Track::Pair(third, none)), std::make_pair(-1, Track::Pair())})
+        EXPECT_EQ(track->mediaAtTime(at.first), at.second) << at.first;
     EXPECT_EQ(Track::getLeftOfMedia(third), second);
-    EXPECT_EQ(Track::getTouchingMediaToLeftOfMedia(third), MediaPtr());
+    EXPECT_EQ(Track::getTouchingMediaToLeftOfMedia(third), none);
     EXPECT_EQ(Track::getTouchingMediaToRightOfMedia(first), second);
-    EXPECT_EQ(Track::getRightOfMedia(third), MediaPtr());
-    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(5, 30), second),
-              (std::vector<MediaPtr>{first, third}));
-    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::vector<MediaPtr>{first, third}),
-              std::vector<MediaPtr>{second});
+    EXPECT_EQ(Track::getRightOfMedia(third), none);
+    using Clips = std::vector<MediaPtr>;
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(5, 30), second), (Clips{first, third}));
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), Clips{first, third}), Clips{second});
     EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(0, 40), std::set<MediaPtr>{second}).size(), 2u);
-    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(20, 10)),
-              std::vector<MediaPtr>()); // touching only
-    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(19, 11)), (std::vector<MediaPtr>{second}));
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(20, 10)), Clips()); // touching only
+    EXPECT_EQ(track->mediasIntersectingRange(Range<VelaTime>(19, 11)), Clips{second});
     const auto parts = track->subSection(Range<VelaTime>(5, 27));
     ASSERT_EQ(parts.size(), 3u);
     EXPECT_EQ(parts[0].range, Range<VelaTime>(5, 5));
@@ -113,7 +113,6 @@ TEST_F(TrackTest, EditsThatWouldCollideChangeNothing) {
 }
 
 TEST_F(TrackTest, SoloDecidesOverMuteAndHide) {
-    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
     const auto mixer = timeline->newMixer("main");
     std::vector<TrackPtr> tracks;
     for (int i = 0; i < 3; ++i) {
@@ -122,23 +121,14 @@ TEST_F(TrackTest, SoloDecidesOverMuteAndHide) {
     }
     tracks[0]->audioMutedAttribute()->setValue(true);
     tracks[1]->videoHiddenAttribute()->setValue(true);
-    EXPECT_FALSE(tracks[0]->isAudible());
-    EXPECT_TRUE(tracks[0]->isVisible());
-    EXPECT_FALSE(tracks[1]->isVisible());
-    EXPECT_TRUE(tracks[2]->isRenderable());
-    EXPECT_TRUE(tracks[0]->isRenderable()); // muted, still seen
-    EXPECT_TRUE(tracks[1]->isRenderable()); // hidden, still heard
+    EXPECT_EQ(flags(*tracks[0]) + flags(*tracks[1]) + flags(*tracks[2]), "-VR-A-R-AVR-");
     tracks[1]->audioMutedAttribute()->setValue(true);
-    EXPECT_TRUE(tracks[1]->isDisabled()); // neither
+    EXPECT_EQ(flags(*tracks[1]), "---D");
     tracks[1]->audioMutedAttribute()->setValue(false);
     tracks[0]->soloAttribute()->setValue(true);
     EXPECT_TRUE(mixer->isInSoloMode());
-    EXPECT_TRUE(tracks[0]->isAudible()); // solo overrides its mute
-    EXPECT_TRUE(tracks[0]->isVisible());
-    EXPECT_FALSE(tracks[2]->isAudible());
-    EXPECT_FALSE(tracks[2]->isVisible());
-    EXPECT_FALSE(tracks[2]->isRenderable());
-    EXPECT_TRUE(tracks[2]->isDisabled());
+    EXPECT_EQ(flags(*tracks[0]) + flags(*tracks[1]) + flags(*tracks[2]),
+              "AVR----D---D"); // solo overrides mute
     EXPECT_TRUE(LockData::IsTrackInvisible(*tracks[1]));
 }
 
@@ -174,19 +164,16 @@ TEST_F(TrackTest, MixerIndexRulesAndPuttingATrackBack) {
 }
 
 TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
-    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
     EXPECT_FALSE(timeline->mixer());
     const auto second = timeline->newMixer("b"), first = timeline->newMixer("a");
     EXPECT_EQ(timeline->mixer(), first);
     EXPECT_EQ(timeline->mixerNames(), (std::vector<std::string>{"a", "b"}));
     struct Recorder : TimelineAddObserver {
-        std::vector<std::string> events;
-        void onTimelineAddTrack(Timeline&, Mixer&, const TrackPtr&) override { events.push_back("track+"); }
-        void onTimelineRemoveTrack(Timeline&, Mixer&, const TrackPtr&) override {
-            events.push_back("track-");
-        }
-        void onTimelineAddMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip+"); }
-        void onTimelineRemoveMedia(Timeline&, Track&, const MediaPtr&) override { events.push_back("clip-"); }
+        std::string events;
+        void onTimelineAddTrack(Timeline&, Mixer&, const TrackPtr&) override { events += "T+"; }
+        void onTimelineRemoveTrack(Timeline&, Mixer&, const TrackPtr&) override { events += "T-"; }
+        void onTimelineAddMedia(Timeline&, Track&, const MediaPtr&) override { events += "C+"; }
+        void onTimelineRemoveMedia(Timeline&, Track&, const MediaPtr&) override { events += "C-"; }
     } recorder;
     timeline->attachAddObserver(&recorder);
     const auto upper = timeline->newTrack(), lower = timeline->newTrack();
@@ -202,45 +189,25 @@ TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
     EXPECT_EQ(timeline->instancesOf<PlaceholderMedia>().size(), 2u);
     EXPECT_FALSE(timeline->hasInstanceOf<ColorMedia>());
     upper->removeMedia(a);
-    try {
-        timeline->removeTrack(first, lower);
-        FAIL();
-    } catch (const VelaMediaLibException& e) {
-        EXPECT_STREQ(e.what(), "track doesn't belong to project");
-    }
-    const RemoveTrackInfo info = timeline->removeTrack(second, lower);
-    EXPECT_EQ(info.track, lower);
-    EXPECT_EQ(recorder.events,
-              (std::vector<std::string>{"track+", "track+", "clip+", "clip+", "clip-", "track-"}));
-    try {
-        timeline->removeMixer(GenericMixer::create(project));
-        FAIL();
-    } catch (const VelaMediaLibException& e) {
-        EXPECT_STREQ(e.what(), "unable to find mixer");
-    }
+    expectThrows<VelaMediaLibException>("track doesn't belong to project",
+                                        [&] { timeline->removeTrack(first, lower); });
+    EXPECT_EQ(timeline->removeTrack(second, lower).track, lower);
+    EXPECT_EQ(recorder.events, "T+T+C+C+C-T-");
+    expectThrows<VelaMediaLibException>("unable to find mixer",
+                                        [&] { timeline->removeMixer(GenericMixer::create(project)); });
     timeline->removeMixer(second);
     EXPECT_EQ(timeline->mixerNames(), std::vector<std::string>{"a"});
     timeline->detachAddObserver(&recorder);
 }
 
 TEST_F(TrackTest, AMixerBelongsToATimelineOrAGroupNeverBoth) {
-    const boost::shared_ptr<Timeline> timeline = Timeline::create(project);
-    const auto owned = timeline->newMixer("main");
+    const auto owned = timeline->newMixer("main"), grouped = GenericMixer::create(project);
     const MediaPtr group = clip(10);
-    try {
-        owned->setParentGroup(group);
-        FAIL();
-    } catch (const VelaMediaLibException& e) {
-        EXPECT_STREQ(e.what(), "Cannot set parent group on a mixer that has a parent timeline");
-    }
-    const auto grouped = GenericMixer::create(project);
+    expectThrows<VelaMediaLibException>("Cannot set parent group on a mixer that has a parent timeline",
+                                        [&] { owned->setParentGroup(group); });
     grouped->setParentGroup(group);
-    try {
-        timeline->addMixer("other", grouped);
-        FAIL();
-    } catch (const VelaMediaLibException& e) {
-        EXPECT_STREQ(e.what(), "Cannot set parent timeline on a mixer that has a parent group");
-    }
+    expectThrows<VelaMediaLibException>("Cannot set parent timeline on a mixer that has a parent group",
+                                        [&] { timeline->addMixer("other", grouped); });
     EXPECT_EQ(timeline->mixerNames(), std::vector<std::string>{"main"});
 }
 
@@ -266,9 +233,8 @@ TEST_F(TrackTest, CopiesAndLocks) {
     EXPECT_TRUE(LockData::IsMediaLocked(*first));
     EXPECT_FALSE(LockData::IsMediaEditable(*second));
     EXPECT_FALSE(LockData::IsMediaLocked(*clip(3)));
-    bool stoppedEarly =
-        track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; });
-    EXPECT_TRUE(stoppedEarly);
+    EXPECT_TRUE(
+        track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; }));
 }
 
 TEST_F(TrackTest, TransitionsAreJoinedAgainWhenTouchingClipsMeet) {
@@ -280,45 +246,42 @@ TEST_F(TrackTest, TransitionsAreJoinedAgainWhenTouchingClipsMeet) {
     EXPECT_EQ(shared->leftMedia(), first);
     EXPECT_EQ(shared->rightMedia(), second);
     EXPECT_EQ(track->transitions().size(), 1u);
-    const Track::TransitionAndNeighbour separated = track->move(first, -5);
-    EXPECT_EQ(separated.first, shared);
-    EXPECT_EQ(separated.second, second);
+    EXPECT_EQ(track->move(first, -5), Track::TransitionAndNeighbour(shared, second));
 }
 
 TEST(TimelineCamera, RightAndLeftHandedTransforms) {
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const auto timeline = Timeline::create(project, 1920, 1080);
-    EXPECT_EQ(timeline->eyeLookAtPositionParam()->valueAtTime(RationalTime(0)), Point3d(0, 0, 0));
-    EXPECT_EQ(timeline->eyeUpVectorParam()->valueAtTime(RationalTime(0)), Point3d(0, 1, 0));
-    EXPECT_EQ(timeline->fovParam()->valueAtTime(RationalTime(0)), 45.0);
-    EXPECT_EQ(timeline->farClipDistanceParam()->valueAtTime(RationalTime(0)), 100000.0);
-    EXPECT_EQ(timeline->newTrack()->volume()->valueAtTime(RationalTime(0)), 1.0);
+    const RationalTime zero(0);
+    EXPECT_EQ(timeline->eyeLookAtPositionParam()->valueAtTime(zero), Point3d(0, 0, 0));
+    EXPECT_EQ(timeline->eyeUpVectorParam()->valueAtTime(zero), Point3d(0, 1, 0));
+    EXPECT_EQ(timeline->fovParam()->valueAtTime(zero), 45.0);
+    EXPECT_EQ(timeline->farClipDistanceParam()->valueAtTime(zero), 100000.0);
+    EXPECT_EQ(timeline->newTrack()->volume()->valueAtTime(zero), 1.0);
     const auto track = timeline->newTrack();
     timeline->addTrack(timeline->newMixer("main"), track);
     track->addMedia(PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 10), 0);
     EXPECT_EQ(timeline->swapSourceForTimelineMedias(nullptr, nullptr), 0u); // no clip has a source
     timeline->eyePositionParam()->setDefaultValue(Point3d(0, 0, 10));
-    const Point3d origin = timeline->cameraTransformAtTime(RationalTime(0)).apply(Point3d(0, 0, 0));
-    EXPECT_NEAR(origin.z, -10.0, 1e-12);
-    const Point3d originLH = timeline->cameraTransformAtTimeLH(RationalTime(0)).apply(Point3d(0, 0, 0));
-    EXPECT_NEAR(originLH.z, 10.0, 1e-12);
-    EXPECT_NEAR(timeline->cameraTransformAtTime(RationalTime(0)).apply(Point3d(1, 0, 0)).x, 1.0, 1e-12);
-    EXPECT_NEAR(timeline->cameraTransformAtTimeLH(RationalTime(0)).apply(Point3d(1, 0, 0)).x, -1.0, 1e-12);
+    const TransformMatrix right = timeline->cameraTransformAtTime(zero),
+                          left = timeline->cameraTransformAtTimeLH(zero);
+    EXPECT_NEAR(right.apply(Point3d(0, 0, 0)).z, -10.0, 1e-12);
+    EXPECT_NEAR(left.apply(Point3d(0, 0, 0)).z, 10.0, 1e-12);
+    EXPECT_NEAR(right.apply(Point3d(1, 0, 0)).x, 1.0, 1e-12);
+    EXPECT_NEAR(left.apply(Point3d(1, 0, 0)).x, -1.0, 1e-12);
     // The default camera shows the canvas exactly: its corners land on the screen's corners.
     timeline->eyePositionParam()->setDefaultValue(Point3d(0, 0, 540.0 / std::tan(M_PI / 8)));
-    const TransformMatrix screen = timeline->calcScreenTransformAtTime(RationalTime(0));
-    auto project2d = [&](const Point3d& p) {
-        const TransformMatrix& m = screen;
+    const TransformMatrix m = timeline->calcScreenTransformAtTime(zero);
+    auto onScreen = [&](const Point3d& p) {
         const double w = m.at(3, 0) * p.x + m.at(3, 1) * p.y + m.at(3, 2) * p.z + m.at(3, 3);
         const Point3d q = m.apply(p);
         return Point3d(q.x / w, q.y / w, 0);
     };
-    const Point3d topLeft = project2d(Point3d(-960, 540, 0));
-    EXPECT_NEAR(topLeft.x, 0.0, 1e-6);
-    EXPECT_NEAR(topLeft.y, 0.0, 1e-6);
+    for (const auto& corner : {std::make_pair(Point3d(-960, 540, 0), Point3d(0, 0, 0)),
+                               std::make_pair(Point3d(960, -540, 0), Point3d(1920, 1080, 0))}) {
+        EXPECT_NEAR(onScreen(corner.first).x, corner.second.x, 1e-6);
+        EXPECT_NEAR(onScreen(corner.first).y, corner.second.y, 1e-6);
+    }
     const TransformerImpl& placement = *timeline; // the timeline places its content unchanged
     EXPECT_EQ(placement.transformAtTime(RationalTime(3)), TransformMatrix());
-    const Point3d bottomRight = project2d(Point3d(960, -540, 0));
-    EXPECT_NEAR(bottomRight.x, 1920.0, 1e-6);
-    EXPECT_NEAR(bottomRight.y, 1080.0, 1e-6);
 }

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/CaptionData.h>
+#include <VelaMediaLib/base/IdentManager.h>
 #include <VelaMediaLib/base/KeystrokeData.h>
 #include <VelaMediaLib/base/Rect.h>
 #include <VelaMediaLib/base/TemplatedColor.h>
@@ -69,4 +70,14 @@ TEST(TextAttributeList, RunsStayInsideTheText) {
     EXPECT_EQ(text.attributeAt(1, "bold"), "true");
     EXPECT_EQ(text.attributeAt(4, "bold"), "false"); // the later run wins
     EXPECT_EQ(text.attributeAt(9, "bold"), "");
+}
+
+TEST(IdentManager, RetiredIdentifiersComeBackLastInFirstOut) {
+    IdentManager manager;
+    for (uint32_t expected = 0; expected < 9; ++expected) EXPECT_EQ(manager.newIdent(), expected);
+    manager.retireIdent(5);
+    manager.retireIdent(7);
+    EXPECT_EQ(manager.newIdent(), 7u);
+    EXPECT_EQ(manager.newIdent(), 5u);
+    EXPECT_EQ(manager.newIdent(), 9u);
 }
