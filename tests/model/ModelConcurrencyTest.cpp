@@ -3,8 +3,6 @@
 #include "../ThreadTestSupport.h"
 #include "MediaTestSupport.h"
 
-#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
-#include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/model/media/MediaEditor.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
@@ -147,62 +145,4 @@ TEST(TrackConcurrency, EditsRacingForTheSameGapNeverOverlap) {
     ScopedReadLock lock(project);
     for (auto entry = track->mediaBegin(); entry != track->mediaEnd(); ++entry)
         EXPECT_EQ(entry->first, entry->second->lockedTrackRange().start()); // keyed where they stand
-}
-
-// A reader's snapshot stays one: first touching a clip's parameters, editor
-// and metadata inside it must not let the editing thread in, while another
-// thread attaches and detaches observers on the same clips.
-TEST(SnapshotConcurrency, FirstUseInsideASnapshotKeepsItWhole) {
-    Deadline deadline;
-    const ProjectPtr project = Project::create(30, 1);
-    const auto track = project->timeline()->newTrack();
-    project->timeline()->addTrack(project->newMixer("main"), track);
-    track->magneticAttribute()->setValue(true);
-    auto placement = [&] {
-        std::vector<std::pair<MediaPtr, VelaTime>> placed;
-        for (const MediaPtr& clip : track->medias()) placed.emplace_back(clip, clip->startTime());
-        return placed;
-    };
-    std::atomic<bool> done{false};
-    std::atomic<int> torn{0}, snapshots{0};
-    auto reader = [&] {
-        while (!done.load()) {
-            ScopedReadLock snapshot(project->token());
-            const auto before = placement();
-            for (const auto& placed : before) {
-                const auto clip = boost::dynamic_pointer_cast<PlaceholderMedia>(placed.first);
-                clip->opacity()->valueAtTime(RationalTime(3));
-                clip->mediaEditor();
-                clip->metaDataValue("note");
-            }
-            if (placement() != before) ++torn;
-            ++snapshots;
-        }
-    };
-    VelaMediaLib::testing::BlockingObserver observer;
-    observer.body = [](Observable*) {};
-    auto observe = [&](bool attach) {
-        for (const MediaPtr& clip : track->medias())
-            attach ? clip->attach(&observer) : clip->detach(&observer);
-        attach ? track->attach(&observer) : track->detach(&observer);
-    };
-    std::thread first(reader), second(reader), observing([&] {
-        while (!done.load()) observe(true), observe(false);
-    });
-    for (int i = 0; i < 300; ++i) {
-        const auto clip = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
-        project->execute(AddMediaCmd::create(track, clip, track->endTime()));
-        if (i % 2) project->execute(MoveCmd::create(track, clip, 3)); // the gap closes after it
-        if (i % 3 == 0) project->undo();
-    }
-    done = true;
-    first.join(), second.join(), observing.join();
-    observe(false);
-    EXPECT_EQ(torn.load(), 0);
-    EXPECT_GT(snapshots.load(), 0);
-    VelaTime expected = 0;
-    for (const auto& placed : placement()) {
-        EXPECT_EQ(placed.second, expected);
-        expected = placed.first->endTime();
-    }
 }
