@@ -45,15 +45,8 @@ public:
 inline MediaState timing(VelaTime start, VelaTime duration, SafeRational mediaStart,
                          SafeRational mediaDuration, SafeRational scalar, SafeRational minStart,
                          SafeRational maxEnd) {
-    MediaState state;
-    state.start = start;
-    state.duration = duration;
-    state.mediaStart = mediaStart;
-    state.mediaDuration = mediaDuration;
-    state.scalar = scalar;
-    state.minMediaStart = minStart;
-    state.maxMediaEnd = maxEnd;
-    return state;
+    return MediaState{start,    duration, mediaStart, mediaDuration, scalar,
+                      minStart, maxEnd,   false,      RationalTime()};
 }
 
 class ModelTest : public ::testing::Test {
@@ -75,6 +68,7 @@ std::optional<Exception> thrown(Edit edit) {
     return std::nullopt;
 }
 
+/// The edit throws an Exception that says the message.
 template <typename Exception, typename Edit>
 void expectThrows(const std::string& message, Edit edit) {
     const auto e = thrown<Exception>(edit);

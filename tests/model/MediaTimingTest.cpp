@@ -124,7 +124,6 @@ TEST_F(MediaTiming, StretchAndTheOlderEditors) {
     auto media = PlaceholderMedia::create(project, rate, 0, 100);
     expectRefused<ValueException<double>>(*media, "invalid duration after media stretch (<=0)",
                                           [&] { media->rationalStretch(SafeRational(1, 1000)); });
-    EXPECT_THROW(media->rationalStretch(SafeRational(-2)), ValueException<double>);
     // Previews refuse what the edit refuses and change nothing.
     EXPECT_THROW(media->trackRangeWithRationalStretch(SafeRational(1, 1000)), ValueException<double>);
     EXPECT_THROW(media->trackRangeWithStretch(-2.0), ValueException<double>);

@@ -90,9 +90,9 @@ TEST_F(ModelNotification, EditsThatChangeNothingTellNobody) {
     media->setLeftEdgeModificationLength(4);
     EXPECT_EQ(counter.count, 0);
     media->move(1);
-    EXPECT_EQ(counter.count, 1);
-    EXPECT_EQ(counter.last, static_cast<Observable*>(media.get()));
     media->detach(&counter);
+    EXPECT_EQ(std::make_pair(counter.count, counter.last),
+              std::make_pair(1, static_cast<Observable*>(media.get())));
 }
 
 TEST_F(ModelNotification, ATransitionLetsGoOfTheClipThatDropsItAndItsObserversHearTheClip) {
@@ -104,18 +104,16 @@ TEST_F(ModelNotification, ATransitionLetsGoOfTheClipThatDropsItAndItsObserversHe
     media->setRightTransition(first);
     media->setLeftTransition(second);
     other->setLeftTransition(TransitionPtr(new Transition("fade", 3)));
-    EXPECT_EQ(onMedia.last, static_cast<Observable*>(media.get()));
-    EXPECT_EQ(onOther.last, static_cast<Observable*>(other.get()));
+    EXPECT_EQ((std::vector<Observable*>{onMedia.last, onOther.last}),
+              (std::vector<Observable*>{media.get(), other.get()}));
     media->transitionAddRemoveObservable().detach(&onMedia);
     other->transitionAddRemoveObservable().detach(&onOther);
-    EXPECT_EQ(first->leftMedia(), media);
-    EXPECT_EQ(second->rightMedia(), media);
+    using Clips = std::vector<MediaPtr>;
+    EXPECT_EQ(Clips({first->leftMedia(), second->rightMedia()}), Clips({media, media}));
     media->setRightTransition(second); // replaced: the first lets go
-    EXPECT_FALSE(first->leftMedia());
-    EXPECT_EQ(second->leftMedia(), media);
+    EXPECT_EQ(Clips({first->leftMedia(), second->leftMedia()}), Clips({nullptr, media}));
     media->setLeftTransition(TransitionPtr()); // cleared: it lets go of that side
-    EXPECT_FALSE(second->rightMedia());
-    EXPECT_EQ(second->leftMedia(), media);
+    EXPECT_EQ(Clips({second->rightMedia(), second->leftMedia()}), Clips({nullptr, media}));
 }
 
 // One token serves every part of an object: the metadata, the parameters and
@@ -124,9 +122,9 @@ TEST(ProjectToken, EveryPartOfAClipAsksTheOneToken) {
     const ProjectPtr project = Project::create(30, 1);
     const auto clip = PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 10);
     EXPECT_EQ(&clip->projectMutex(), &clip->metaDataProjectMutex());
-    EXPECT_TRUE(sameProject(clip->projectMutex(), project));
-    EXPECT_TRUE(sameProject(clip->attributeOrAdd<int>("count", 0)->projectMutex(), project));
-    EXPECT_TRUE(sameProject(clip->addMetaData("tag", "a")->projectMutex(), project));
+    EXPECT_TRUE(sameProject(clip->projectMutex(), project) &&
+                sameProject(clip->attributeOrAdd<int>("count", 0)->projectMutex(), project) &&
+                sameProject(clip->addMetaData("tag", "a")->projectMutex(), project));
     EXPECT_EQ(clip->mutex(), &project->mutex());
 }
 
@@ -136,10 +134,10 @@ TEST(ProjectToken, SettingTheTokenReachesEveryPart) {
     const auto first = boost::make_shared<ThreadSafe>(), second = boost::make_shared<ThreadSafe>();
     Part part(first);
     part.setMetaDataProjectMutex(second);
-    EXPECT_TRUE(sameProject(part.projectMutex(), second));
-    EXPECT_TRUE(sameProject(part.parameter("level")->projectMutex(), second));
-    EXPECT_TRUE(sameProject(part.attributeOrAdd<bool>("flag", false)->projectMutex(), second));
-    EXPECT_TRUE(sameProject(part.addMetaData("tag", "b")->projectMutex(), second));
+    EXPECT_TRUE(sameProject(part.projectMutex(), second) &&
+                sameProject(part.parameter("level")->projectMutex(), second) &&
+                sameProject(part.attributeOrAdd<bool>("flag", false)->projectMutex(), second) &&
+                sameProject(part.addMetaData("tag", "b")->projectMutex(), second));
     struct Late : public Parametric, public Attributable {
         explicit Late(const boost::weak_ptr<const ThreadSafe>& token) : Parametric(token), Attributable() {}
     } late(first);
@@ -163,8 +161,7 @@ TEST(ProjectToken, SubjectsAreHeldBackByTheProjectsDelay) {
         project->notify();
         EXPECT_EQ(onClip.count + onProject.count, 0);
     }
-    EXPECT_EQ(onClip.count, 1);
-    EXPECT_EQ(onProject.count, 1);
+    EXPECT_EQ(std::make_pair(onClip.count, onProject.count), std::make_pair(1, 1));
     EXPECT_EQ(onProject.last, static_cast<Observable*>(project.get()));
     project->detach(&onProject);
     {
