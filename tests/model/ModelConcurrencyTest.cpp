@@ -1,7 +1,6 @@
+// Readers see whole states while others edit, first uses inside a snapshot
+// take no write lock, and walks never meet a mixer half gone.
 #include "../ThreadTestSupport.h"
-
-// Readers inside a snapshot take no write lock, and timeline walks never
-// meet a mixer half gone. Each test carries its own deadline.
 #include "MediaTestSupport.h"
 
 #include <VelaMediaLib/model/media/MediaEditor.h>
@@ -10,72 +9,84 @@
 
 #include <atomic>
 #include <chrono>
-#include <condition_variable>
-#include <gtest/gtest.h>
-#include <mutex>
 #include <thread>
 
 using namespace VelaMediaLib;
+using VelaMediaLib::testing::Deadline;
 
 namespace {
 
-const auto kDeadline = std::chrono::seconds(20);
+const boost::weak_ptr<ProjectEditRate> noRate;
+const auto kLimit = std::chrono::seconds(20);
+
+bool before(std::chrono::steady_clock::time_point until) { return std::chrono::steady_clock::now() < until; }
 
 } // namespace
 
+TEST(MediaConcurrency, ReadersSeeWholeStatesWhileAWriterTrims) {
+    Deadline deadline;
+    const auto project = boost::make_shared<ThreadSafe>();
+    const auto media = PlaceholderMedia::create(project, noRate, 0, 1000);
+    std::atomic<bool> done{false};
+    std::atomic<int> torn{0};
+    auto read = [&] {
+        while (!done.load()) {
+            const MediaState state = media->state();
+            if (state.start + state.duration != 1000 || state.mediaStart != SafeRational(state.start)) ++torn;
+            media->validTrimStart(1);
+            media->opacity()->valueAtTime(RationalTime(5));
+        }
+    };
+    std::thread first(read), second(read);
+    for (int i = 0; i < 2000; ++i) {
+        media->trimStart(5);
+        media->trimStart(-5);
+    }
+    done = true;
+    first.join();
+    second.join();
+    EXPECT_EQ(torn.load(), 0);
+}
+
+// Another reader holds its share until this one is done: a write lock asked
+// for meanwhile would wait for that share until the other gives up.
 TEST(MediaConcurrency, TheOlderEditorIsMadeInsideAReadersSnapshotWithoutTheWriteLock) {
-    VelaMediaLib::testing::Deadline watchdog;
-    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    const auto media = PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 100);
-    std::mutex mutex;
-    std::condition_variable changed;
-    bool otherReading = false, done = false, otherTimedOut = false;
-    // Another reader holds its share until this one is done, or until its
-    // deadline: a write lock asked for meanwhile waits for that share.
+    Deadline deadline;
+    const auto project = boost::make_shared<ThreadSafe>();
+    const auto media = PlaceholderMedia::create(project, noRate, 0, 100);
+    std::atomic<bool> otherReading{false}, done{false}, otherGaveUp{false};
     std::thread other([&] {
         ScopedReadLock lock(project);
-        std::unique_lock<std::mutex> guard(mutex);
         otherReading = true;
-        changed.notify_all();
-        otherTimedOut = !changed.wait_for(guard, kDeadline, [&] { return done; });
+        otherGaveUp = !VelaMediaLib::testing::waitFor(done, kLimit);
     });
-    {
-        std::unique_lock<std::mutex> guard(mutex);
-        changed.wait(guard, [&] { return otherReading; });
-    }
+    while (!otherReading.load()) std::this_thread::yield();
     {
         ScopedReadLock snapshot(project);
-        const VelaTime before = media->startTime();
         MediaEditor& editor = media->mediaEditor(); // first use, inside the snapshot
         EXPECT_EQ(&editor, &media->mediaEditor());
         EXPECT_EQ(editor.trimEndLimit(), 0);
-        EXPECT_EQ(media->startTime(), before);
+        EXPECT_EQ(media->startTime(), 0);
     }
-    {
-        std::lock_guard<std::mutex> guard(mutex);
-        done = true;
-    }
-    changed.notify_all();
+    done = true;
     other.join();
-    EXPECT_FALSE(otherTimedOut) << "making the editor waited for the other reader";
+    EXPECT_FALSE(otherGaveUp) << "making the editor waited for the other reader";
 }
 
 TEST(MediaConcurrency, ThreadsMakingTheOlderEditorAtOnceShareOne) {
-    VelaMediaLib::testing::Deadline watchdog;
-    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    const auto media = PlaceholderMedia::create(project, boost::weak_ptr<ProjectEditRate>(), 0, 100);
-    std::atomic<MediaEditor*> seen[2] = {{nullptr}, {nullptr}};
-    std::thread first([&] { seen[0] = &media->mediaEditor(); });
-    seen[1] = &media->mediaEditor();
+    Deadline deadline;
+    const auto media = PlaceholderMedia::create(boost::make_shared<ThreadSafe>(), noRate, 0, 100);
+    std::atomic<MediaEditor*> seen{nullptr};
+    std::thread first([&] { seen = &media->mediaEditor(); });
+    MediaEditor* const mine = &media->mediaEditor();
     first.join();
-    EXPECT_EQ(seen[0].load(), seen[1].load());
+    EXPECT_EQ(seen.load(), mine);
 }
 
 TEST(TimelineConcurrency, WalksOverMixersSurviveMixersComingAndGoing) {
-    VelaMediaLib::testing::Deadline watchdog;
-    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    Deadline deadline;
+    const auto project = boost::make_shared<ThreadSafe>();
     const TimelinePtr timeline = Timeline::create(project);
-    const boost::weak_ptr<ProjectEditRate> noRate;
     std::vector<MixerPtr> mixers;
     for (int i = 0; i < 3; ++i) {
         const auto mixer = GenericMixer::create(project);
@@ -85,24 +96,53 @@ TEST(TimelineConcurrency, WalksOverMixersSurviveMixersComingAndGoing) {
         mixers.push_back(mixer);
         timeline->addMixer("m" + std::to_string(i), mixer);
     }
-    const auto deadline = std::chrono::steady_clock::now() + kDeadline;
+    const auto until = std::chrono::steady_clock::now() + kLimit;
     std::atomic<bool> done{false};
     std::atomic<int> wrong{0};
     std::thread reader([&] {
-        while (!done.load() && std::chrono::steady_clock::now() < deadline) {
+        while (!done.load() && before(until)) {
             // Each walk sees two or three whole mixers, never a missing one.
             const size_t tracks = timeline->numTracks(), clips = timeline->allMedias().size();
-            const VelaTime end = timeline->endTime();
-            const VelaTime seen = timeline->endTimeNotIncludingHiddenAndMutedTracks();
+            const VelaTime end = timeline->endTime(),
+                           seen = timeline->endTimeNotIncludingHiddenAndMutedTracks();
             if (tracks < 2 || tracks > 3 || clips < 2 || clips > 3 || end < 20 || seen < 20) ++wrong;
         }
     });
-    for (int i = 0; i < 3000 && std::chrono::steady_clock::now() < deadline; ++i) {
-        const MixerPtr& mixer = mixers[size_t(i % 3)];
-        timeline->removeMixer(mixer);
-        timeline->addMixer("m" + std::to_string(i % 3), mixer);
+    for (int i = 0; i < 3000 && before(until); ++i) {
+        timeline->removeMixer(mixers[size_t(i % 3)]);
+        timeline->addMixer("m" + std::to_string(i % 3), mixers[size_t(i % 3)]);
     }
     done = true;
     reader.join();
     EXPECT_EQ(wrong.load(), 0);
+}
+
+TEST(TrackConcurrency, EditsRacingForTheSameGapNeverOverlap) {
+    Deadline deadline;
+    const auto project = boost::make_shared<ThreadSafe>();
+    const auto track = GenericTrack::create(project);
+    const MediaPtr left = PlaceholderMedia::create(project, noRate, 0, 10);
+    const MediaPtr right = PlaceholderMedia::create(project, noRate, 0, 10);
+    track->addMedia(left, 0);
+    track->addMedia(right, 12); // a two-tick gap both reach for
+    const auto until = std::chrono::steady_clock::now() + kLimit;
+    std::atomic<int> overlaps{0};
+    auto jiggle = [&](const MediaPtr& clip, VelaTime towards) {
+        for (int i = 0; i < 3000 && before(until); ++i) {
+            for (const VelaTime step : {towards, -towards}) {
+                try {
+                    i % 2 ? clip->move(step) : (void)track->move(clip, step);
+                } catch (const CollisionException&) {}
+            }
+            ScopedReadLock lock(project); // both ranges at one moment
+            if (left->lockedTrackRange().end() > right->lockedTrackRange().start()) ++overlaps;
+        }
+    };
+    std::thread other([&] { jiggle(right, -2); });
+    jiggle(left, 2);
+    other.join();
+    EXPECT_EQ(overlaps.load(), 0);
+    ScopedReadLock lock(project);
+    for (auto entry = track->mediaBegin(); entry != track->mediaEnd(); ++entry)
+        EXPECT_EQ(entry->first, entry->second->lockedTrackRange().start()); // keyed where they stand
 }

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/base/AudioPosition.h>
 #include <VelaMediaLib/base/CaptionData.h>
+#include <VelaMediaLib/base/IdentManager.h>
 #include <VelaMediaLib/base/KeystrokeData.h>
 #include <VelaMediaLib/base/Rect.h>
 #include <VelaMediaLib/base/TemplatedColor.h>
@@ -19,9 +20,9 @@ template <typename T>
 void expectEachMemberCounts(const T& value, const std::vector<T>& oneMemberChanged) {
     EXPECT_TRUE(value == value);
     EXPECT_FALSE(value != value);
-    for (const T& other : oneMemberChanged) {
-        EXPECT_FALSE(value == other) << other;
-        EXPECT_TRUE(value != other) << other;
+    for (size_t i = 0; i < oneMemberChanged.size(); ++i) {
+        EXPECT_FALSE(value == oneMemberChanged[i]) << "change " << i;
+        EXPECT_TRUE(value != oneMemberChanged[i]) << "change " << i;
     }
 }
 
@@ -43,11 +44,8 @@ TEST(ValueTypes, EveryMemberTakesPartInEquality) {
         changed.emplace_back(one);
     }
     expectEachMemberCounts(TransformMatrix(elements), changed);
-    const ScaledTimeRange range(30, 10, 5);
-    EXPECT_TRUE(range == ScaledTimeRange(30, 10, 5));
-    EXPECT_FALSE(range != ScaledTimeRange(30, 10, 5));
-    EXPECT_TRUE(range != ScaledTimeRange(30, 11, 5));
-    EXPECT_TRUE(range != ScaledTimeRange(30, 10, 6));
+    expectEachMemberCounts(ScaledTimeRange(30, 10, 5),
+                           {ScaledTimeRange(30, 11, 5), ScaledTimeRange(30, 10, 6)});
 }
 
 TEST(TransformMatrix, ComposesRightToLeft) {
@@ -69,4 +67,14 @@ TEST(TextAttributeList, RunsStayInsideTheText) {
     EXPECT_EQ(text.attributeAt(1, "bold"), "true");
     EXPECT_EQ(text.attributeAt(4, "bold"), "false"); // the later run wins
     EXPECT_EQ(text.attributeAt(9, "bold"), "");
+}
+
+TEST(IdentManager, RetiredIdentifiersComeBackLastInFirstOut) {
+    IdentManager manager;
+    for (uint32_t expected = 0; expected < 9; ++expected) EXPECT_EQ(manager.newIdent(), expected);
+    manager.retireIdent(5);
+    manager.retireIdent(7);
+    EXPECT_EQ(manager.newIdent(), 7u);
+    EXPECT_EQ(manager.newIdent(), 5u);
+    EXPECT_EQ(manager.newIdent(), 9u);
 }
