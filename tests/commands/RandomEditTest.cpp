@@ -4,25 +4,21 @@
 // keyframed parameter, edited too. After every step the model must hold its
 // invariants, a refused edit must have changed nothing, and at the end
 // undoing everything and redoing everything must give back the exact states.
-#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include "EditTestSupport.h"
+
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
-#include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
-#include <VelaMediaLib/document/format/XMLOptions.h>
-#include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/time/rational/RationalUtil.h>
 
-#include <algorithm>
 #include <boost/make_shared.hpp>
 #include <functional>
-#include <gtest/gtest.h>
 #include <limits>
 #include <random>
-#include <sstream>
 
 using namespace VelaMediaLib;
+using namespace VelaMediaLib::testing;
 
 namespace {
 
@@ -38,92 +34,38 @@ struct HostCmd : Command {
     Undo undo;
 };
 
-boost::shared_ptr<Parameter<double>> opacityOf(const MediaPtr& clip) {
-    return boost::dynamic_pointer_cast<VisualMedia>(clip)->opacity();
-}
-
-boost::shared_ptr<GenericTrack> parentOf(const MediaPtr& clip) {
-    boost::shared_ptr<GenericTrack> parent;
-    clip->parentVisitor([&](const boost::shared_ptr<SubTimeline>& p) {
-        parent = boost::dynamic_pointer_cast<GenericTrack>(p);
-    });
-    return parent;
-}
-
-template <typename T>
-std::string indexIn(const std::vector<T>& all, const T& one) {
-    const auto found = std::find(all.begin(), all.end(), one);
-    return !one ? "-" : found == all.end() ? "?" : std::to_string(found - all.begin());
-}
-
-class RandomEdits {
-public:
-    ProjectPtr project = Project::create(30, 1);
-
+class RandomEdits : public EditTest {
+protected:
     RandomEdits() {
-        const auto mixer = project->newMixer("main");
-        for (int i = 0; i < 3; ++i) {
-            tracks_.push_back(project->timeline()->newTrack());
-            project->timeline()->addTrack(mixer, tracks_.back());
-        }
+        newTrack();
+        newTrack();
         const SafeRational scalars[] = {1, SafeRational(3, 2), SafeRational(2, 3), SafeRational(1, 3)};
         VelaTime ends[3] = {0, 0, 0};
         for (int i = 0; i < 14; ++i) {
             const long long mediaDurations[] = {10, 17, 30, 41};
-            clips_.push_back(
-                PlaceholderMedia::createFromMediaRange(project->token(), project->editRateToken(), 0, i % 3,
-                                                       mediaDurations[i % 4], scalars[i / 4 % 4]));
-            clips_[i]->addMetaData(kNote, "clip " + std::to_string(i));
-            opacityOf(clips_[i])->addKeyFrame(RationalTime(5), 0.5, RationalTime(0));
+            const MediaPtr clip = slice(i % 3, mediaDurations[i % 4], scalars[i / 4 % 4]);
+            clip->addMetaData(kNote, "clip " + std::to_string(i));
+            opacityOf(clip)->addKeyFrame(RationalTime(5), 0.5, RationalTime(0));
             // Set before placing, so that placing joins them with touching neighbours.
-            if (i % 3 == 0) clips_[i]->setRightTransition(newTransition());
-            if (i % 4 == 1) clips_[i]->setLeftTransition(newTransition());
+            if (i % 3 == 0) clip->setRightTransition(transition());
+            if (i % 4 == 1) clip->setLeftTransition(transition());
             if (i >= 10) continue; // loose clips, for adds
             // The magnetic track starts packed; the others touch, but for a gap before the last.
             const int t = i < 4 ? 0 : 1 + i % 2;
             if (i >= 8) ends[t] += 10;
-            tracks_[t]->addMedia(clips_[i], ends[t]);
-            ends[t] += clips_[i]->duration();
+            tracks[t]->addMedia(clip, ends[t]);
+            ends[t] += clip->duration();
         }
-        tracks_[0]->magneticAttribute()->setValue(true);
+        tracks[0]->magneticAttribute()->setValue(true);
         project->commandHistory()->runFollowUps();
-    }
-
-    // Everything an edit may change, a line per clip, transition and track.
-    std::vector<std::string> snapshot() const {
-        std::vector<std::string> lines;
-        for (const MediaPtr& clip : clips_) {
-            const MediaState s = clip->state();
-            std::ostringstream out, curve;
-            XMLOptions options(curve);
-            opacityOf(clip)->toJSON(options, 0, "opacity");
-            out << "[" << s.start << ", +" << s.duration << ") media " << s.mediaStart << "+"
-                << s.mediaDuration << " x" << s.scalar << " in " << s.minMediaStart << ".." << s.maxMediaEnd
-                << " offset " << s.hasStartOffset << s.startOffset << " track "
-                << indexIn(tracks_, parentOf(clip)) << " transitions "
-                << indexIn(transitions_, clip->leftTransition()) << "|"
-                << indexIn(transitions_, clip->rightTransition()) << " note " << clip->hasMetaData(kNote)
-                << "'" << clip->metaDataValue(kNote) << "' " << curve.str();
-            lines.push_back(out.str());
-        }
-        for (const TransitionPtr& t : transitions_)
-            lines.push_back(indexIn(clips_, t->leftMedia()) + ">" + indexIn(clips_, t->rightMedia()));
-        for (const auto& track : tracks_) {
-            std::ostringstream out;
-            for (const MediaPtr& clip : track->medias()) out << indexIn(clips_, clip) << " ";
-            for (const auto& entry : track->metaDataCopy()) out << entry.first << "=" << entry.second << " ";
-            out << track->attributeValue("videoHidden", false) << track->attributeValue("solo", false);
-            lines.push_back(out.str());
-        }
-        return lines;
     }
 
     // Empty when every invariant holds, else what broke.
     std::string violation() const {
         std::ostringstream out;
-        for (size_t t = 0; t < tracks_.size(); ++t) {
+        for (size_t t = 0; t < tracks.size(); ++t) {
             VelaTime end = t == 0 ? 0 : std::numeric_limits<VelaTime>::min();
-            for (const MediaPtr& clip : tracks_[t]->medias()) {
+            for (const MediaPtr& clip : tracks[t]->medias()) {
                 const Range<VelaTime> range = clip->trackRange();
                 if (range.start() < end || (t == 0 && range.start() != end))
                     out << "track " << t << ": clip at " << range.start() << " after an end at " << end
@@ -131,8 +73,8 @@ public:
                 end = range.end();
             }
         }
-        for (size_t c = 0; c < clips_.size(); ++c) {
-            const MediaState s = clips_[c]->state();
+        for (size_t c = 0; c < clips.size(); ++c) {
+            const MediaState s = clips[c]->state();
             if (s.mediaStart < s.minMediaStart || s.mediaEnd() > s.maxMediaEnd)
                 out << "clip " << c << ": media outside its limits; ";
             if (s.duration != RationalUtil::toVelaTime(RationalUtil::Round(s.mediaDuration * s.scalar)))
@@ -143,11 +85,11 @@ public:
 
     // One random edit, valid or not, and what it was.
     CommandPtr randomCommand(std::string& what) {
-        const int c = pick(int(clips_.size()));
-        const MediaPtr clip = clips_[c];
+        const int c = pick(int(clips.size()));
+        const MediaPtr clip = clips[c];
         // Mostly the clip's own track; sometimes another one (an invalid edit).
-        const auto own = parentOf(clip), track = own && pick(8) ? own : tracks_[pick(3)];
-        const int t = int(std::find(tracks_.begin(), tracks_.end(), track) - tracks_.begin());
+        const auto own = parentOf(clip), target = own && pick(8) ? own : tracks[pick(3)];
+        const int t = int(std::find(tracks.begin(), tracks.end(), target) - tracks.begin());
         const auto say = [&](const char* edit, long long n) {
             what = std::string(edit) + " clip " + std::to_string(c) + " track " + std::to_string(t) + " " +
                    std::to_string(n);
@@ -159,23 +101,23 @@ public:
         case 0:
             if (!own) {
                 const VelaTime start = between(-50, 250);
-                return say("add", start), AddMediaCmd::create(track, clip, start);
+                return say("add", start), AddMediaCmd::create(target, clip, start);
             }
             [[fallthrough]]; // a clip on a track is removed instead
         case 1:
-            return say("remove", 0), RemoveMediaCmd::create(track, clip);
+            return say("remove", 0), RemoveMediaCmd::create(target, clip);
         case 2:
         case 10: {
             const VelaTime d = kind == 2 ? between(-60, 60) : between(-300, 300); // far: mostly collisions
-            return say("move", d), MoveCmd::create(track, clip, d);
+            return say("move", d), MoveCmd::create(target, clip, d);
         }
         case 3: {
             const VelaTime d = between(-25, 25);
-            return say("trim start", d), TrimStartCmd::create(track, clip, d);
+            return say("trim start", d), TrimStartCmd::create(target, clip, d);
         }
         case 4: {
             const VelaTime d = between(-25, 25);
-            return say("trim end", d), TrimEndCmd::create(track, clip, d);
+            return say("trim end", d), TrimEndCmd::create(target, clip, d);
         }
         case 5: {
             const SafeRational scalars[] = {
@@ -187,10 +129,10 @@ public:
         case 6: {
             const int flag = pick(3), value = pick(2);
             say(value ? "set flag (on)" : "set flag (off)", flag);
-            return ChangeTrackFlagCmd::create(tracks_[t], ChangeTrackFlagCmd::Flag(flag), value == 1);
+            return ChangeTrackFlagCmd::create(tracks[t], ChangeTrackFlagCmd::Flag(flag), value == 1);
         }
         case 7:
-            return say("close gaps beside", 0), CloseGapsOnTrackCmd::create(tracks_[t]);
+            return say("close gaps beside", 0), CloseGapsOnTrackCmd::create(tracks[t]);
         case 8: {
             const bool remove = pick(3) == 0;
             const std::string text = "note " + std::to_string(pick(100));
@@ -229,45 +171,37 @@ public:
     }
 
 private:
-    TransitionPtr newTransition() {
-        transitions_.emplace_back(new Transition("t" + std::to_string(transitions_.size()), 2));
-        return transitions_.back();
-    }
     int pick(int below) { return std::uniform_int_distribution<int>(0, below - 1)(random_); }
 
-    std::vector<boost::shared_ptr<GenericTrack>> tracks_;
-    std::vector<MediaPtr> clips_;
-    std::vector<TransitionPtr> transitions_;
     std::mt19937 random_{2000};
 };
 
 } // namespace
 
-TEST(RandomEdits, InvariantsHoldAfterEveryStepAndUndoRedoAreExact) {
-    RandomEdits run;
-    const auto initial = run.snapshot();
-    ASSERT_EQ(run.violation(), "") << "before any edit";
+TEST_F(RandomEdits, InvariantsHoldAfterEveryStepAndUndoRedoAreExact) {
+    const auto initial = snapshot();
+    ASSERT_EQ(violation(), "") << "before any edit";
     int applied = 0;
     for (int i = 0; i < 2000; ++i) {
-        const auto before = run.snapshot();
+        const auto before = snapshot();
         std::string what;
-        const bool done = run.project->execute(run.randomCommand(what));
+        const bool done = project->execute(randomCommand(what));
         applied += done;
-        ASSERT_EQ(run.violation(), "") << "step " << i << ": " << what;
+        ASSERT_EQ(violation(), "") << "step " << i << ": " << what;
         if (!done) {
-            ASSERT_EQ(run.snapshot(), before) << "step " << i << " was refused but changed: " << what;
+            ASSERT_EQ(snapshot(), before) << "step " << i << " was refused but changed: " << what;
         }
         if (done && i % 50 == 0) { // one step back and forth again is exact
-            const auto after = run.snapshot();
-            ASSERT_TRUE(run.project->undo() && run.project->redo()) << "step " << i << ": " << what;
-            ASSERT_EQ(run.snapshot(), after) << "step " << i << ": undo and redo changed " << what;
+            const auto after = snapshot();
+            ASSERT_TRUE(project->undo() && project->redo()) << "step " << i << ": " << what;
+            ASSERT_EQ(snapshot(), after) << "step " << i << ": undo and redo changed " << what;
         }
     }
     EXPECT_GT(applied, 400);
     EXPECT_LT(applied, 1800);
-    const auto final = run.snapshot();
-    ASSERT_TRUE(run.project->commandHistory()->undoAll());
-    EXPECT_EQ(run.snapshot(), initial) << "undoing everything did not give back the first state";
-    ASSERT_TRUE(run.project->commandHistory()->redoAll());
-    EXPECT_EQ(run.snapshot(), final) << "redoing everything did not give back the last state";
+    const auto final = snapshot();
+    ASSERT_TRUE(project->commandHistory()->undoAll());
+    EXPECT_EQ(snapshot(), initial) << "undoing everything did not give back the first state";
+    ASSERT_TRUE(project->commandHistory()->redoAll());
+    EXPECT_EQ(snapshot(), final) << "redoing everything did not give back the last state";
 }
