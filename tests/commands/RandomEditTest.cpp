@@ -34,6 +34,30 @@ struct HostCmd : Command {
     Undo undo;
 };
 
+// Sets (or removes) a clip's note; undo puts back the entry as it was.
+CommandPtr setNote(const MediaPtr& clip, bool remove, const std::string& text) {
+    return boost::make_shared<HostCmd>([=]() -> Undo {
+        const bool had = clip->hasMetaData(kNote);
+        const std::string old = clip->metaDataValue(kNote);
+        if (remove && !clip->removeMetaData(kNote)) return {};
+        if (!remove) clip->addMetaData(kNote, text);
+        return [=] { had ? void(clip->addMetaData(kNote, old)) : void(clip->removeMetaData(kNote)); };
+    });
+}
+
+// Sets the opacity at a keyframe time, adding the keyframe if there is none.
+CommandPtr setOpacity(const MediaPtr& clip, const RationalTime& time, double value) {
+    return boost::make_shared<HostCmd>([=]() -> Undo {
+        const auto opacity = opacityOf(clip);
+        if (!opacity->hasKeyFrameAtTime(time)) {
+            opacity->addKeyFrame(time, value, RationalTime(0));
+            return [=] { opacity->removeKeyFrame(time); };
+        }
+        const double old = opacity->changeKeyFrame(time, value);
+        return [=] { opacity->changeKeyFrame(time, old); };
+    });
+}
+
 class RandomEdits : public EditTest {
 protected:
     RandomEdits() {
@@ -83,91 +107,56 @@ protected:
         return out.str();
     }
 
-    // One random edit, valid or not, and what it was.
+    // One random edit, valid or not; `what` says which (kind, clip, track, amount).
     CommandPtr randomCommand(std::string& what) {
         const int c = pick(int(clips.size()));
         const MediaPtr clip = clips[c];
         // Mostly the clip's own track; sometimes another one (an invalid edit).
         const auto own = parentOf(clip), target = own && pick(8) ? own : tracks[pick(3)];
         const int t = int(std::find(tracks.begin(), tracks.end(), target) - tracks.begin());
-        const auto say = [&](const char* edit, long long n) {
-            what = std::string(edit) + " clip " + std::to_string(c) + " track " + std::to_string(t) + " " +
-                   std::to_string(n);
-        };
+        const int kind = pick(11);
+        long long n = 0;
         const auto between = [&](VelaTime low, VelaTime high) {
-            return std::uniform_int_distribution<VelaTime>(low, high)(random_);
+            return n = std::uniform_int_distribution<VelaTime>(low, high)(random_);
         };
-        switch (const int kind = pick(11)) {
-        case 0:
-            if (!own) {
-                const VelaTime start = between(-50, 250);
-                return say("add", start), AddMediaCmd::create(target, clip, start);
+        const SafeRational scalars[] = {
+            1, SafeRational(1, 3),  SafeRational(1, 2), SafeRational(2, 3), SafeRational(3, 2), 2,
+            3, SafeRational(1, 200)};
+        const CommandPtr command = [&]() -> CommandPtr {
+            switch (kind) {
+            case 0:
+                if (!own) return AddMediaCmd::create(target, clip, between(-50, 250));
+                [[fallthrough]]; // a clip on a track is removed instead
+            case 1:
+                return RemoveMediaCmd::create(target, clip);
+            case 2:
+                return MoveCmd::create(target, clip, between(-60, 60));
+            case 3:
+                return TrimStartCmd::create(target, clip, between(-25, 25));
+            case 4:
+                return TrimEndCmd::create(target, clip, between(-25, 25));
+            case 5:
+                return StretchCmd::create(clip, scalars[n = pick(8)]);
+            case 6:
+                n = pick(3);
+                return ChangeTrackFlagCmd::create(tracks[t], ChangeTrackFlagCmd::Flag(n), pick(2));
+            case 7:
+                return CloseGapsOnTrackCmd::create(tracks[t]);
+            case 8: {
+                const bool remove = pick(3) == 0;
+                return setNote(clip, remove, "note " + std::to_string(n = pick(100)));
             }
-            [[fallthrough]]; // a clip on a track is removed instead
-        case 1:
-            return say("remove", 0), RemoveMediaCmd::create(target, clip);
-        case 2:
-        case 10: {
-            const VelaTime d = kind == 2 ? between(-60, 60) : between(-300, 300); // far: mostly collisions
-            return say("move", d), MoveCmd::create(target, clip, d);
-        }
-        case 3: {
-            const VelaTime d = between(-25, 25);
-            return say("trim start", d), TrimStartCmd::create(target, clip, d);
-        }
-        case 4: {
-            const VelaTime d = between(-25, 25);
-            return say("trim end", d), TrimEndCmd::create(target, clip, d);
-        }
-        case 5: {
-            const SafeRational scalars[] = {
-                1, SafeRational(1, 3),  SafeRational(1, 2), SafeRational(2, 3), SafeRational(3, 2), 2,
-                3, SafeRational(1, 200)};
-            const int s = pick(8);
-            return say("stretch (scalar index)", s), StretchCmd::create(clip, scalars[s]);
-        }
-        case 6: {
-            const int flag = pick(3), value = pick(2);
-            say(value ? "set flag (on)" : "set flag (off)", flag);
-            return ChangeTrackFlagCmd::create(tracks[t], ChangeTrackFlagCmd::Flag(flag), value == 1);
-        }
-        case 7:
-            return say("close gaps beside", 0), CloseGapsOnTrackCmd::create(tracks[t]);
-        case 8: {
-            const bool remove = pick(3) == 0;
-            const std::string text = "note " + std::to_string(pick(100));
-            say(remove ? "remove the note of" : "set the note of", 0);
-            return boost::make_shared<HostCmd>([=]() -> Undo {
-                const bool had = clip->hasMetaData(kNote);
-                const std::string old = clip->metaDataValue(kNote);
-                if (remove && !clip->removeMetaData(kNote)) return {};
-                if (!remove) clip->addMetaData(kNote, text);
-                return [=] {
-                    if (had)
-                        clip->addMetaData(kNote, old);
-                    else
-                        clip->removeMetaData(kNote);
-                };
-            });
-        }
-        case 9: {
-            // Sets the opacity at a keyframe time, adding the keyframe if there is none.
-            const RationalTime time(pick(4) * 3);
-            const int tenths = pick(11);
-            const double value = tenths / 10.0;
-            say("set the opacity (tenths) of", tenths);
-            return boost::make_shared<HostCmd>([=]() -> Undo {
-                const auto opacity = opacityOf(clip);
-                if (!opacity->hasKeyFrameAtTime(time)) {
-                    opacity->addKeyFrame(time, value, RationalTime(0));
-                    return [=] { opacity->removeKeyFrame(time); };
-                }
-                const double old = opacity->changeKeyFrame(time, value);
-                return [=] { opacity->changeKeyFrame(time, old); };
-            });
-        }
-        }
-        return nullptr;
+            case 9: {
+                const RationalTime time(pick(4) * 3);
+                return setOpacity(clip, time, (n = pick(11)) / 10.0);
+            }
+            default:
+                return MoveCmd::create(target, clip, between(-300, 300)); // far: mostly collisions
+            }
+        }();
+        what = "edit " + std::to_string(kind) + " of clip " + std::to_string(c) + " on track " +
+               std::to_string(t) + ": " + std::to_string(n);
+        return command;
     }
 
 private:

@@ -42,9 +42,10 @@ const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
 
 } // namespace
 
-TEST(ParameterDocument, ABareParameterIsItsValue) {
-    EXPECT_EQ(written(*ParameterImpl<double>::create(project, "opacity", 0.5), "opacity"),
-              "\"opacity\" : 0.5");
+// A constant parameter is written as its bare value. Asking for the
+// identifier attribute or the metadata, sharing a clone's setup and copying
+// make storage that may stay empty: it does not count.
+TEST(ParameterDocument, AConstantParameterIsItsBareValueWhateverEmptyStorageItHas) {
     EXPECT_EQ(written(*ParameterImpl<double>::create(project, "opacity", 1.0), ""), "1.0");
     EXPECT_EQ(written(*ParameterImpl<Point3d>::create(project, "p", Point3d(1, 2, 3)), "p"),
               "\"p\" : [1.0, 2.0, 3.0]");
@@ -52,6 +53,21 @@ TEST(ParameterDocument, ABareParameterIsItsValue) {
     EXPECT_NE(written(*ParameterImpl<double>::create(project, "always", 1.0), "always").find("keyframes"),
               std::string::npos);
     ParameterImpl<double>::namesWrittenInFull().erase("always");
+
+    const std::string bare = "\"opacity\" : 0.5";
+    auto asked = ParameterImpl<double>::create(project, "opacity", 0.5);
+    asked->identAttribute();
+    EXPECT_EQ(written(*asked, "opacity"), bare);
+    asked->metaDataPtr();
+    EXPECT_EQ(written(*asked, "opacity"), bare);
+    asked->metaDataPtr()->addMetaData("note", "x");
+    EXPECT_NE(written(*asked, "opacity"), bare);
+    asked->metaDataPtr()->removeMetaData("note");
+    EXPECT_EQ(written(*asked->clone(), "opacity"), bare);
+    auto target = ParameterImpl<double>::create(project, "opacity", 0.5);
+    ParameterImpl<double>::create(project, "opacity", 1.0)->setupSharedClone(target);
+    EXPECT_EQ(written(*target, "opacity"), bare);
+    EXPECT_EQ(written(*target->clone(), "opacity"), bare);
 }
 
 TEST(ParameterDocument, ReadingKeyFramesFollowsItsSteps) {
@@ -103,7 +119,9 @@ TEST(ParameterDocument, AFailedReadChangesNothing) {
     EXPECT_TRUE(*parameter == *before);
 }
 
-TEST(ParameterDocument, AnAnimationTakesLeadInlessValuesWithoutNewKeyFrames) {
+// A keyframe without lead-in after the first would be read as a value for the
+// keyframe in force, so an animation refuses it, and reads such an entry as one.
+TEST(ParameterDocument, AnAnimationsLaterKeyFramesNeedALeadIn) {
     auto parameter = AnimationParam<double>::create(project, "scale", 1.0);
     parameter->readFromJSON(parseJson(R"({"keyframes": [
         {"endTime": 0, "value": 1.0},
@@ -119,25 +137,13 @@ TEST(ParameterDocument, AnAnimationTakesLeadInlessValuesWithoutNewKeyFrames) {
     EXPECT_EQ(*constant->keyframeTimes(), std::vector<RationalTime>{RationalTime(0)});
     EXPECT_EQ(constant->valueAtTime(RationalTime(0)), 3.0);
     EXPECT_TRUE(constant->animations().empty());
-}
-
-// Asking for the identifier attribute or the metadata, sharing a clone's
-// setup and copying make storage that may stay empty: it does not count.
-TEST(ParameterDocument, AConstantParameterKeepsItsBareFormWhateverEmptyStorageItHas) {
-    auto asked = ParameterImpl<double>::create(project, "opacity", 1.0);
-    asked->identAttribute();
-    EXPECT_EQ(written(*asked, "opacity"), "\"opacity\" : 1.0");
-    asked->metaDataPtr();
-    EXPECT_EQ(written(*asked, "opacity"), "\"opacity\" : 1.0");
-    asked->metaDataPtr()->addMetaData("note", "x");
-    EXPECT_NE(written(*asked, "opacity"), "\"opacity\" : 1.0");
-    asked->metaDataPtr()->removeMetaData("note");
-    EXPECT_EQ(written(*asked->clone(), "opacity"), "\"opacity\" : 1.0");
-
-    auto target = ParameterImpl<double>::create(project, "opacity", 1.0);
-    ParameterImpl<double>::create(project, "opacity", 0.5)->setupSharedClone(target);
-    EXPECT_EQ(written(*target, "opacity"), "\"opacity\" : 1.0");
-    EXPECT_EQ(written(*target->clone(), "opacity"), "\"opacity\" : 1.0");
+    auto animated = AnimationParam<double>::create(project, "scale", 1.0);
+    EXPECT_THROW(animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(0)), KeyFrameException);
+    EXPECT_THROW(animated->addKeyFrame(RationalTime(-10), 2.0, RationalTime(1)), KeyFrameException);
+    animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(4));
+    animated->addKeyFrame(RationalTime(0), 3.0, RationalTime(0)); // the first may have none
+    EXPECT_THROW(animated->changeKeyFrameLeadInLength(RationalTime(10), RationalTime(0)), KeyFrameException);
+    EXPECT_EQ(animated->numKeyFrames(), 2u);
 }
 
 TEST(ParameterDocument, ReadingAWholeParameterGivesBackTheWrittenCurve) {
@@ -166,18 +172,6 @@ TEST(ParameterDocument, ReadingAWholeParameterGivesBackTheWrittenCurve) {
     stale->replaceFromJSON(member(*withMetadata));
     EXPECT_EQ(stale->generateMetaDataMap(), (std::map<std::string, std::string>{{"a", "1"}}));
     EXPECT_EQ(stale->metaDataPtr(), kept); // the same metadata object, its entries replaced
-}
-
-// A keyframe without lead-in after the first would be read as a value for the
-// keyframe in force, so an animation refuses it.
-TEST(ParameterDocument, AnAnimationsLaterKeyFramesNeedALeadIn) {
-    auto animated = AnimationParam<double>::create(project, "scale", 1.0);
-    EXPECT_THROW(animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(0)), KeyFrameException);
-    EXPECT_THROW(animated->addKeyFrame(RationalTime(-10), 2.0, RationalTime(1)), KeyFrameException);
-    animated->addKeyFrame(RationalTime(10), 2.0, RationalTime(4));
-    animated->addKeyFrame(RationalTime(0), 3.0, RationalTime(0)); // the first may have none
-    EXPECT_THROW(animated->changeKeyFrameLeadInLength(RationalTime(10), RationalTime(0)), KeyFrameException);
-    EXPECT_EQ(animated->numKeyFrames(), 2u);
 }
 
 TEST(ParameterDocument, ADiffParameterWritesOnlyItsDifference) {

@@ -35,46 +35,44 @@ T readBack(const T& value) {
     return ValueTraits<T>::read(parseJson(text(value)));
 }
 
-// Values of each type that parameters hold, the first unlike the type's default.
-using Rectf = Rect<float>;
-std::vector<int> samples(int*) { return {-7, 3}; }
-std::vector<float> samples(float*) { return {0.1f, 3.4028235e38f}; }
-std::vector<double> samples(double*) { return {1.0 / 3.0, 0.1}; }
-std::vector<long long> samples(long long*) { return {9007199254740993LL, -1}; } // not a double
-std::vector<std::string> samples(std::string*) { return {"a \"quoted\"\tline\n", "\\ and \xc3\xa9"}; }
-std::vector<Rectf> samples(Rectf*) { return {Rectf(0.5f, -1, 1e-3f, 2), Rectf(0, 0, 1920, 1080)}; }
-std::vector<TemplatedColor<int>> samples(TemplatedColor<int>*) { return {{1, 2, 3, 4}, {255, 0, 0, 255}}; }
-std::vector<std::list<Rectf>> samples(std::list<Rectf>*) { return {{Rectf(1, 2, 3, 4), Rectf()}, {}}; }
-std::vector<AudioPosition> samples(AudioPosition*) { return {{-0.25, 0.5}, {-1, 0}}; }
-std::vector<CaptionData> samples(CaptionData*) { return {{"hello", "en"}, {"Bonjour\n", "fr-CA"}}; }
-std::vector<KeystrokeData> samples(KeystrokeData*) {
-    return {{"K", 5}, {"S", KeystrokeData::Command}, {"Tab"}};
+// Document texts of values of each type that parameters hold, the first unlike the type's default.
+using Texts = std::vector<std::string>;
+Texts samples(int*) { return {"-7", "3"}; }
+Texts samples(float*) { return {"0.1", "3.4028235e+38"}; }
+Texts samples(double*) { return {"0.3333333333333333", "0.1"}; }
+Texts samples(long long*) { return {"9007199254740993", "-1"}; } // not a double
+Texts samples(std::string*) { return {R"("a \"quoted\"\tline\n")", "\"\\\\ and \xc3\xa9\""}; }
+Texts samples(Rect<float>*) { return {"[0.5, -1.0, 0.001, 2.0]", "[0.0, 0.0, 1920.0, 1080.0]"}; }
+Texts samples(TemplatedColor<int>*) { return {"[1, 2, 3, 4]", "[255, 0, 0, 255]"}; }
+Texts samples(std::list<Rect<float>>*) { return {"[[1.0, 2.0, 3.0, 4.0], [0.0, 0.0, 0.0, 0.0]]", "[]"}; }
+Texts samples(AudioPosition*) { return {"[-0.25, 0.5]", "[-1.0, 0.0]"}; }
+Texts samples(CaptionData*) {
+    return {R"({"text" : "hello", "lang" : "en"})", R"({"text" : "Bonjour\n", "lang" : "fr-CA"})"};
 }
-std::vector<Point3d> samples(Point3d*) { return {{1e-20, -2, 3.5}, {1e-300, 2, 3}, {-0.0, 1e300, 5}}; }
-std::vector<SafeRational> samples(SafeRational*) { return {{-7, 3}, {1, 3}, -5}; }
-std::vector<TextAttributeList> samples(TextAttributeList*) {
-    TextAttributeList styled("bold words");
-    styled.addRun(0, 4, "fontWeight", "bold");
-    return {styled, TextAttributeList("plain")};
+Texts samples(KeystrokeData*) {
+    return {R"({"key" : "K", "modifiers" : 5})", R"({"key" : "S", "modifiers" : 8})",
+            R"({"key" : "Tab", "modifiers" : 0})"};
 }
-std::vector<TransformMatrix> samples(TransformMatrix*) {
-    TransformMatrix::Elements elements;
-    for (size_t i = 0; i < elements.size(); ++i) elements[i] = double(i) / 7.0;
-    return {TransformMatrix(elements),
-            TransformMatrix::rotationZ(0.5) * TransformMatrix::translation(1, 2, 3)};
+Texts samples(Point3d*) { return {"[1e-20, -2.0, 3.5]", "[1e-300, 2.0, 3.0]", "[-0.0, 1e+300, 5.0]"}; }
+Texts samples(SafeRational*) { return {"\"-7/3\"", "\"1/3\"", "-5"}; }
+Texts samples(TextAttributeList*) {
+    return {
+        R"({"text" : "bold words", "runs" : [{"start" : 0, "length" : 4, "name" : "fontWeight", "value" : "bold"}]})",
+        R"({"text" : "plain", "runs" : []})"};
 }
-std::vector<std::vector<double>> samples(std::vector<double>*) { return {{0.1, -1e300, 4.0}, {}}; }
+Texts samples(TransformMatrix*) {
+    return {
+        "[0.5, -1.0, 0.0, 1e-20, 2.0, 3.0, 0.14285714285714285, 0.0, 0.0, 0.0, 1.0, 0.0, 7.0, 0.0, 0.0, 1.0]",
+        "[1.0, 0.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 0.0, 1.0]"};
+}
+Texts samples(std::vector<double>*) { return {"[0.1, -1e+300, 4.0]", "[]"}; }
 template <typename X>
-std::vector<boost::shared_ptr<Interpolater<X>>> samples(boost::shared_ptr<Interpolater<X>>*) {
-    return {InterpolaterFactory<X>::byName("esIn"), InterpolaterFactory<X>::byName("left")};
+Texts samples(boost::shared_ptr<Interpolater<X>>*) {
+    return {"\"esIn\"", "\"left\""};
 }
-std::vector<boost::shared_ptr<Interpolater<double>>> samples(boost::shared_ptr<Interpolater<double>>*) {
-    return {InterpolaterFactory<double>::byName("linr"), InterpolaterFactory<double>::byName("bnce")};
-}
-std::vector<boost::shared_ptr<Interpolater<Point3d>>> samples(boost::shared_ptr<Interpolater<Point3d>>*) {
-    return {InterpolaterFactory<Point3d>::byName("sprg"),
-            boost::shared_ptr<Interpolater<Point3d>>(
-                new BezierInterpolater(Point3d(1, 2, 3), Point3d(), "esOt"))};
+Texts samples(boost::shared_ptr<Interpolater<double>>*) { return {"\"linr\"", "\"bnce\""}; }
+Texts samples(boost::shared_ptr<Interpolater<Point3d>>*) {
+    return {"\"sprg\"", "\"bezr(esOt;1.0,2.0,3.0;0.0,0.0,0.0)\""};
 }
 
 const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
@@ -94,14 +92,16 @@ void expectParameterReadsBack(const boost::shared_ptr<Kind>& parameter, const st
     }
 }
 
+// Each sample reads into a value written back byte for byte, which reads back the same.
 template <typename T>
 void expectReadBack() {
-    const std::vector<T> values = samples(static_cast<T*>(nullptr));
-    for (const T& value : values) {
-        const T read = readBack(value);
-        EXPECT_TRUE(ValueTraits<T>::same(read, value)) << ValueTraits<T>::typeName() << ": " << text(value);
-        EXPECT_TRUE(ValueTraits<T>::similar(read, value)) << ValueTraits<T>::typeName();
-        EXPECT_EQ(text(read), text(value));
+    std::vector<T> values;
+    for (const std::string& json : samples(static_cast<T*>(nullptr))) {
+        values.push_back(ValueTraits<T>::read(parseJson(json)));
+        EXPECT_EQ(text(values.back()), json) << ValueTraits<T>::typeName();
+        const T again = readBack(values.back());
+        EXPECT_TRUE(ValueTraits<T>::same(again, values.back())) << json;
+        EXPECT_TRUE(ValueTraits<T>::similar(again, values.back())) << json;
     }
     expectParameterReadsBack(ParameterImpl<T>::create(project, "p", values[0]),
                              std::vector<T>(values.begin() + 1, values.end()));
