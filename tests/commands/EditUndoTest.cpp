@@ -1,3 +1,4 @@
+#include "../JsonTestSupport.h"
 #include "EditTestSupport.h"
 
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
@@ -67,6 +68,8 @@ TEST_F(EditUndo, ClosingGapsMovesInAnOrderWithoutCollisions) {
     expectExactUndo(CloseGapsOnTrackCmd::create(track));
     EXPECT_EQ(starts(), (std::vector<VelaTime>{0, 10, 20, 30}));
     expectRefused(CloseGapsOnTrackCmd::create(track)); // no gap: nothing to record
+    EXPECT_EQ(thrown<VelaMediaLibException>([] { CloseGapsOnTrackCmd::create(TrackPtr()); }),
+              "no track to close gaps on");
 }
 
 TEST_F(EditUndo, ARefusedMoveRefusesTheWholeClosing) {

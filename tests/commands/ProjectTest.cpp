@@ -5,7 +5,6 @@
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
-#include <VelaMediaLib/commands/framework/LambdaMultiCommand.h>
 #include <VelaMediaLib/time/parameters/SymbolTable.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
 
@@ -56,19 +55,11 @@ TEST(ProjectCreation, RatesDefaultsAndTheEditRate) {
     EXPECT_EQ(project->metaDataValue("authoringClientName:platform"), "linux");
     EXPECT_EQ(project->metaDataValue("authoringClientName:version"), "2.1");
 
-    // Observers hear each rate set; clips hold the rate through the edit-rate token.
-    RateReader reader;
-    reader.rate = project.get();
-    project->attachEditRateObserver(&reader);
-    project->setEditRate(Rate(0));
-    project->setEditRate(SimpleProjectEditRate::rateOf(60, 2));
-    EXPECT_EQ(reader.seen, (std::vector<Rate>{Rate(0, 1), Rate(30)}));
-    project->detachEditRateObserver(&reader);
+    // Clips hold the rate through the project's edit-rate token.
     const boost::shared_ptr<ProjectEditRate> held = project->editRateToken().lock();
     ASSERT_TRUE(held);
     project->setEditRate(Rate(30000, 1001));
     EXPECT_EQ(held->editRate(), Rate(30000, 1001));
-    EXPECT_EQ(reader.seen.size(), 2u);
     held->setEditRate(Rate(24));
     EXPECT_EQ(project->editRate(), Rate(24));
 }
@@ -116,38 +107,6 @@ TEST(SymbolTable, AnIdentifierAnswersOnlyForKindsItIs) {
     EXPECT_TRUE(symbols.symbolForIdent<PlaceholderMedia>(8));
     EXPECT_FALSE(symbols.symbolForIdent<Media>(9));
     EXPECT_FALSE(symbols.hasSymbolForIdent(9));
-}
-
-TEST_F(ProjectTest, CombiningFoldsStepsIntoOne) {
-    const MediaPtr media = place(0, 10);
-    project->execute(MoveCmd::create(track, media, 5));
-    project->execute(MoveCmd::create(track, media, 5));
-    project->combineLastCommands();
-    project->undo();
-    EXPECT_EQ(media->startTime(), 0); // both moves undone as one
-    project->beginAutoCommandCombining();
-    for (int i = 0; i < 3; ++i) project->execute(MoveCmd::create(track, media, 10));
-    project->endAutoCommandCombining();
-    EXPECT_EQ(steps(), 2u); // everything after the first folded into it
-    project->undo();
-    EXPECT_EQ(media->startTime(), 0);
-    project->combineNextCommand();
-    project->execute(MoveCmd::create(track, media, 1));
-    EXPECT_EQ(steps(), 1u);
-}
-
-TEST_F(ProjectTest, ACompositeWhoseThirdStepThrowsLeavesTheProjectAsItWas) {
-    const MediaPtr a = place(0, 10), b = place(20, 10);
-    const Snapshot before = snapshot();
-    const CommandHistoryState history = project->commandState();
-    const auto composite = LambdaMultiCommand::create([&](MultiCommand* self) {
-        self->execute(MoveCmd::create(track, a, 100));
-        self->execute(MoveCmd::create(track, b, 100));
-        self->execute(CloseGapsOnTrackCmd::create(TrackPtr())); // throws
-    });
-    EXPECT_THROW(project->execute(composite), VelaMediaLibException);
-    EXPECT_EQ(snapshot(), before);
-    EXPECT_EQ(project->commandState().undoStack, history.undoStack);
 }
 
 // A magnetic track starts at zero without gaps; its closing is an undo step of
