@@ -33,9 +33,19 @@ inline boost::shared_ptr<Parameter<double>> opacityOf(const MediaPtr& clip) {
     return boost::dynamic_pointer_cast<VisualMedia>(clip)->opacity();
 }
 
+// All an edit may change: each clip's timing state, and a line per clip,
+// transition and track (which a failure prints).
+struct Snapshot {
+    std::vector<MediaState> states;
+    std::vector<std::string> lines;
+    bool operator==(const Snapshot& o) const { return states == o.states && lines == o.lines; }
+};
+inline void PrintTo(const Snapshot& s, std::ostream* out) {
+    for (const std::string& line : s.lines) *out << "\n    " << line;
+}
+
 class EditTest : public ::testing::Test {
 protected:
-    typedef std::vector<std::string> Snapshot;
     ProjectPtr project = Project::create(30, 1);
     boost::shared_ptr<GenericMixer> mixer = project->newMixer("main");
     std::vector<boost::shared_ptr<GenericTrack>> tracks;
@@ -74,11 +84,12 @@ protected:
     }
     size_t steps() const { return project->commandHistory()->undoStack().size(); }
 
-    // All an edit may change, a line per clip, transition and track.
     Snapshot snapshot() const {
-        Snapshot lines;
+        Snapshot shot;
+        std::vector<std::string>& lines = shot.lines;
         for (const MediaPtr& media : clips) {
             const MediaState s = media->state();
+            shot.states.push_back(s);
             std::ostringstream out, curve;
             XMLOptions options(curve);
             opacityOf(media)->toJSON(options, 0, "opacity");
@@ -100,7 +111,7 @@ protected:
             out << each->attributeValue("videoHidden", false) << each->attributeValue("solo", false);
             lines.push_back(out.str());
         }
-        return lines;
+        return shot;
     }
 
     // Runs the command, then asks that undo gives back the state before it and redo the state after.
