@@ -1,5 +1,5 @@
 #pragma once
-// Parsing document text in tests.
+// Parsing document text, and reading what a step throws, in tests.
 
 #include <gtest/gtest.h>
 #include <json/reader.h>
@@ -16,6 +16,17 @@ inline Json::Value parseJson(const std::string& text) {
     std::istringstream in(text);
     if (!Json::parseFromStream(builder, in, &value, &errors)) ADD_FAILURE() << errors << "\n" << text;
     return value;
+}
+
+/// The message of the E the step throws, or "no exception" (another kind escapes).
+template <typename E, typename Step>
+std::string thrown(const Step& step) {
+    try {
+        step();
+    } catch (const E& e) {
+        return e.what();
+    }
+    return "no exception";
 }
 
 } // namespace testing

@@ -23,7 +23,8 @@ std::string written(const Media& media, int indent) {
 } // namespace
 
 // A whole clip as a document holds it: attributes of every kind, bare and
-// keyframed parameters, keyframe and clip metadata, nested at a deeper level.
+// keyframed parameters written member by member in their order, keyframe and
+// clip metadata, nested at a deeper level.
 TEST(MediaDocument, AClipIsWrittenByteForByte) {
     const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
     const boost::shared_ptr<ProjectEditRate> rate =
@@ -39,9 +40,12 @@ TEST(MediaDocument, AClipIsWrittenByteForByte) {
     clip->opacity()->addKeyFrame(RationalTime(40), 1.0, RationalTime(SafeRational(15, 2)));
     const auto fade = clip->opacity()->keyframeAtTime(RationalTime(40));
     fade->setInterpolater(EaseOutInterpolater<double>::getInstance());
-    fade->addMetaData("label", "fade in");
+    fade->addMetaData("label", "fade \"in\"");
     clip->geometryCropParam()->setDefaultValue(Rect<float>(0.25f, 0, 1, 0.5f));
-    clip->translation()->addKeyFrame(RationalTime(10), Point3d(1, -2, 0.5), RationalTime(0));
+    clip->translation()->setDefaultValue(Point3d(1, -2, 0.5));
+    const auto opacity = boost::dynamic_pointer_cast<ParameterImpl<double>>(clip->opacity());
+    opacity->setValueBounds(0.0, 2.0, 1.0);
+    opacity->setUIHints("slider", "percent");
     clip->addMetaData("origin", "import");
 
     const std::string expected = R"({
@@ -65,6 +69,15 @@ TEST(MediaDocument, AClipIsWrittenByteForByte) {
       "opacity" : {
         "type" : "double",
         "interp" : "linr",
+        "valueBounds" : {
+          "minValue" : 0.0,
+          "maxValue" : 2.0,
+          "defaultValue" : 1.0
+        },
+        "uiHints" : {
+          "userInterfaceType" : "slider",
+          "unitType" : "percent"
+        },
         "keyframes" : [
           {
             "time" : 0,
@@ -79,29 +92,12 @@ TEST(MediaDocument, AClipIsWrittenByteForByte) {
             "duration" : "15/2",
             "interp" : "esOt",
             "metadata" : {
-              "label" : "fade in"
+              "label" : "fade \"in\""
             }
           }
         ]
       },
-      "translation" : {
-        "type" : "point",
-        "interp" : "linr",
-        "keyframes" : [
-          {
-            "time" : 0,
-            "endTime" : 0,
-            "value" : [0.0, 0.0, 0.0],
-            "duration" : 0
-          },
-          {
-            "time" : 10,
-            "endTime" : 10,
-            "value" : [1.0, -2.0, 0.5],
-            "duration" : 0
-          }
-        ]
-      }
+      "translation" : [1.0, -2.0, 0.5]
     },
     "metadata" : {
       "origin" : "import"

@@ -1,20 +1,24 @@
+#include "../JsonTestSupport.h"
+
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/document/JSONReader.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/time/interpolaters/InterpolaterFactory.h>
-#include <VelaMediaLib/time/parameters/ValueTraits.h>
+#include <VelaMediaLib/time/parameters/InterpolatingParam.h>
+#include <VelaMediaLib/time/parameters/ParameterImpl.h>
+#include <VelaMediaLib/time/sync/ThreadSafe.h>
 
+#include <boost/make_shared.hpp>
 #include <cmath>
-#include "../JsonTestSupport.h"
-
 #include <gtest/gtest.h>
-#include <json/reader.h>
 #include <limits>
 #include <random>
 #include <set>
 #include <sstream>
 
 using namespace VelaMediaLib;
+using VelaMediaLib::testing::parseJson;
+using VelaMediaLib::testing::thrown;
 
 namespace {
 
@@ -26,55 +30,81 @@ std::string text(const T& value) {
     return out.str();
 }
 
-std::string primitiveText(const Range<long long>& value) {
-    std::ostringstream out;
-    XMLOptions options(out);
-    writeJSONValue(options, 0, value);
-    return out.str();
-}
-
 template <typename T>
 T readBack(const T& value) {
-    return ValueTraits<T>::read(VelaMediaLib::testing::parseJson(text(value)));
+    return ValueTraits<T>::read(parseJson(text(value)));
 }
 
-// One value of each type that parameters hold, unlike the type's default.
-int sample(int*) { return -7; }
-float sample(float*) { return 0.1f; }
-double sample(double*) { return 1.0 / 3.0; }
-long long sample(long long*) { return 9000000000LL; }
-std::string sample(std::string*) { return "a \"quoted\" line\n"; }
-Rect<float> sample(Rect<float>*) { return Rect<float>(0.5f, -1, 1e-3f, 2); }
-TemplatedColor<int> sample(TemplatedColor<int>*) { return TemplatedColor<int>(1, 2, 3, 4); }
-std::list<Rect<float>> sample(std::list<Rect<float>>*) { return {Rect<float>(1, 2, 3, 4), Rect<float>()}; }
-AudioPosition sample(AudioPosition*) { return AudioPosition(-0.25, 0.5); }
-CaptionData sample(CaptionData*) { return CaptionData("hello", "en"); }
-KeystrokeData sample(KeystrokeData*) { return KeystrokeData("K", 5); }
-Point3d sample(Point3d*) { return Point3d(1e-20, -2, 3.5); }
-SafeRational sample(SafeRational*) { return SafeRational(-7, 3); }
-TextAttributeList sample(TextAttributeList*) {
-    TextAttributeList list("bold words");
-    list.addRun(0, 4, "fontWeight", "bold");
-    return list;
+// Document texts of values of each type that parameters hold, the first unlike the type's default.
+using Texts = std::vector<std::string>;
+Texts samples(int*) { return {"-7", "3"}; }
+Texts samples(float*) { return {"0.1", "3.4028235e+38"}; }
+Texts samples(double*) { return {"0.3333333333333333", "0.1"}; }
+Texts samples(long long*) { return {"9007199254740993", "-1"}; } // not a double
+Texts samples(std::string*) { return {R"("a \"quoted\"\tline\n")", "\"\\\\ and \xc3\xa9\""}; }
+Texts samples(Rect<float>*) { return {"[0.5, -1.0, 0.001, 2.0]", "[0.0, 0.0, 1920.0, 1080.0]"}; }
+Texts samples(TemplatedColor<int>*) { return {"[1, 2, 3, 4]", "[255, 0, 0, 255]"}; }
+Texts samples(std::list<Rect<float>>*) { return {"[[1.0, 2.0, 3.0, 4.0], [0.0, 0.0, 0.0, 0.0]]", "[]"}; }
+Texts samples(AudioPosition*) { return {"[-0.25, 0.5]", "[-1.0, 0.0]"}; }
+Texts samples(CaptionData*) {
+    return {R"({"text" : "hello", "lang" : "en"})", R"({"text" : "Bonjour\n", "lang" : "fr-CA"})"};
 }
-TransformMatrix sample(TransformMatrix*) {
-    TransformMatrix::Elements elements;
-    for (size_t i = 0; i < elements.size(); ++i) elements[i] = double(i) / 7.0;
-    return TransformMatrix(elements);
+Texts samples(KeystrokeData*) {
+    return {R"({"key" : "K", "modifiers" : 5})", R"({"key" : "S", "modifiers" : 8})",
+            R"({"key" : "Tab", "modifiers" : 0})"};
 }
-std::vector<double> sample(std::vector<double>*) { return {0.1, -1e300, 4.0}; }
+Texts samples(Point3d*) { return {"[1e-20, -2.0, 3.5]", "[1e-300, 2.0, 3.0]", "[-0.0, 1e+300, 5.0]"}; }
+Texts samples(SafeRational*) { return {"\"-7/3\"", "\"1/3\"", "-5"}; }
+Texts samples(TextAttributeList*) {
+    return {
+        R"({"text" : "bold words", "runs" : [{"start" : 0, "length" : 4, "name" : "fontWeight", "value" : "bold"}]})",
+        R"({"text" : "plain", "runs" : []})"};
+}
+Texts samples(TransformMatrix*) {
+    return {
+        "[0.5, -1.0, 0.0, 1e-20, 2.0, 3.0, 0.14285714285714285, 0.0, 0.0, 0.0, 1.0, 0.0, 7.0, 0.0, 0.0, 1.0]",
+        "[1.0, 0.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 0.0, 1.0]"};
+}
+Texts samples(std::vector<double>*) { return {"[0.1, -1e+300, 4.0]", "[]"}; }
 template <typename X>
-boost::shared_ptr<Interpolater<X>> sample(boost::shared_ptr<Interpolater<X>>*) {
-    return InterpolaterFactory<X>::byName("esIn");
+Texts samples(boost::shared_ptr<Interpolater<X>>*) {
+    return {"\"esIn\"", "\"left\""};
+}
+Texts samples(boost::shared_ptr<Interpolater<double>>*) { return {"\"linr\"", "\"bnce\""}; }
+Texts samples(boost::shared_ptr<Interpolater<Point3d>>*) {
+    return {"\"sprg\"", "\"bezr(esOt;1.0,2.0,3.0;0.0,0.0,0.0)\""};
 }
 
+const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+
+// A parameter read from its own document equals it: bare, then with keyframes of the later values.
+template <typename Kind, typename T>
+void expectParameterReadsBack(const boost::shared_ptr<Kind>& parameter, const std::vector<T>& later) {
+    for (size_t i = 0; i <= later.size(); ++i) {
+        if (i > 0) parameter->addKeyFrame(RationalTime(7 * i, 3), later[i - 1], RationalTime(1, 3));
+        std::ostringstream out;
+        XMLOptions options(out);
+        parameter->toJSON(options, 1, "p");
+        auto copy = parameter->clone();
+        copy->setDefaultValue(later.back()); // differs before reading
+        copy->readFromJSON(parseJson("{" + out.str() + "}")["p"]);
+        EXPECT_TRUE(*copy == *parameter) << out.str();
+    }
+}
+
+// Each sample reads into a value written back byte for byte, which reads back the same.
 template <typename T>
 void expectReadBack() {
-    const T value = sample(static_cast<T*>(nullptr));
-    const T read = readBack(value);
-    EXPECT_TRUE(ValueTraits<T>::same(read, value)) << ValueTraits<T>::typeName() << ": " << text(value);
-    EXPECT_TRUE(ValueTraits<T>::similar(read, value)) << ValueTraits<T>::typeName();
-    EXPECT_EQ(text(read), text(value));
+    std::vector<T> values;
+    for (const std::string& json : samples(static_cast<T*>(nullptr))) {
+        values.push_back(ValueTraits<T>::read(parseJson(json)));
+        EXPECT_EQ(text(values.back()), json) << ValueTraits<T>::typeName();
+        const T again = readBack(values.back());
+        EXPECT_TRUE(ValueTraits<T>::same(again, values.back())) << json;
+        EXPECT_TRUE(ValueTraits<T>::similar(again, values.back())) << json;
+    }
+    expectParameterReadsBack(ParameterImpl<T>::create(project, "p", values[0]),
+                             std::vector<T>(values.begin() + 1, values.end()));
 }
 
 } // namespace
@@ -89,7 +119,7 @@ TEST(ValueTraits, DoublesReadBackAsTheSameDouble) {
     EXPECT_EQ(text(1.0), "1.0");
     EXPECT_EQ(text(0.1), "0.1");
     EXPECT_EQ(text(std::numeric_limits<double>::infinity()), "null");
-    EXPECT_TRUE(std::isnan(ValueTraits<double>::read(VelaMediaLib::testing::parseJson("null"))));
+    EXPECT_TRUE(std::isnan(ValueTraits<double>::read(parseJson("null"))));
 }
 
 TEST(ValueTraits, StringsAreEscapedAsJSONRequires) {
@@ -99,44 +129,43 @@ TEST(ValueTraits, StringsAreEscapedAsJSONRequires) {
 }
 
 TEST(ValueTraits, RationalsAndTicks) {
+    const auto rational = [](const char* json) {
+        return JSONReader::jsonValueAsVelaRational(parseJson(json));
+    };
     EXPECT_EQ(text(SafeRational(60000, 1001)), "\"60000/1001\"");
     EXPECT_EQ(text(SafeRational(30)), "30");
-    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"60000/1001\"")),
-              SafeRational(60000, 1001));
-    EXPECT_EQ(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("30")), SafeRational(30));
-    try {
-        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("1.5"));
-        FAIL();
-    } catch (const ParserException& e) {
-        EXPECT_STREQ(e.what(), "Invalid project json - unsupported json type for VelaRational: 1.5");
-    }
-    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/x\"")),
-                 std::invalid_argument);
-    EXPECT_THROW(
-        JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"99999999999999999999/1\"")),
-        std::out_of_range);
-    EXPECT_THROW(JSONReader::jsonValueAsVelaRational(VelaMediaLib::testing::parseJson("\"1/0\"")),
-                 boost::bad_rational);
-    EXPECT_EQ(primitiveText(Range<long long>(10, 25)), "[10, 25]");
-    EXPECT_EQ(jsonValueAsTickRange(VelaMediaLib::testing::parseJson("[10, 25]")), Range<long long>(10, 25));
+    EXPECT_EQ(rational("\"60000/1001\""), SafeRational(60000, 1001));
+    EXPECT_EQ(rational("30"), SafeRational(30));
+    EXPECT_EQ(thrown<ParserException>([&] { rational("1.5"); }),
+              "Invalid project json - unsupported json type for VelaRational: 1.5");
+    EXPECT_THROW(rational("\"1/x\""), std::invalid_argument);
+    EXPECT_THROW(rational("\"99999999999999999999/1\""), std::out_of_range);
+    EXPECT_THROW(rational("\"1/0\""), boost::bad_rational);
+    std::ostringstream ticks;
+    XMLOptions options(ticks);
+    writeJSONValue(options, 0, Range<long long>(10, 25));
+    EXPECT_EQ(ticks.str(), "[10, 25]");
+    EXPECT_EQ(jsonValueAsTickRange(parseJson("[10, 25]")), Range<long long>(10, 25));
 }
 
 TEST(ValueTraits, WrongShapesAreRefusedWithTheValue) {
-    EXPECT_THROW(ValueTraits<Point3d>::read(VelaMediaLib::testing::parseJson("[1, 2]")), ParserException);
-    EXPECT_THROW(ValueTraits<TemplatedColor<int>>::read(VelaMediaLib::testing::parseJson("[1, 2, 3, 4.5]")),
-                 ParserException);
-    EXPECT_THROW(ValueTraits<int>::read(VelaMediaLib::testing::parseJson("\"3\"")), ParserException);
-    EXPECT_THROW(ValueTraits<TextAttributeList>::read(VelaMediaLib::testing::parseJson(
-                     R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
+    EXPECT_THROW(ValueTraits<Point3d>::read(parseJson("[1, 2]")), ParserException);
+    EXPECT_THROW(ValueTraits<TemplatedColor<int>>::read(parseJson("[1, 2, 3, 4.5]")), ParserException);
+    EXPECT_THROW(ValueTraits<int>::read(parseJson("\"3\"")), ParserException);
+    EXPECT_THROW(ValueTraits<TextAttributeList>::read(
+                     parseJson(R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
                  ParserException);
 }
 
 // Every type in the instantiation list has a document form that gives its
-// value back; a type added without one does not compile here.
+// value back, alone and in a parameter; a type added without one does not compile here.
 TEST(ValueTraits, EveryParameterValueTypeReadsBackWhatItWrote) {
 #define VELA_EXPECT_READ_BACK(Type) expectReadBack<Type>();
     VELA_FOR_EACH_PARAMETER_VALUE_TYPE(VELA_EXPECT_READ_BACK)
 #undef VELA_EXPECT_READ_BACK
+    expectParameterReadsBack(
+        InterpolatingParam<double>::create(project, "p", 1.0, SpringInterpolater<double>::getInstance()),
+        std::vector<double>{2.0});
 }
 
 TEST(ValueTraits, TypeNamesAreDistinct) {
@@ -151,6 +180,7 @@ TEST(ValueTraits, TypeNamesAreDistinct) {
     EXPECT_STREQ(ValueTraits<long long>::typeName(), "int64");
     EXPECT_STREQ(ValueTraits<Rect<float>>::typeName(), "rect");
     EXPECT_STREQ(ValueTraits<TemplatedColor<int>>::typeName(), "color");
+    EXPECT_STREQ(ValueTraits<Point3d>::typeName(), "point");
 }
 
 TEST(ValueTraits, SimilarityHasEachMembersTolerance) {
@@ -187,16 +217,19 @@ TEST(ValueTraits, EachTypeHasItsInterpolaterKinds) {
     EXPECT_EQ(InterpolaterFactory<TemplatedColor<int>>::defaultInterpolater()->name(), "linr");
 }
 
-TEST(JSONWriter, IndentsNestedObjectsAndArrays) {
+// A refused key or element writes nothing.
+TEST(JSONWriter, IndentsNestedObjectsAndArraysAndRefusesWhatDoesNotBelong) {
     std::ostringstream out;
     XMLOptions options(out);
     {
         JSONWriter object(options, 0);
+        EXPECT_THROW(options.element(), VelaMediaLibException);
         options.key("a") << 1;
         options.key("list");
         {
             JSONWriter list(options, object.memberLevel(), JSONWriter::Array);
             options.element() << 2;
+            EXPECT_THROW(options.key("x"), VelaMediaLibException);
             options.element() << 3;
         }
         options.key("b") << 4; // the separator belongs to the object again
@@ -208,16 +241,6 @@ TEST(JSONWriter, IndentsNestedObjectsAndArrays) {
     XMLOptions emptyOptions(empty);
     JSONWriter(emptyOptions, 1).close();
     EXPECT_EQ(empty.str(), "{\n  }");
-}
-
-TEST(JSONWriter, RefusesAKeyInAnArrayAndAnElementInAnObject) {
-    std::ostringstream out;
-    XMLOptions options(out);
-    JSONWriter object(options, 0);
-    EXPECT_THROW(options.element(), VelaMediaLibException);
-    options.key("list");
-    JSONWriter list(options, 1, JSONWriter::Array);
-    EXPECT_THROW(options.key("x"), VelaMediaLibException);
 }
 
 TEST(XMLOptions, IdentsAndPaths) {
