@@ -1,4 +1,6 @@
 // Track queries and placement against plain maps, and the timeline-wide query.
+#include "Interleaved.h"
+
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 #include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
@@ -29,27 +31,51 @@ std::vector<VelaTime> randomTicks(VelaTime end) {
     return ticks;
 }
 
-void BM_MediaAtTime_StdMapBaseline(benchmark::State& state) {
-    std::map<long long, boost::shared_ptr<int>> starts;
-    for (int i = 0; i < kClips; ++i) starts[i * kStep] = boost::make_shared<int>(i);
-    const std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
-    size_t i = 0;
-    for (auto _ : state) {
-        const auto at = starts.upper_bound(ticks[i++ % ticks.size()]);
-        const boost::shared_ptr<int> found =
-            at == starts.begin() ? boost::shared_ptr<int>() : std::prev(at)->second;
-        benchmark::DoNotOptimize(found); // the clip is handed out as a shared pointer, as the track does
+// A track of kClips clips and a bare map of the very same clip pointers by
+// start: the baseline the query is held against.
+struct Filled {
+    Project project;
+    boost::shared_ptr<GenericTrack> track = GenericTrack::create(project.token);
+    std::map<long long, MediaPtr> starts;
+    std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
+
+    Filled() {
+        for (int i = 0; i < kClips; ++i) {
+            const MediaPtr clip = PlaceholderMedia::create(project.token, project.rate, 0, kClipLength);
+            track->addMedia(clip, i * kStep);
+            starts[i * kStep] = clip;
+        }
     }
+    static Filled& once() {
+        static Filled filled;
+        return filled;
+    }
+    VelaTime tick(size_t i) const { return ticks[i % ticks.size()]; }
+
+    void baseline(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) {
+            const auto at = starts.upper_bound(tick(i));
+            const MediaPtr found = at == starts.begin() ? MediaPtr() : std::prev(at)->second;
+            benchmark::DoNotOptimize(found); // handed out as a shared pointer, as the track does
+        }
+    }
+    void library(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) benchmark::DoNotOptimize(track->mediaAtTime(tick(i)));
+    }
+};
+
+void BM_MediaAtTime_VsStdMap(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::compare(
+        state, 256, [&](size_t first, size_t count) { filled.baseline(first, count); },
+        [&](size_t first, size_t count) { filled.library(first, count); });
 }
 
-void BM_MediaAtTime_Track(benchmark::State& state) {
-    Project project;
-    const auto track = GenericTrack::create(project.token);
-    for (int i = 0; i < kClips; ++i)
-        track->addMedia(PlaceholderMedia::create(project.token, project.rate, 0, kClipLength), i * kStep);
-    const std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
-    size_t i = 0;
-    for (auto _ : state) benchmark::DoNotOptimize(track->mediaAtTime(ticks[i++ % ticks.size()]));
+void BM_MediaAtTime_TwoReaders(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::scaling(
+        state, 200000, [&](size_t first, size_t count) { filled.baseline(first, count); },
+        [&](size_t first, size_t count) { filled.library(first, count); });
 }
 
 void BM_PlaceClipsEndToEnd(benchmark::State& state) {
@@ -88,7 +114,7 @@ void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
 
 } // namespace
 
-BENCHMARK(BM_MediaAtTime_StdMapBaseline);
-BENCHMARK(BM_MediaAtTime_Track);
+BENCHMARK(BM_MediaAtTime_VsStdMap);
+BENCHMARK(BM_MediaAtTime_TwoReaders)->Unit(benchmark::kMillisecond)->Iterations(10);
 BENCHMARK(BM_PlaceClipsEndToEnd)->Unit(benchmark::kMillisecond)->Iterations(2);
 BENCHMARK(BM_AllMediasAtTime_20TracksOf5000)->Unit(benchmark::kMicrosecond);

@@ -1,9 +1,11 @@
 #pragma once
 
+#include <VelaMediaLib/base/detail/Int128.h>
 #include <VelaMediaLib/time/rational/RationalTime.h>
 
 #include <algorithm>
 #include <boost/shared_ptr.hpp>
+#include <utility>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -13,8 +15,14 @@ namespace VelaMediaLib {
 /// that lies together.
 template <typename K>
 struct KeyFrameEntry {
+    KeyFrameEntry(const RationalTime& at, boost::shared_ptr<K> frame)
+        : time(at), keyframe(std::move(frame)), seconds(at.asDouble()) {}
+
     RationalTime time;
     boost::shared_ptr<K> keyframe;
+    /// The time as a double: a query finds its place among these with cheap
+    /// comparisons, and the exact times settle the place.
+    double seconds;
 };
 
 template <typename K>
@@ -29,6 +37,17 @@ public:
         return std::lower_bound(
             map.begin(), map.end(), t,
             [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
+    }
+    /// firstAtOrAfter for a query: a search of the entries' seconds for the
+    /// time's, then exact steps at the found place, which a double that
+    /// rounds the same as a neighbour's might leave one or two entries off.
+    static ConstIterator locate(const Map& map, const RationalTime& t, double seconds) {
+        ConstIterator at =
+            std::lower_bound(map.begin(), map.end(), seconds,
+                             [](const KeyFrameEntry<K>& entry, double s) { return entry.seconds < s; });
+        while (at != map.begin() && !less(std::prev(at)->time, t)) --at;
+        while (at != map.end() && less(at->time, t)) ++at;
+        return at;
     }
     static Iterator firstAtOrAfter(Map& map, const RationalTime& t) {
         return std::lower_bound(
@@ -65,6 +84,14 @@ public:
     static bool anyInRange(const Map& map, const RationalTime& start, const RationalTime& end) {
         const ConstIterator first = firstAtOrAfter(map, start);
         return first != map.end() && first->time <= end;
+    }
+
+private:
+    /// Exact a < b without a call: denominators are positive.
+    static bool less(const RationalTime& a, const RationalTime& b) {
+        const SafeRational x = a.asRational(), y = b.asRational();
+        return detail::Int128(x.numerator()) * y.denominator() <
+               detail::Int128(y.numerator()) * x.denominator();
     }
 };
 
