@@ -14,13 +14,16 @@ size_t ClipIndex::find(VelaTime start) const {
     return size_t(std::lower_bound(starts_.begin(), starts_.end(), start) - starts_.begin());
 }
 
-// Reserving first keeps an insert all-or-nothing: the three inserts below
-// cannot throw once there is room.
+// Making room first keeps an insert all-or-nothing: the three inserts below
+// cannot throw once there is room. Room grows by doubling, as push_back's does.
 void ClipIndex::insert(VelaTime start, VelaTime end, const boost::shared_ptr<Media>& media) {
     const size_t at = find(start);
-    starts_.reserve(starts_.size() + 1);
-    ends_.reserve(ends_.size() + 1);
-    medias_.reserve(medias_.size() + 1);
+    const auto makeRoom = [](auto& items) {
+        if (items.size() == items.capacity()) items.reserve(std::max<size_t>(16, 2 * items.size()));
+    };
+    makeRoom(starts_);
+    makeRoom(ends_);
+    makeRoom(medias_);
     starts_.insert(starts_.begin() + std::ptrdiff_t(at), start);
     ends_.insert(ends_.begin() + std::ptrdiff_t(at), end);
     medias_.insert(medias_.begin() + std::ptrdiff_t(at), media);
