@@ -7,6 +7,7 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <atomic>
 #include <chrono>
 #include <functional>
@@ -25,25 +26,33 @@ inline double nanoseconds(Clock::duration d) {
 typedef std::function<void(size_t first, size_t count)> Batch;
 
 /// Alternates baseline and library batches, taking turns at going first;
-/// reports ns per query of each and "ratio_to_baseline" (library / baseline).
+/// reports ns per query of each and "ratio_to_baseline", the median over the
+/// iterations of library time / baseline time, so that a batch cut short by
+/// the scheduler does not sway it.
 inline void compare(benchmark::State& state, size_t batch, const Batch& baseline, const Batch& library) {
     Clock::duration spentBaseline{}, spentLibrary{};
+    std::vector<double> ratios;
     size_t first = 0;
     bool baselineFirst = true;
     for (auto _ : state) {
+        Clock::duration spent[2] = {};
         for (int turn = 0; turn < 2; ++turn) {
             const bool runBaseline = (turn == 0) == baselineFirst;
             const Clock::time_point start = Clock::now();
             (runBaseline ? baseline : library)(first, batch);
-            (runBaseline ? spentBaseline : spentLibrary) += Clock::now() - start;
+            spent[runBaseline ? 0 : 1] += Clock::now() - start;
         }
+        spentBaseline += spent[0];
+        spentLibrary += spent[1];
+        ratios.push_back(nanoseconds(spent[1]) / nanoseconds(spent[0]));
         baselineFirst = !baselineFirst;
         first += batch;
     }
     const double queries = double(state.iterations()) * double(batch);
+    std::nth_element(ratios.begin(), ratios.begin() + std::ptrdiff_t(ratios.size() / 2), ratios.end());
     state.counters["baseline_ns"] = nanoseconds(spentBaseline) / queries;
     state.counters["library_ns"] = nanoseconds(spentLibrary) / queries;
-    state.counters["ratio_to_baseline"] = nanoseconds(spentLibrary) / nanoseconds(spentBaseline);
+    state.counters["ratio_to_baseline"] = ratios[ratios.size() / 2];
 }
 
 /// Wall time of `threads` threads running `count` queries each at once, each
@@ -71,11 +80,14 @@ inline Clock::duration runThreads(int threads, size_t count, const Batch& query)
 /// the library and, as the machine's own limit, for the baseline.
 inline void scaling(benchmark::State& state, size_t count, const Batch& baseline, const Batch& library) {
     Clock::duration one{}, two{}, baseOne{}, baseTwo{};
+    bool oneFirst = true;
     for (auto _ : state) {
-        one += runThreads(1, count, library);
-        two += runThreads(2, count, library);
-        baseOne += runThreads(1, count, baseline);
-        baseTwo += runThreads(2, count, baseline);
+        for (int turn = 0; turn < 2; ++turn) {
+            const int threads = (turn == 0) == oneFirst ? 1 : 2;
+            (threads == 1 ? one : two) += runThreads(threads, count, library);
+            (threads == 1 ? baseOne : baseTwo) += runThreads(threads, count, baseline);
+        }
+        oneFirst = !oneFirst;
     }
     state.counters["scaling"] = 2.0 * nanoseconds(one) / nanoseconds(two);
     state.counters["baseline_scaling"] = 2.0 * nanoseconds(baseOne) / nanoseconds(baseTwo);

@@ -3,6 +3,7 @@
 #include <VelaMediaLib/model/media/Media.h>
 
 #include <algorithm>
+#include <cassert>
 
 namespace VelaMediaLib {
 
@@ -31,6 +32,7 @@ void ClipIndex::insert(VelaTime start, VelaTime end, const boost::shared_ptr<Med
 
 void ClipIndex::erase(VelaTime start) {
     const size_t at = find(start);
+    assert(at < starts_.size() && starts_[at] == start && "the index lost step with its track's map");
     if (at == starts_.size() || starts_[at] != start) return;
     starts_.erase(starts_.begin() + std::ptrdiff_t(at));
     ends_.erase(ends_.begin() + std::ptrdiff_t(at));
@@ -40,7 +42,8 @@ void ClipIndex::erase(VelaTime start) {
 // A move may carry the clip past others into a far gap: the entries between
 // its old and new places shift by one, the rest stay.
 void ClipIndex::retime(VelaTime from, VelaTime start, VelaTime end) {
-    size_t at = find(from);
+    const size_t at = find(from);
+    assert(at < starts_.size() && starts_[at] == from && "the index lost step with its track's map");
     if (at == starts_.size() || starts_[at] != from) return;
     const size_t to = find(start) - (start > from ? 1 : 0);
     const auto shift = [&](auto& items) {

@@ -20,15 +20,16 @@ public:
     size_t size() const { return starts_.size(); }
     VelaTime start(size_t i) const { return starts_[i]; }
     VelaTime end(size_t i) const { return ends_[i]; }
+    /// Valid until the index next changes: copy it before the lock is released.
     const boost::shared_ptr<Media>& media(size_t i) const { return medias_[i]; }
 
     /// How many clips start at or before t: the one holding t, if any, is the last of them.
     size_t countStartingBy(VelaTime t) const;
 
     void insert(VelaTime start, VelaTime end, const boost::shared_ptr<Media>& media);
-    /// Drops the clip starting at start; nothing when none does.
+    /// Drops the clip starting at start (one must).
     void erase(VelaTime start);
-    /// The clip that started at `from` now spans [start, end).
+    /// The clip that started at `from` (one must) now spans [start, end).
     void retime(VelaTime from, VelaTime start, VelaTime end);
 
 private:

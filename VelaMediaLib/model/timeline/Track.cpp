@@ -83,7 +83,6 @@ void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
         const MediaState placed =
             media->stateAfter(Media::TimingEdit::of(Media::TimingEdit::SetStart, start));
         refuseCollision(placed.trackRange(), media);
-        moved = media->takeStateUnnotified(placed);
         const auto keyed = medias_.emplace(start, media).first;
         try {
             index_.insert(start, placed.trackRange().end(), media);
@@ -91,6 +90,7 @@ void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
             medias_.erase(keyed);
             throw;
         }
+        moved = media->takeStateUnnotified(placed);
         media->setParent(boost::shared_ptr<SubTimeline>(shared_from_this()));
         Transition::mergeMediaPairTransitions(mediaAtTime(start));
         Transition::mergeMediaPairTransitions(mediaAtTime(media->endTime()));

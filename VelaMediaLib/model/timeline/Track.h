@@ -67,7 +67,7 @@ public:
     MediaMap mediaMap() const;
     /// Iterators over the map itself, by start, without copying it. The
     /// caller must hold the project's read lock (ScopedReadLock on the
-    /// track's projectMutex()) for as long as it uses them: any edit of the
+    /// track's projectLock()) for as long as it uses them: any edit of the
     /// track may invalidate them.
     MediaMap::const_iterator mediaBegin() const { return medias_.begin(); }
     MediaMap::const_iterator mediaEnd() const { return medias_.end(); }

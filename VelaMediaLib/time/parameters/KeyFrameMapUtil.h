@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <boost/shared_ptr.hpp>
+#include <cstddef>
 #include <utility>
 #include <vector>
 
@@ -21,7 +22,9 @@ struct KeyFrameEntry {
     RationalTime time;
     boost::shared_ptr<K> keyframe;
     /// The time as a double: a query finds its place among these with cheap
-    /// comparisons, and the exact times settle the place.
+    /// comparisons, and the exact times settle the place (so a stale value
+    /// would cost speed, never exactness). Set with the time; entries are
+    /// replaced whole, never retimed in place.
     double seconds;
 };
 
@@ -38,16 +41,30 @@ public:
             map.begin(), map.end(), t,
             [](const KeyFrameEntry<K>& entry, const RationalTime& time) { return entry.time < time; });
     }
-    /// firstAtOrAfter for a query: a search of the entries' seconds for the
-    /// time's, then exact steps at the found place, which a double that
-    /// rounds the same as a neighbour's might leave one or two entries off.
+    /// firstAtOrAfter for a query: a binary search of the entries' seconds
+    /// for the time's, then exact steps at the found place. Doubles of times
+    /// closer than a double can tell apart may tie or even fall out of order
+    /// (a 64-bit numerator rounds on conversion), leaving the place a few
+    /// entries off; past a few steps the exact search takes over.
     static ConstIterator locate(const Map& map, const RationalTime& t, double seconds) {
-        ConstIterator at =
-            std::lower_bound(map.begin(), map.end(), seconds,
-                             [](const KeyFrameEntry<K>& entry, double s) { return entry.seconds < s; });
-        while (at != map.begin() && !less(std::prev(at)->time, t)) --at;
-        while (at != map.end() && less(at->time, t)) ++at;
-        return at;
+        size_t low = 0, high = map.size(); // a plain halving: defined whatever order the doubles are in
+        while (low < high) {
+            const size_t middle = low + (high - low) / 2;
+            if (map[middle].seconds < seconds)
+                low = middle + 1;
+            else
+                high = middle;
+        }
+        ConstIterator at = map.begin() + std::ptrdiff_t(low);
+        for (int steps = 0; steps < kMaxSteps; ++steps) {
+            if (at != map.begin() && !less(std::prev(at)->time, t))
+                --at;
+            else if (at != map.end() && less(at->time, t))
+                ++at;
+            else
+                return at;
+        }
+        return firstAtOrAfter(map, t);
     }
     static Iterator firstAtOrAfter(Map& map, const RationalTime& t) {
         return std::lower_bound(
@@ -87,6 +104,8 @@ public:
     }
 
 private:
+    static const int kMaxSteps = 4;
+
     /// Exact a < b without a call: denominators are positive.
     static bool less(const RationalTime& a, const RationalTime& b) {
         const SafeRational x = a.asRational(), y = b.asRational();
