@@ -69,6 +69,7 @@
 #include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/model/project/SubProject.h>
 #include <VelaMediaLib/model/timeline/ClipBoard.h>
+#include <VelaMediaLib/model/timeline/ClipIndex.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>

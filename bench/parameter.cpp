@@ -1,6 +1,7 @@
 // A parameter's valueAtTime against a plain std::map curve, and what
 // parameters and keyframes cost in memory.
 #include "AllocationCounter.h"
+#include "Interleaved.h"
 
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
@@ -25,29 +26,59 @@ std::vector<double> queryTimes() {
     return times;
 }
 
-void BM_ValueAtTime_StdMapBaseline(benchmark::State& state) {
-    std::map<double, double> curve;
-    for (int i = 0; i < kKeyFrames; ++i) curve[i * 10.0] = double(i % 7);
-    const std::vector<double> times = queryTimes();
-    size_t i = 0;
-    for (auto _ : state) {
-        const double t = times[i++ % kQueries];
-        const auto next = curve.upper_bound(t);
-        const auto previous = std::prev(next);
-        const double w = (t - previous->first) / (next->first - previous->first);
-        benchmark::DoNotOptimize(w * next->second + (1.0 - w) * previous->second);
+// A linear curve of kKeyFrames keyframes, as a parameter and as a bare map,
+// asked at the same random times.
+struct Curve {
+    boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
+    boost::shared_ptr<InterpolatingParam<double>> parameter =
+        InterpolatingParam<double>::create(project, "x", 0.0);
+    std::map<double, double> bare;
+    std::vector<double> seconds = queryTimes();
+    std::vector<RationalTime> times;
+
+    Curve() {
+        bare[0.0] = 0.0;
+        for (int i = 1; i < kKeyFrames; ++i) {
+            parameter->addKeyFrame(RationalTime(i * 10), double(i % 7), RationalTime(0));
+            bare[i * 10.0] = double(i % 7);
+        }
+        for (double& t : seconds) {
+            times.push_back(RationalTime((long long)(t * 1000), 1000));
+            t = times.back().asDouble(); // both sides ask the very same times
+        }
     }
+    static Curve& once() {
+        static Curve curve;
+        return curve;
+    }
+
+    void baseline(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) {
+            const double t = seconds[i % kQueries];
+            const auto next = bare.upper_bound(t);
+            const auto previous = std::prev(next);
+            const double w = (t - previous->first) / (next->first - previous->first);
+            benchmark::DoNotOptimize(w * next->second + (1.0 - w) * previous->second);
+        }
+    }
+    void library(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i)
+            benchmark::DoNotOptimize(parameter->valueAtTime(times[i % kQueries]));
+    }
+};
+
+void BM_ValueAtTime_VsStdMap(benchmark::State& state) {
+    const Curve& curve = Curve::once();
+    Interleaved::compare(
+        state, 256, [&](size_t first, size_t count) { curve.baseline(first, count); },
+        [&](size_t first, size_t count) { curve.library(first, count); });
 }
 
-void BM_ValueAtTime_Parameter(benchmark::State& state) {
-    const boost::shared_ptr<ThreadSafe> project = boost::make_shared<ThreadSafe>();
-    auto parameter = InterpolatingParam<double>::create(project, "x", 0.0);
-    for (int i = 1; i < kKeyFrames; ++i)
-        parameter->addKeyFrame(RationalTime(i * 10), double(i % 7), RationalTime(0));
-    std::vector<RationalTime> times;
-    for (double t : queryTimes()) times.push_back(RationalTime((long long)(t * 1000), 1000));
-    size_t i = 0;
-    for (auto _ : state) benchmark::DoNotOptimize(parameter->valueAtTime(times[i++ % kQueries]));
+void BM_ValueAtTime_TwoReaders(benchmark::State& state) {
+    const Curve& curve = Curve::once();
+    Interleaved::scaling(
+        state, 200000, [&](size_t first, size_t count) { curve.baseline(first, count); },
+        [&](size_t first, size_t count) { curve.library(first, count); });
 }
 
 void BM_Memory_DoubleParameter(benchmark::State& state) {
@@ -68,6 +99,6 @@ void BM_Memory_DoubleParameter(benchmark::State& state) {
 
 } // namespace
 
-BENCHMARK(BM_ValueAtTime_StdMapBaseline);
-BENCHMARK(BM_ValueAtTime_Parameter);
+BENCHMARK(BM_ValueAtTime_VsStdMap);
+BENCHMARK(BM_ValueAtTime_TwoReaders)->Unit(benchmark::kMillisecond)->Iterations(10);
 BENCHMARK(BM_Memory_DoubleParameter)->Iterations(3);

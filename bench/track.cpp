@@ -1,10 +1,13 @@
 // Track queries and placement against plain maps, and the timeline-wide query.
+#include "Interleaved.h"
+
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 #include <VelaMediaLib/time/rational/SimpleProjectEditRate.h>
 
 #include <benchmark/benchmark.h>
 #include <boost/make_shared.hpp>
+#include <algorithm>
 #include <map>
 #include <random>
 
@@ -29,27 +32,77 @@ std::vector<VelaTime> randomTicks(VelaTime end) {
     return ticks;
 }
 
-void BM_MediaAtTime_StdMapBaseline(benchmark::State& state) {
-    std::map<long long, boost::shared_ptr<int>> starts;
-    for (int i = 0; i < kClips; ++i) starts[i * kStep] = boost::make_shared<int>(i);
-    const std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
-    size_t i = 0;
-    for (auto _ : state) {
-        const auto at = starts.upper_bound(ticks[i++ % ticks.size()]);
-        const boost::shared_ptr<int> found =
-            at == starts.begin() ? boost::shared_ptr<int>() : std::prev(at)->second;
-        benchmark::DoNotOptimize(found); // the clip is handed out as a shared pointer, as the track does
+// A track of kClips clips and two bare stand-ins holding the very same clip
+// pointers, built once all clips exist: sorted flat arrays of starts, ends and
+// clips (the track's own index shape, answering the same question the same
+// way without a lock), and a map by start (no end check: the floor any
+// container could reach).
+struct Filled {
+    Project project;
+    boost::shared_ptr<GenericTrack> track = GenericTrack::create(project.token);
+    std::vector<VelaTime> starts, ends;
+    std::vector<MediaPtr> clips;
+    std::map<long long, MediaPtr> byStart;
+    std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
+
+    Filled() {
+        for (int i = 0; i < kClips; ++i) {
+            clips.push_back(PlaceholderMedia::create(project.token, project.rate, 0, kClipLength));
+            track->addMedia(clips.back(), i * kStep);
+        }
+        for (int i = 0; i < kClips; ++i) {
+            starts.push_back(i * kStep);
+            ends.push_back(i * kStep + kClipLength);
+            byStart[i * kStep] = clips[size_t(i)];
+        }
     }
+    static Filled& once() {
+        static Filled filled;
+        return filled;
+    }
+    VelaTime tick(size_t i) const { return ticks[i % ticks.size()]; }
+
+    Track::Pair flat(VelaTime t) const {
+        const size_t count = size_t(std::upper_bound(starts.begin(), starts.end(), t) - starts.begin());
+        if (count == 0) return Track::Pair();
+        const size_t at = count - 1;
+        if (starts[at] == t && at > 0 && ends[at - 1] == t) return Track::Pair(clips[at - 1], clips[at]);
+        return t < ends[at] ? Track::Pair(clips[at], MediaPtr()) : Track::Pair();
+    }
+    void flatArrays(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) benchmark::DoNotOptimize(flat(tick(i)));
+    }
+    void map(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) {
+            const auto at = byStart.upper_bound(tick(i));
+            const MediaPtr found = at == byStart.begin() ? MediaPtr() : std::prev(at)->second;
+            benchmark::DoNotOptimize(found); // handed out as a shared pointer, as the track does
+        }
+    }
+    void library(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) benchmark::DoNotOptimize(track->mediaAtTime(tick(i)));
+    }
+};
+
+void BM_MediaAtTime_VsFlatArrays(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::compare(
+        state, 256, [&](size_t first, size_t count) { filled.flatArrays(first, count); },
+        [&](size_t first, size_t count) { filled.library(first, count); });
 }
 
-void BM_MediaAtTime_Track(benchmark::State& state) {
-    Project project;
-    const auto track = GenericTrack::create(project.token);
-    for (int i = 0; i < kClips; ++i)
-        track->addMedia(PlaceholderMedia::create(project.token, project.rate, 0, kClipLength), i * kStep);
-    const std::vector<VelaTime> ticks = randomTicks(kClips * kStep);
-    size_t i = 0;
-    for (auto _ : state) benchmark::DoNotOptimize(track->mediaAtTime(ticks[i++ % ticks.size()]));
+void BM_MediaAtTime_VsStdMap(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::compare(
+        state, 256, [&](size_t first, size_t count) { filled.map(first, count); },
+        [&](size_t first, size_t count) { filled.library(first, count); });
+}
+
+void BM_MediaAtTime_TwoReaders(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::scaling(
+        state, 200000, [&](size_t first, size_t count) { filled.flatArrays(first, count); },
+        [&](size_t first, size_t count) { filled.library(first, count); });
 }
 
 void BM_PlaceClipsEndToEnd(benchmark::State& state) {
@@ -86,9 +139,30 @@ void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
     for (auto _ : state) benchmark::DoNotOptimize(timeline->allMediasAtTime(ticks[i++ % ticks.size()]));
 }
 
+// Placing clips front first shifts the whole index each time: the worst order.
+void BM_PlaceClipsFrontFirst(benchmark::State& state) {
+    Project project;
+    const int clips = 10000;
+    for (auto _ : state) {
+        state.PauseTiming();
+        std::vector<MediaPtr> made;
+        for (int i = 0; i < clips; ++i)
+            made.push_back(PlaceholderMedia::create(project.token, project.rate, 0, 30));
+        const auto track = GenericTrack::create(project.token);
+        state.ResumeTiming();
+        for (int i = clips - 1; i >= 0; --i) track->addMedia(made[size_t(i)], i * 30LL);
+        state.PauseTiming();
+        made.clear();
+        state.ResumeTiming();
+    }
+    state.SetItemsProcessed(state.iterations() * clips);
+}
+
 } // namespace
 
-BENCHMARK(BM_MediaAtTime_StdMapBaseline);
-BENCHMARK(BM_MediaAtTime_Track);
+BENCHMARK(BM_MediaAtTime_VsFlatArrays);
+BENCHMARK(BM_MediaAtTime_VsStdMap);
+BENCHMARK(BM_MediaAtTime_TwoReaders)->Unit(benchmark::kMillisecond)->Iterations(10);
 BENCHMARK(BM_PlaceClipsEndToEnd)->Unit(benchmark::kMillisecond)->Iterations(2);
+BENCHMARK(BM_PlaceClipsFrontFirst)->Unit(benchmark::kMillisecond)->Iterations(2);
 BENCHMARK(BM_AllMediasAtTime_20TracksOf5000)->Unit(benchmark::kMicrosecond);

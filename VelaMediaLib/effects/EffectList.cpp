@@ -43,23 +43,23 @@ bool EffectList::swap(size_t first, size_t second) {
 }
 
 EffectList::EffectPtr EffectList::at(size_t index) const {
-    ScopedReadLock lock(owner_.projectMutex());
+    ScopedReadLock lock(owner_.projectLock());
     checkIndex(index, effects_.size());
     return effects_[index];
 }
 
 size_t EffectList::size() const {
-    ScopedReadLock lock(owner_.projectMutex());
+    ScopedReadLock lock(owner_.projectLock());
     return effects_.size();
 }
 
 EffectList::Effects EffectList::all() const {
-    ScopedReadLock lock(owner_.projectMutex());
+    ScopedReadLock lock(owner_.projectLock());
     return effects_;
 }
 
 EffectList::Effects EffectList::withName(const std::string& name) const {
-    ScopedReadLock lock(owner_.projectMutex());
+    ScopedReadLock lock(owner_.projectLock());
     Effects named;
     for (const EffectPtr& effect : effects_)
         if (effect->effectName() == name) named.push_back(effect);
@@ -67,7 +67,7 @@ EffectList::Effects EffectList::withName(const std::string& name) const {
 }
 
 EffectList::Effects EffectList::cloned() const {
-    ScopedReadLock lock(owner_.projectMutex());
+    ScopedReadLock lock(owner_.projectLock());
     Effects copies;
     for (const EffectPtr& effect : effects_) copies.push_back(effect->cloneEffect());
     return copies;

@@ -32,7 +32,7 @@ void CloseGapsOnTrackCmd::cancel() {
 }
 
 bool CloseGapsOnTrackCmd::hasGap(const Track& track) {
-    ScopedReadLock lock(track.projectMutex()); // one snapshot of the whole track
+    ScopedReadLock lock(track.projectLock()); // one snapshot of the whole track
     VelaTime expected = 0;
     for (const MediaPtr& media : track.medias()) {
         const Range<VelaTime> range = media->lockedTrackRange();
@@ -57,7 +57,7 @@ bool CloseGapsOnTrackCmd::execute(CommandHandler* handler) {
 void CloseGapsOnTrackCmd::executeCommands(const CommandHandler*) {
     std::vector<Shift> shifts;
     {
-        ScopedReadLock lock(track_->projectMutex());
+        ScopedReadLock lock(track_->projectLock());
         VelaTime position = 0;
         for (const MediaPtr& media : track_->medias()) {
             const Range<VelaTime> range = media->lockedTrackRange();

@@ -37,7 +37,7 @@ boost::shared_ptr<SubTimeline> AudioMediaImpl::parentTrack() const {
 }
 
 boost::shared_ptr<Media> AudioMediaImpl::parentUnifiedMedia() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parentUnified_.lock();
 }
 
@@ -58,7 +58,7 @@ void AudioMediaImpl::addAudioFadeEdgeMods(VelaTime fadeIn, VelaTime fadeOut) {
 }
 
 std::vector<CaptionData> AudioMediaImpl::captions() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return captions_;
 }
 
@@ -71,7 +71,7 @@ void AudioMediaImpl::setCaptions(const std::vector<CaptionData>& captions) {
 }
 
 std::string AudioMediaImpl::transcription() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return transcription_;
 }
 

@@ -37,7 +37,7 @@ MediaImpl::MediaImpl(const boost::weak_ptr<const ThreadSafe>& token,
 MediaImpl::~MediaImpl() { delete oldEditor_.load(); }
 
 MediaState MediaImpl::state() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return state_;
 }
 
@@ -46,12 +46,12 @@ VelaTime MediaImpl::endTime() const { return trackRange().end(); }
 VelaTime MediaImpl::duration() const { return trackRange().duration(); }
 
 Range<VelaTime> MediaImpl::trackRange() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return state_.trackRange();
 }
 
 boost::weak_ptr<ProjectEditRate> MediaImpl::projectEditRate() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return editRate_;
 }
 
@@ -115,7 +115,7 @@ MediaState MediaImpl::defaultState() const {
 }
 
 MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return lockedStateAfter(edit);
 }
 
@@ -203,19 +203,19 @@ MediaEditor& MediaImpl::mediaEditor() {
 }
 
 TransitionPtr MediaImpl::leftTransition() {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return left_;
 }
 TransitionPtr MediaImpl::leftTransition() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return left_;
 }
 TransitionPtr MediaImpl::rightTransition() {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return right_;
 }
 TransitionPtr MediaImpl::rightTransition() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return right_;
 }
 
@@ -244,7 +244,7 @@ void MediaImpl::setRightTransition(const TransitionPtr& transition) {
 }
 
 TransitionPtr MediaImpl::transitionAtTime(VelaTime time) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     const Range<VelaTime> range = state_.trackRange();
     if (left_ && time >= range.start() && time < range.start() + left_->duration()) return left_;
     if (right_ && time < range.end() && time >= range.end() - right_->duration()) return right_;
@@ -277,24 +277,24 @@ SafeRational MediaImpl::thisParametricTimeToParentParametricTime(const SafeRatio
 
 // One read lock for the whole walk, so that no edit falls between its steps.
 RationalTime MediaImpl::fromGlobalToParametricTime(const RationalTime& time) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return TimeConverter::recursiveFromGlobalToParametricTime(this, time.asRational());
 }
 
 RationalTime MediaImpl::fromParametricToGlobalTime(const RationalTime& time) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return TimeConverter::recursiveFromParametricToGlobalTime(this, time.asRational());
 }
 
 RationalTime MediaImpl::clippingFromGlobalToParametricTime(const RationalTime& time) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return TimeConverter::clippingRecursiveFromGlobalToParametricTime(this, time.asRational());
 }
 
 // Followed outward at each call: a track leads to its mixer's timeline, a
 // group to its own parent timeline.
 boost::weak_ptr<Timeline> MediaImpl::parentTimeline() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     const boost::shared_ptr<SubTimeline> container = parent_.lock();
     if (const auto track = boost::dynamic_pointer_cast<Track>(container)) return track->parentTimeline();
     if (const auto group = boost::dynamic_pointer_cast<Media>(container)) return group->parentTimeline();
@@ -302,7 +302,7 @@ boost::weak_ptr<Timeline> MediaImpl::parentTimeline() const {
 }
 
 boost::shared_ptr<SubTimeline> MediaImpl::parent() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parent_.lock();
 }
 
@@ -328,7 +328,7 @@ void MediaImpl::copyContentInto(MediaImpl& clone) const {
     copyAttributesTo(clone);
     for (const auto& entry : metaDataCopy()) clone.addMetaData(entry.first, entry.second);
     clone.effectList().replaceAll(effectList().cloned());
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     for (const EdgeModificationPtr& edge : leftEdges_)
         clone.leftEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
     for (const EdgeModificationPtr& edge : rightEdges_)
@@ -440,12 +440,12 @@ void MediaImpl::setRightEdgeModificationLength(VelaTime length) {
 }
 
 EdgeModifiable::EdgeModifications MediaImpl::leftEdgeModifications() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return leftEdges_;
 }
 
 EdgeModifiable::EdgeModifications MediaImpl::rightEdgeModifications() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return rightEdges_;
 }
 
@@ -453,7 +453,7 @@ VelaTime MediaImpl::leftEdgeModificationLength() const { return longest(leftEdge
 VelaTime MediaImpl::rightEdgeModificationLength() const { return longest(rightEdgeModifications()); }
 
 std::set<std::string> MediaImpl::edgeModGroupNames() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::set<std::string> names;
     for (const EdgeModificationPtr& modification : leftEdges_) names.insert(modification->group());
     for (const EdgeModificationPtr& modification : rightEdges_) names.insert(modification->group());

@@ -18,11 +18,11 @@ public:
     explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
 
     std::vector<boost::shared_ptr<Source>> sources() const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         return sources_;
     }
     size_t size() const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         return sources_.size();
     }
 

@@ -25,7 +25,7 @@ public:
         return true;
     }
     std::vector<MixerPtr> clippings() const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         return clippings_;
     }
 

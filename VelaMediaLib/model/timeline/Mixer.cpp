@@ -52,25 +52,25 @@ void Mixer::removeTracks(const Tracks& tracks) {
 }
 
 TrackPtr Mixer::trackAtIndex(unsigned index) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (index >= tracks_.size())
         throw IndexException("track index " + std::to_string(index) + " out of range");
     return tracks_[index];
 }
 
 int Mixer::indexForTrack(const TrackPtr& track) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     const auto found = std::find(tracks_.begin(), tracks_.end(), track);
     return found == tracks_.end() ? -1 : int(found - tracks_.begin());
 }
 
 Mixer::Tracks Mixer::tracks() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return tracks_;
 }
 
 size_t Mixer::numTracks() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return tracks_.size();
 }
 
@@ -122,7 +122,7 @@ VelaTime Mixer::endTime() const {
 }
 
 VelaTime Mixer::endTimeNotIncludingHiddenAndMutedTracks() const {
-    ScopedReadLock lock(projectMutex()); // the solo mode and the ends read together
+    ScopedReadLock lock(projectLock()); // the solo mode and the ends read together
     const bool solo = isInSoloMode();
     VelaTime end = 0;
     eachTrack([&](const Track& track) {
@@ -138,7 +138,7 @@ bool Mixer::isInSoloMode() const {
 }
 
 boost::shared_ptr<Timeline> Mixer::parentTimeline() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return timeline_.lock();
 }
 
@@ -150,20 +150,20 @@ void Mixer::setParentTimeline(const boost::weak_ptr<Timeline>& timeline) {
 }
 
 boost::shared_ptr<Timeline> Mixer::enclosingTimeline() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (const boost::shared_ptr<Timeline> timeline = timeline_.lock()) return timeline;
     const MediaPtr group = group_.lock();
     return group ? group->parentTimeline().lock() : boost::shared_ptr<Timeline>();
 }
 
 TimeConverterPtr Mixer::parentTimeConverter() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (const MediaPtr group = group_.lock()) return group;
     return timeline_.lock();
 }
 
 MediaPtr Mixer::parentGroup() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return group_.lock();
 }
 

@@ -91,7 +91,7 @@ private:
     /// cannot change the list between steps.
     template <typename Fold>
     void eachTrack(Fold fold) const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         for (const TrackPtr& track : tracks_) fold(*track);
     }
 

@@ -32,7 +32,7 @@ public:
     void notify() override { ObjectSubject::notify(); }
 
     std::string identifier() const override {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return identifier_;
     }
     void setIdentifier(const std::string& identifier) override {

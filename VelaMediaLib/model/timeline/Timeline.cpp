@@ -72,18 +72,18 @@ boost::shared_ptr<ParameterInterface> Timeline::createDefaultParameter(const std
 }
 
 MixerPtr Timeline::mixer(const std::string& name) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     const auto found = mixers_.find(name);
     return found == mixers_.end() ? MixerPtr() : found->second;
 }
 
 MixerPtr Timeline::mixer() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return mixers_.empty() ? MixerPtr() : mixers_.begin()->second;
 }
 
 std::vector<std::string> Timeline::mixerNames() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::vector<std::string> names;
     for (const auto& entry : mixers_) names.push_back(entry.first);
     return names;
@@ -91,7 +91,7 @@ std::vector<std::string> Timeline::mixerNames() const {
 
 std::vector<MixerPtr> Timeline::mixers() const {
     std::vector<MixerPtr> all;
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     for (const auto& entry : mixers_) all.push_back(entry.second);
     return all;
 }
@@ -162,7 +162,7 @@ std::vector<MediaPtr> Timeline::allMedias() const {
 }
 
 std::vector<MediaPtr> Timeline::allMediasAtTime(VelaTime time) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::vector<MediaPtr> clips;
     for (const auto& entry : mixers_)
         for (auto track = entry.second->trackBegin(); track != entry.second->trackEnd(); ++track) {
@@ -200,7 +200,7 @@ VelaTime Timeline::endTimeNotIncludingHiddenAndMutedTracks() const {
 }
 
 CaptionAttributes Timeline::captionAttributes() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return captions_;
 }
 

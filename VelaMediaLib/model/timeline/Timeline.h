@@ -156,7 +156,7 @@ private:
     /// removeMixer cannot take one away between steps.
     template <typename Fold>
     void eachMixer(Fold fold) const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         for (const auto& entry : mixers_) fold(*entry.second);
     }
 

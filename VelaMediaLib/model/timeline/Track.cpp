@@ -83,8 +83,14 @@ void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
         const MediaState placed =
             media->stateAfter(Media::TimingEdit::of(Media::TimingEdit::SetStart, start));
         refuseCollision(placed.trackRange(), media);
+        const auto keyed = medias_.emplace(start, media).first;
+        try {
+            index_.insert(start, placed.trackRange().end(), media);
+        } catch (...) {
+            medias_.erase(keyed);
+            throw;
+        }
         moved = media->takeStateUnnotified(placed);
-        medias_.emplace(start, media);
         media->setParent(boost::shared_ptr<SubTimeline>(shared_from_this()));
         Transition::mergeMediaPairTransitions(mediaAtTime(start));
         Transition::mergeMediaPairTransitions(mediaAtTime(media->endTime()));
@@ -97,23 +103,24 @@ void Track::removeMedia(const MediaPtr& media) {
     ScopedWriteLock lock(projectMutex());
     const auto found = findMedia(media);
     if (found == medias_.end()) throw AddRemoveException("the clip is not on this track");
+    index_.erase(found->first);
     medias_.erase(found);
     media->setParent(boost::weak_ptr<SubTimeline>());
     addObservers_.tell([&](TrackAddObserver& o) { o.onTrackRemoveMedia(*this, media); });
 }
 
 bool Track::hasMedia(const MediaPtr& media) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return findMedia(media) != medias_.end();
 }
 
 size_t Track::numMedias() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return medias_.size();
 }
 
 std::vector<MediaPtr> Track::medias() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::vector<MediaPtr> clips;
     clips.reserve(medias_.size());
     for (const auto& entry : medias_) clips.push_back(entry.second);
@@ -127,7 +134,7 @@ std::vector<MediaPtr> Track::allMedias() const {
 }
 
 Track::MediaMap Track::mediaMap() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return medias_;
 }
 
@@ -143,15 +150,13 @@ std::vector<TransitionPtr> Track::transitions() const {
 // The last clip starting at or before t holds t, unless t is where it starts
 // and the clip before ends: then both touching clips hold it.
 Track::Pair Track::mediaAtTime(VelaTime time) const {
-    ScopedReadLock lock(projectMutex());
-    auto at = medias_.upper_bound(time);
-    if (at == medias_.begin()) return Pair();
-    --at;
-    if (at->first == time && at != medias_.begin()) {
-        const auto before = std::prev(at);
-        if (before->second->lockedTrackRange().end() == time) return Pair(before->second, at->second);
-    }
-    return time < at->second->lockedTrackRange().end() ? Pair(at->second, MediaPtr()) : Pair();
+    ScopedReadLock lock(projectLock());
+    const size_t count = index_.countStartingBy(time);
+    if (count == 0) return Pair();
+    const size_t at = count - 1;
+    if (index_.start(at) == time && at > 0 && index_.end(at - 1) == time)
+        return Pair(index_.media(at - 1), index_.media(at));
+    return time < index_.end(at) ? Pair(index_.media(at), MediaPtr()) : Pair();
 }
 
 namespace {
@@ -173,13 +178,13 @@ std::vector<MediaPtr> intersecting(const Track::MediaMap& medias, const Range<Ve
 
 std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range,
                                                      const MediaPtr& leftOut) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return intersecting(medias_, range, [&](const MediaPtr& media) { return media == leftOut; });
 }
 
 std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range,
                                                      const std::vector<MediaPtr>& leftOut) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return intersecting(medias_, range, [&](const MediaPtr& media) {
         return std::find(leftOut.begin(), leftOut.end(), media) != leftOut.end();
     });
@@ -187,7 +192,7 @@ std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& rang
 
 std::vector<MediaPtr> Track::mediasIntersectingRange(const Range<VelaTime>& range,
                                                      const std::set<MediaPtr>& leftOut) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return intersecting(medias_, range, [&](const MediaPtr& media) { return leftOut.count(media) > 0; });
 }
 
@@ -208,7 +213,7 @@ std::vector<Track::MediaRange> Track::subSection(const Range<VelaTime>& range) c
 MediaPtr Track::getLeftOfMedia(const MediaPtr& media) {
     const boost::shared_ptr<Track> track = trackOf(media);
     if (!track) return MediaPtr();
-    ScopedReadLock lock(track->projectMutex());
+    ScopedReadLock lock(track->projectLock());
     const auto at = track->findMedia(media);
     return at == track->medias_.end() || at == track->medias_.begin() ? MediaPtr() : std::prev(at)->second;
 }
@@ -216,7 +221,7 @@ MediaPtr Track::getLeftOfMedia(const MediaPtr& media) {
 MediaPtr Track::getRightOfMedia(const MediaPtr& media) {
     const boost::shared_ptr<Track> track = trackOf(media);
     if (!track) return MediaPtr();
-    ScopedReadLock lock(track->projectMutex());
+    ScopedReadLock lock(track->projectLock());
     const auto at = track->findMedia(media);
     if (at == track->medias_.end()) return MediaPtr();
     const auto next = std::next(at);
@@ -244,6 +249,7 @@ Track::TransitionAndNeighbour Track::editLocked(const MediaPtr& media, const Med
     if (next.trackRange() != preview) refuseCollision(next.trackRange(), media);
     const TransitionAndNeighbour before = media->splitMergeTransitions();
     changed = media->takeStateUnnotified(next);
+    index_.retime(at->first, next.start, next.trackRange().end());
     if (at->first != next.start) {
         auto node = medias_.extract(at);
         node.key() = next.start;
@@ -356,7 +362,7 @@ bool Track::isVisible(bool soloMode) const {
 }
 
 boost::shared_ptr<Mixer> Track::parentMixer() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parentMixer_.lock();
 }
 
@@ -366,7 +372,7 @@ void Track::setParentMixer(const boost::weak_ptr<Mixer>& mixer) {
 }
 
 MediaPtr Track::parentStitchedMedia() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parentStitched_.lock();
 }
 
@@ -380,23 +386,23 @@ void Track::attachAddObserver(TrackAddObserver* observer) { addObservers_.attach
 void Track::detachAddObserver(TrackAddObserver* observer) { addObservers_.detach(observer, mutex()); }
 
 VelaTime Track::startTime() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return medias_.empty() ? 0 : medias_.begin()->first;
 }
 
 VelaTime Track::endTime() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return medias_.empty() ? 0 : medias_.rbegin()->second->lockedTrackRange().end();
 }
 
 TimeConverterPtr Track::parentTimeConverter() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (const boost::shared_ptr<Mixer> mixer = parentMixer_.lock()) return mixer;
     return parentStitched_.lock();
 }
 
 boost::shared_ptr<Timeline> Track::parentTimeline() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (const boost::shared_ptr<Mixer> mixer = parentMixer_.lock()) return mixer->enclosingTimeline();
     if (const MediaPtr stitched = parentStitched_.lock()) return stitched->parentTimeline().lock();
     return boost::shared_ptr<Timeline>();

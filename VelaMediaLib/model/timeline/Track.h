@@ -5,6 +5,7 @@
 #include <VelaMediaLib/base/Cloneable.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/media/Media.h>
+#include <VelaMediaLib/model/timeline/ClipIndex.h>
 #include <VelaMediaLib/model/timeline/SubTimelineParts.h>
 #include <VelaMediaLib/model/timeline/TrackAddObserver.h>
 
@@ -66,7 +67,7 @@ public:
     MediaMap mediaMap() const;
     /// Iterators over the map itself, by start, without copying it. The
     /// caller must hold the project's read lock (ScopedReadLock on the
-    /// track's projectMutex()) for as long as it uses them: any edit of the
+    /// track's projectLock()) for as long as it uses them: any edit of the
     /// track may invalidate them.
     MediaMap::const_iterator mediaBegin() const { return medias_.begin(); }
     MediaMap::const_iterator mediaEnd() const { return medias_.end(); }
@@ -182,6 +183,7 @@ private:
 
     std::unique_ptr<std::pmr::unsynchronized_pool_resource> nodePool_; // before the map that uses it
     MediaMap medias_;
+    ClipIndex index_; // the map's clips with their ends, for the time queries
     boost::weak_ptr<Mixer> parentMixer_;
     boost::weak_ptr<Media> parentStitched_;
     AddObserverList<TrackAddObserver> addObservers_;

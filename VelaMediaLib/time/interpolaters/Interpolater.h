@@ -26,7 +26,7 @@ public:
     virtual T interpolate(const T& a, const T& b, const RationalTime& t0, const RationalTime& t1, double t,
                           const RationalTime& leadIn = RationalTime()) const {
         RationalTime start = t0;
-        if (leadIn > RationalTime(0)) {
+        if (leadIn.asRational().numerator() > 0) { // denominators are positive
             const RationalTime leadStart(t1.asRational() - leadIn.asRational());
             if (leadStart > t0) start = leadStart;
         }

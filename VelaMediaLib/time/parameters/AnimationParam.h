@@ -33,7 +33,7 @@ public:
     }
 
     std::vector<Animation> animations() const {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return animations_;
     }
     /// Records an animation unless one already starts at the span's start.

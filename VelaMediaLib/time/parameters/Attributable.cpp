@@ -5,7 +5,7 @@
 namespace VelaMediaLib {
 
 Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return attributes_.find(name);
 }
 
@@ -15,12 +15,12 @@ Attributable::AttributePtr Attributable::insertAttribute(const AttributePtr& att
 }
 
 Attributable::AttributePtr Attributable::insertAttributeIfAbsent(const AttributePtr& attribute) {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return attributes_.insertIfAbsent(attribute->name(), attribute);
 }
 
 std::vector<std::string> Attributable::attributeNames() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::vector<std::string> names;
     attributes_.forEach([&](const std::string& name, const AttributePtr&) { names.push_back(name); });
     return names;
@@ -34,7 +34,7 @@ void Attributable::writeAttributes(XMLOptions& options, int indent) const {
 }
 
 void Attributable::copyAttributesTo(Attributable& other) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     attributes_.forEach([&](const std::string& name, const AttributePtr& attribute) {
         other.attributes_.set(name, attribute->cloneAttribute(other.projectMutex()));
     });

@@ -47,7 +47,7 @@ public:
     }
 
     T value() const {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return value_;
     }
 

@@ -46,7 +46,7 @@ public:
 
     boost::shared_ptr<Parameter<T>> source() const { return source_; }
     bool ignoreSource() const {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return ignoreSource_;
     }
     void setIgnoreSource(bool ignore) {
@@ -57,13 +57,13 @@ public:
     }
     /// Times of this parameter's own keyframes.
     std::vector<RationalTime> editTimes() const {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         std::vector<RationalTime> times;
         for (const auto& entry : edits_) times.push_back(entry.time);
         return times;
     }
     std::set<RationalTime> deletions() const {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return deletions_;
     }
     /// Recomputes the curve from the source; the source's changes call it.

@@ -28,7 +28,7 @@ public:
     }
 
     InterpolaterPtr parameterInterpolater() const {
-        ScopedReadLock lock(this->projectMutex());
+        ScopedReadLock lock(this->projectLock());
         return interpolater_;
     }
     void setParameterInterpolater(const InterpolaterPtr& interpolater) {

@@ -24,11 +24,11 @@ public:
         : KeyFrameInterface(token, endTime, leadIn), value_(value), interpolater_(interpolater) {}
 
     T value() const {
-        ScopedReadLock lock(metaDataProjectMutex());
+        ScopedReadLock lock(this->projectLock());
         return value_;
     }
     InterpolaterPtr interpolater() const {
-        ScopedReadLock lock(metaDataProjectMutex());
+        ScopedReadLock lock(this->projectLock());
         return interpolater_;
     }
     void setInterpolater(const InterpolaterPtr& interpolater) {
@@ -50,7 +50,7 @@ public:
         boost::shared_ptr<KeyFrame> copy;
         std::map<std::string, std::string> metadata;
         {
-            ScopedReadLock lock(metaDataProjectMutex());
+            ScopedReadLock lock(this->projectLock());
             copy.reset(
                 new KeyFrame(boost::weak_ptr<const ThreadSafe>(), endTime_, value_, leadIn_, interpolater_));
             metadata = metaDataCopy();
@@ -63,7 +63,7 @@ public:
 protected:
     /// Whether the value equals the given one within the type's tolerance.
     bool similarToValue(const T& value) const {
-        ScopedReadLock lock(metaDataProjectMutex());
+        ScopedReadLock lock(this->projectLock());
         return ValueTraits<T>::similar(value_, value);
     }
 

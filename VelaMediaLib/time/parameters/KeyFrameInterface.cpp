@@ -10,22 +10,22 @@ KeyFrameInterface::KeyFrameInterface(const boost::weak_ptr<const ThreadSafe>& to
     : MetaDatable(token), endTime_(endTime), leadIn_(leadIn) {}
 
 RationalTime KeyFrameInterface::endTime() const {
-    ScopedReadLock lock(metaDataProjectMutex());
+    ScopedReadLock lock(this->projectLock());
     return endTime_;
 }
 
 RationalTime KeyFrameInterface::duration() const {
-    ScopedReadLock lock(metaDataProjectMutex());
+    ScopedReadLock lock(this->projectLock());
     return leadIn_;
 }
 
 RationalTime KeyFrameInterface::time() const {
-    ScopedReadLock lock(metaDataProjectMutex());
+    ScopedReadLock lock(this->projectLock());
     return RationalTime(endTime_.asRational() - leadIn_.asRational());
 }
 
 void KeyFrameInterface::toJSON(XMLOptions& options, int indent) const {
-    ScopedReadLock lock(metaDataProjectMutex());
+    ScopedReadLock lock(this->projectLock());
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
     options.key("time");

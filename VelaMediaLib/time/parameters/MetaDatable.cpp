@@ -27,7 +27,7 @@ MetaDatable::AttributePtr MetaDatable::addMetaData(const std::string& key, const
 }
 
 MetaDatable::AttributePtr MetaDatable::metaDataAttribute(const std::string& key) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     if (!metaData_) return AttributePtr();
     const auto found = metaData_->find(key);
     return found == metaData_->end() ? AttributePtr() : found->second;
@@ -46,17 +46,16 @@ bool MetaDatable::removeMetaData(const std::string& key) {
 }
 
 std::vector<std::string> MetaDatable::metaDataKeys() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::vector<std::string> keys;
     if (metaData_)
         for (const auto& entry : *metaData_) keys.push_back(entry.first);
     return keys;
 }
 
-ReadWriteMutex* MetaDatable::metaDataMutex() const {
-    const boost::shared_ptr<const ThreadSafe> project = projectMutex().lock();
-    return project ? &project->mutex() : nullptr;
-}
+// Null once the project has gone: edits there take no lock, so a caller that
+// holds this one must not be taken for a writer.
+ReadWriteMutex* MetaDatable::metaDataMutex() const { return projectMutex().expired() ? nullptr : projectLock(); }
 
 void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
     ScopedWriteLock lock(projectMutex());
@@ -66,7 +65,7 @@ void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe
 }
 
 std::map<std::string, std::string> MetaDatable::metaDataCopy() const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     std::map<std::string, std::string> copy;
     if (metaData_)
         for (const auto& entry : *metaData_) copy[entry.first] = entry.second->value();

@@ -31,7 +31,7 @@ boost::shared_ptr<ParameterInterface> Parametric::createDefaultParameter(const s
 }
 
 boost::shared_ptr<ParameterInterface> Parametric::madeParameter(const std::string& name) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parameters_.find(name);
 }
 
@@ -41,14 +41,14 @@ boost::shared_ptr<ParameterInterface> Parametric::parameter(const std::string& n
     if (const auto made = madeParameter(name)) return made;
     const boost::shared_ptr<ParameterInterface> created = createDefaultParameter(name);
     if (!created) return created;
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     return parameters_.insertIfAbsent(name, created);
 }
 
 std::vector<std::string> Parametric::parameterNames() const {
     std::vector<std::string> names = defaultParameterNames();
     {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>&) {
             names.push_back(name);
         });
@@ -70,7 +70,7 @@ bool Parametric::hasMadeParameter(const std::string& name) const { return bool(m
 void Parametric::toJSONParameterList(XMLOptions& options, int indent) const {
     NamedParameters made;
     {
-        ScopedReadLock lock(projectMutex());
+        ScopedReadLock lock(projectLock());
         parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
             made.emplace_back(name, p);
         });
@@ -113,7 +113,7 @@ void Parametric::readParameterList(const Json::Value& parameters) {
 }
 
 void Parametric::cloneParametersInto(Parametric& other) const {
-    ScopedReadLock lock(projectMutex());
+    ScopedReadLock lock(projectLock());
     parameters_.forEach([&](const std::string& name, const boost::shared_ptr<ParameterInterface>& p) {
         const boost::shared_ptr<ParameterInterface> copy = p->cloneParameter();
         copy->setTimeScalable(other.sharedTimeScale());

@@ -218,10 +218,6 @@ ReadWriteMutex::ScopedReadLock::ScopedReadLock(const boost::weak_ptr<const Threa
     if (mutex_) mutex_->lockRead();
 }
 
-ReadWriteMutex::ScopedReadLock::~ScopedReadLock() {
-    if (mutex_) mutex_->unlockRead();
-}
-
 ReadWriteMutex::ScopedWriteLock::ScopedWriteLock(ReadWriteMutex& mutex) : mutex_(&mutex) {
     mutex_->lockWrite();
 }

@@ -45,7 +45,13 @@ public:
     public:
         explicit ScopedReadLock(ReadWriteMutex& mutex);
         explicit ScopedReadLock(const boost::weak_ptr<const ThreadSafe>& token);
-        ~ScopedReadLock();
+        /// Locks the mutex unless it is null (an object of no project).
+        explicit ScopedReadLock(ReadWriteMutex* mutex) : mutex_(mutex) {
+            if (mutex_) mutex_->lockRead();
+        }
+        ~ScopedReadLock() {
+            if (mutex_) mutex_->unlockRead();
+        }
         ScopedReadLock(const ScopedReadLock&) = delete;
         ScopedReadLock& operator=(const ScopedReadLock&) = delete;
 

@@ -63,7 +63,8 @@ SubjectBase::NotifyDisabler::NotifyDisabler(SubjectBase& subject) : subject_(sub
 
 SubjectBase::NotifyDisabler::~NotifyDisabler() { --subject_.disableCount_; }
 
-Subject::Subject(const boost::weak_ptr<const ThreadSafe>& token) : token_(token) {}
+Subject::Subject(const boost::weak_ptr<const ThreadSafe>& token)
+    : token_(token), lock_(ProjectToken::lockOf(token)) {}
 
 Subject::~Subject() { leaveDelay(token_); }
 
@@ -72,6 +73,7 @@ Subject::~Subject() { leaveDelay(token_); }
 void Subject::setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
     const bool wasParked = leaveDelay(token_);
     token_ = token;
+    lock_ = ProjectToken::lockOf(token);
     if (wasParked) notify();
 }
 

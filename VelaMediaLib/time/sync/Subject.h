@@ -106,6 +106,8 @@ public:
     ~Subject() override;
 
     const boost::weak_ptr<const ThreadSafe>& projectMutex() const { return token_; }
+    /// The project's lock, held as ProjectToken holds it.
+    ReadWriteMutex* projectLock() const { return lock_.get(); }
     /// Set before the subject is shared with other threads. A notification
     /// the old project's delay holds back moves to the new project (held back
     /// by its delay, or told at once).
@@ -116,6 +118,7 @@ protected:
 
 private:
     boost::weak_ptr<const ThreadSafe> token_;
+    boost::shared_ptr<ReadWriteMutex> lock_;
 };
 
 /// The subject part of an object whose parts share one ProjectToken (a clip,

@@ -11,17 +11,20 @@ namespace VelaMediaLib {
 /// It also keeps the project's notify-delay state, so that state goes with it.
 class VELAMEDIALIB_API ThreadSafe {
 public:
-    ThreadSafe() = default;
+    ThreadSafe();
     virtual ~ThreadSafe();
     ThreadSafe(const ThreadSafe&) = delete;
     ThreadSafe& operator=(const ThreadSafe&) = delete;
 
-    ReadWriteMutex& mutex() const { return mutex_; }
+    ReadWriteMutex& mutex() const { return *mutex_; }
+    /// The lock as the project's objects hold it, so that it outlives the
+    /// project while they remain.
+    const boost::shared_ptr<ReadWriteMutex>& sharedMutex() const { return mutex_; }
 
 private:
     friend class NotifyDelay;
 
-    mutable ReadWriteMutex mutex_;
+    const boost::shared_ptr<ReadWriteMutex> mutex_;
     mutable NotifyDelayState notifyDelayState_;
 };
 

@@ -44,7 +44,7 @@ bool ParameterImpl<T>::writtenBare(const std::string& name, const std::string& t
 template <typename T>
 void ParameterImpl<T>::toJSON(XMLOptions& options, int indent, const std::string& name,
                               const std::string& typeName) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     if (!name.empty()) options.key(name);
     if (writtenBare(name, typeName)) {
         ValueTraits<T>::write(options, indent, keyframes_.front().keyframe->value_);

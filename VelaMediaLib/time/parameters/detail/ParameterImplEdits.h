@@ -185,7 +185,7 @@ void ParameterImpl<T>::moveKeyframes(const RationalTime& offset, std::function<b
 template <typename T>
 boost::shared_ptr<Parameter<T>> ParameterImpl<T>::copyPortion(const Range<RationalTime>& range) const {
     const boost::shared_ptr<ParameterImpl> portion = cloneImpl();
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const RationalTime start = range.start(), end = range.start() + range.duration();
     KeyFrameMap kept;
     auto keep = [&](const RationalTime& time, const KeyFramePtr& keyframe) {

@@ -11,7 +11,7 @@ ParameterImpl<T>::ParameterImpl(const ParameterImpl& other)
     : Base(other.projectMutex()), identifier_(other.identifier()), scalable_(other.scalable_) {
     std::map<std::string, std::string> metadata;
     {
-        ScopedReadLock lock(other.projectMutex());
+        ScopedReadLock lock(other.projectLock());
         for (const auto& entry : other.keyframes_)
             keyframes_.push_back({entry.time, entry.keyframe->clone()});
         const Extras* theirs = other.extras_.get();
@@ -43,7 +43,7 @@ bool ParameterImpl<T>::describedBeyondTheCurve() const {
 
 template <typename T>
 std::string ParameterImpl<T>::identifier() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     const boost::shared_ptr<Attribute<std::string>>* attribute = e ? e->identAttribute.get() : nullptr;
     return attribute ? (*attribute)->value() : identifier_;
@@ -51,7 +51,7 @@ std::string ParameterImpl<T>::identifier() const {
 
 template <typename T>
 boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return extras().identAttribute.getOrMake([this] {
         return new boost::shared_ptr<Attribute<std::string>>(
             new Attribute<std::string>("ident", identifier_, this->projectMutex()));
@@ -60,21 +60,21 @@ boost::shared_ptr<Attribute<std::string>> ParameterImpl<T>::identAttribute() {
 
 template <typename T>
 bool ParameterImpl<T>::hasValueBounds() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     return e && e->bounds;
 }
 
 template <typename T>
 bool ParameterImpl<T>::hasUIHints() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     return e && e->hints;
 }
 
 template <typename T>
 boost::optional<ValueBounds<T>> ParameterImpl<T>::valueBounds() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     return e ? e->bounds : boost::none;
 }
@@ -86,7 +86,7 @@ void ParameterImpl<T>::setValueBounds(const T& minValue, const T& maxValue, cons
 
 template <typename T>
 boost::optional<UIHints> ParameterImpl<T>::uiHints() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     return e ? e->hints : boost::none;
 }
@@ -98,13 +98,13 @@ void ParameterImpl<T>::setUIHints(const std::string& userInterfaceType, const st
 
 template <typename T>
 MetaDatable* ParameterImpl<T>::metaDataPtr() {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return &metadata();
 }
 
 template <typename T>
 std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const Extras* e = extras_.get();
     const MetaDatable* metadata = e ? e->metadata.get() : nullptr;
     return metadata ? metadata->metaDataCopy() : std::map<std::string, std::string>();
@@ -112,7 +112,7 @@ std::map<std::string, std::string> ParameterImpl<T>::generateMetaDataMap() const
 
 template <typename T>
 T ParameterImpl<T>::valueAtTime(const RationalTime& time) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return valueAtTimeLocked(time);
 }
 
@@ -123,21 +123,23 @@ T ParameterImpl<T>::valueAtTimeLocked(const RationalTime& time) const {
     if (keyframes_.empty())
         throw KeyFrameException("parameter " + identifier_ + " has no keyframe", RationalTime(0),
                                 identifier_);
-    if (keyframes_.size() == 1 || time <= keyframes_.front().time) return keyframes_.front().keyframe->value_;
-    if (time >= keyframes_.back().time) return keyframes_.back().keyframe->value_;
-    const auto next = MapUtil::firstAtOrAfter(keyframes_, time);
+    if (keyframes_.size() == 1) return keyframes_.front().keyframe->value_;
+    const double seconds = time.asDouble();
+    const auto next = MapUtil::locate(keyframes_, time, seconds);
+    if (next == keyframes_.begin()) return next->keyframe->value_;
+    if (next == keyframes_.end()) return keyframes_.back().keyframe->value_;
     const KeyFrame<T>& end = *next->keyframe;
     if (next->time == time) return end.value_;
     if (scalable_ && (next->time.asRational() - time.asRational()) * scalable_->timeScale() < SafeRational(1))
         return end.value_;
     const auto previous = next - 1;
     return segmentInterpolater(end)->interpolate(previous->keyframe->value_, end.value_, previous->time,
-                                                 next->time, time.asDouble(), end.leadIn_);
+                                                 next->time, seconds, end.leadIn_);
 }
 
 template <typename T>
 size_t ParameterImpl<T>::numKeyFrames() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return keyframes_.size();
 }
 
@@ -157,20 +159,20 @@ typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::exactKeyFrameOrThrow(co
 
 template <typename T>
 typename ParameterImpl<T>::KeyFramePtr ParameterImpl<T>::keyframeAtTime(const RationalTime& time) {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return exactKeyFrame(time);
 }
 
 template <typename T>
 typename ParameterImpl<T>::ConstKeyFramePtr ParameterImpl<T>::keyframeAtTime(const RationalTime& time) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return exactKeyFrame(time);
 }
 
 template <typename T>
 boost::shared_ptr<KeyFrameInterface>
 ParameterImpl<T>::keyFrameInterfaceAtTime(const RationalTime& time) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return exactKeyFrame(time);
 }
 
@@ -181,13 +183,13 @@ bool ParameterImpl<T>::hasKeyFrameAtTime(const RationalTime& time) const {
 
 template <typename T>
 bool ParameterImpl<T>::hasKeyFrameInRange(const Range<RationalTime>& range) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return MapUtil::anyInRange(keyframes_, range.start(), range.start() + range.duration());
 }
 
 template <typename T>
 boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     boost::shared_ptr<std::vector<RationalTime>> times(new std::vector<RationalTime>);
     times->reserve(keyframes_.size());
     for (const auto& entry : keyframes_) times->push_back(entry.time);
@@ -196,42 +198,42 @@ boost::shared_ptr<std::vector<RationalTime>> ParameterImpl<T>::keyframeTimes() c
 
 template <typename T>
 Range<RationalTime> ParameterImpl<T>::keyframeRange() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     if (keyframes_.empty()) return Range<RationalTime>();
     return Range<RationalTime>(keyframes_.front().time, keyframes_.back().time - keyframes_.front().time);
 }
 
 template <typename T>
 RationalTime ParameterImpl<T>::firstKeyFrameTime() const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     if (keyframes_.empty()) refuse("firstKeyFrameTime: no keyframe", RationalTime(0));
     return keyframes_.front().time;
 }
 
 template <typename T>
 RationalTime ParameterImpl<T>::nextKeyFrameTime(const RationalTime& time) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const auto next = MapUtil::firstAfter(keyframes_, time);
     return next == keyframes_.end() ? time : next->time;
 }
 
 template <typename T>
 RationalTime ParameterImpl<T>::previousKeyFrameTime(const RationalTime& time) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     const auto atOrAfter = MapUtil::firstAtOrAfter(keyframes_, time);
     return atOrAfter == keyframes_.begin() ? time : (atOrAfter - 1)->time;
 }
 
 template <typename T>
 bool ParameterImpl<T>::valuesDifferAtTimes(const RationalTime& a, const RationalTime& b) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return !ValueTraits<T>::same(valueAtTimeLocked(a), valueAtTimeLocked(b));
 }
 
 template <typename T>
 typename ParameterImpl<T>::InterpolaterPtr
 ParameterImpl<T>::interpolaterForKeyFrame(const ConstKeyFramePtr& keyframe) const {
-    ScopedReadLock lock(this->projectMutex());
+    ScopedReadLock lock(this->projectLock());
     return keyframe ? segmentInterpolater(*keyframe) : defaultInterpolater();
 }
 
