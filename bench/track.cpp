@@ -105,9 +105,10 @@ void BM_MediaAtTime_TwoReaders(benchmark::State& state) {
         [&](size_t first, size_t count) { filled.library(first, count); });
 }
 
-void BM_PlaceClipsEndToEnd(benchmark::State& state) {
+// Places `clips` clips end to end on a new track, last first or first first:
+// last first shifts the whole index on every placement, the worst order.
+void placeClips(benchmark::State& state, int clips, bool lastFirst) {
     Project project;
-    const int clips = 100000;
     for (auto _ : state) {
         state.PauseTiming();
         std::vector<MediaPtr> made;
@@ -115,13 +116,19 @@ void BM_PlaceClipsEndToEnd(benchmark::State& state) {
             made.push_back(PlaceholderMedia::create(project.token, project.rate, 0, 30));
         const auto track = GenericTrack::create(project.token);
         state.ResumeTiming();
-        for (int i = 0; i < clips; ++i) track->addMedia(made[size_t(i)], i * 30LL);
+        for (int n = 0; n < clips; ++n) {
+            const int i = lastFirst ? clips - 1 - n : n;
+            track->addMedia(made[size_t(i)], i * 30LL);
+        }
         state.PauseTiming();
         made.clear();
         state.ResumeTiming();
     }
     state.SetItemsProcessed(state.iterations() * clips);
 }
+
+void BM_PlaceClipsEndToEnd(benchmark::State& state) { placeClips(state, 100000, false); }
+void BM_PlaceClipsFrontFirst(benchmark::State& state) { placeClips(state, 10000, true); }
 
 void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
     Project project;
@@ -137,25 +144,6 @@ void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
     const std::vector<VelaTime> ticks = randomTicks(5000 * kStep);
     size_t i = 0;
     for (auto _ : state) benchmark::DoNotOptimize(timeline->allMediasAtTime(ticks[i++ % ticks.size()]));
-}
-
-// Placing clips front first shifts the whole index each time: the worst order.
-void BM_PlaceClipsFrontFirst(benchmark::State& state) {
-    Project project;
-    const int clips = 10000;
-    for (auto _ : state) {
-        state.PauseTiming();
-        std::vector<MediaPtr> made;
-        for (int i = 0; i < clips; ++i)
-            made.push_back(PlaceholderMedia::create(project.token, project.rate, 0, 30));
-        const auto track = GenericTrack::create(project.token);
-        state.ResumeTiming();
-        for (int i = clips - 1; i >= 0; --i) track->addMedia(made[size_t(i)], i * 30LL);
-        state.PauseTiming();
-        made.clear();
-        state.ResumeTiming();
-    }
-    state.SetItemsProcessed(state.iterations() * clips);
 }
 
 } // namespace

@@ -1,7 +1,8 @@
 #pragma once
-// What tests that run threads share: a deadline for tests whose failure mode is a hang (a broken lock), past
-// which the test program says so and ends instead of spinning until the runner's own timeout; a bounded wait
-// for a flag; an observer that runs a given body; and a driver of a detach racing that observer's call.
+// What the tests share, threaded ones above all: a deadline for tests whose failure mode is a hang (a
+// broken lock), past which the test program says so and ends instead of spinning until the runner's own
+// timeout; a bounded wait for a flag; observers that count their calls or run a given body; and a driver
+// of a detach racing that observer's call.
 
 #include <VelaMediaLib/time/sync/Observer.h>
 
@@ -51,6 +52,16 @@ inline bool waitFor(const std::atomic<bool>& flag, std::chrono::milliseconds lim
     while (!flag.load() && std::chrono::steady_clock::now() < until) std::this_thread::yield();
     return flag.load();
 }
+
+/// Counts its calls and keeps the subject of the last.
+struct CountingObserver : Observer {
+    int count = 0;
+    Observable* last = nullptr;
+    void update(Observable* changed) override {
+        ++count;
+        last = changed;
+    }
+};
 
 struct BlockingObserver : Observer {
     std::function<void(Observable*)> body;

@@ -1,4 +1,5 @@
 #include "../JsonTestSupport.h"
+#include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
@@ -300,6 +301,7 @@ TEST_F(History, ARefusedOrThrowingFollowUpLeavesTheStacksAndTheOthersRun) {
 // refused command drops only what it queued on its own thread: a host edit
 // heard on another thread meanwhile still gets its follow-up.
 TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesRunBeforeTheNext) {
+    VelaMediaLib::testing::Deadline deadline;
     int other = 0;
     history.queueFollowUp(add(5));
     EXPECT_EQ(counter, 0);
@@ -330,6 +332,7 @@ TEST_F(History, FollowUpsOfARefusedCommandAreDroppedAndIdleOnesRunBeforeTheNext)
 // Threads that keep editing keep queueing; a drain takes only what was
 // queued before it began (and what its own steps queue), so it ends.
 TEST_F(History, ADrainRunsWhatWasQueuedBeforeItBegan) {
+    VelaMediaLib::testing::Deadline deadline;
     struct Relay : Command {
         Relay(CommandHistory& into, int& counted) : history(into), runs(counted) {}
         bool execute(CommandHandler*) override {

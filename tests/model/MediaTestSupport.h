@@ -2,6 +2,8 @@
 // What the model's tests share: a project lock and a 30 fps edit rate, clips
 // with any timing state, and checks that a refused edit says why and changes nothing.
 
+#include "../ThreadTestSupport.h"
+
 #include <VelaMediaLib/model/media/AudioMediaImpl.h>
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>
@@ -83,14 +85,7 @@ void expectRefused(const Media& media, const std::string& message, Edit edit) {
     EXPECT_TRUE(media.state() == before) << message;
 }
 
-struct Counter : Observer {
-    int count = 0;
-    Observable* last = nullptr;
-    void update(Observable* changed) override {
-        ++count;
-        last = changed;
-    }
-};
+typedef CountingObserver Counter;
 
 } // namespace testing
 } // namespace VelaMediaLib

@@ -63,7 +63,8 @@ TEST(TextAttributeList, RunsStayInsideTheText) {
     EXPECT_TRUE(text.addRun(0, 5, "bold", "true"));
     EXPECT_TRUE(text.addRun(3, 5, "bold", "false"));
     EXPECT_FALSE(text.addRun(6, 6, "size", "12"));
-    EXPECT_EQ(text.runs().size(), 2u);
+    EXPECT_TRUE(text.addRun(6, 5, "size", "12")); // up to the last character
+    EXPECT_EQ(text.runs().size(), 3u);
     EXPECT_EQ(text.attributeAt(1, "bold"), "true");
     EXPECT_EQ(text.attributeAt(4, "bold"), "false"); // the later run wins
     EXPECT_EQ(text.attributeAt(9, "bold"), "");

@@ -1,3 +1,5 @@
+#include "../ThreadTestSupport.h"
+
 #include <VelaMediaLib/time/parameters/Attribute.h>
 #include <VelaMediaLib/time/sync/LambdaObserverWithoutNotifyDelay.h>
 #include <VelaMediaLib/time/parameters/MetaDatable.h>
@@ -15,15 +17,7 @@ using namespace VelaMediaLib;
 namespace {
 
 typedef LambdaObserverWithoutNotifyDelay Lambda;
-
-struct CountingObserver : Observer {
-    int count = 0;
-    Observable* last = nullptr;
-    void update(Observable* subject) override {
-        ++count;
-        last = subject;
-    }
-};
+using VelaMediaLib::testing::CountingObserver;
 
 class Notification : public ::testing::Test {
 protected:
