@@ -62,6 +62,12 @@ TEST(ProjectCreation, RatesDefaultsAndTheEditRate) {
     EXPECT_EQ(held->editRate(), Rate(30000, 1001));
     held->setEditRate(Rate(24));
     EXPECT_EQ(project->editRate(), Rate(24));
+    RateReader reader;
+    reader.rate = held.get();
+    project->attachEditRateObserver(&reader);
+    project->setEditRate(Rate(25));
+    EXPECT_EQ(reader.seen, std::vector<Rate>{Rate(25)});
+    project->detachEditRateObserver(&reader);
 }
 
 // A host may keep the history, a composite, a clip and its track past the
@@ -119,7 +125,8 @@ TEST_F(ProjectTest, AMagneticTrackClosesItsGapsAsAStepOfItsOwn) {
     EXPECT_EQ(lastStepName(project), kClosing);
     project->undo();
     EXPECT_EQ(early->startTime(), -39);
-    project->redo();
+    EXPECT_TRUE(project->redo());
+    EXPECT_EQ(early->startTime(), 0);
     const MediaPtr second = place(10, 10);
     place(20, 10);
     EXPECT_EQ(steps(), 4u); // no gap: nothing closed
@@ -298,4 +305,19 @@ TEST_F(ProjectTest, AnObserverThatThrowsNeitherRefusesTheEditNorSilencesTheOther
     EXPECT_EQ(counter.added, 2);
     track->detachAddObserver(&thrower);
     track->detachAddObserver(&counter);
+}
+
+// A clip placed where a moved clip stood makes the move's undo collide: the
+// history keeps both stacks and the model stays as it is.
+TEST_F(ProjectTest, AnUndoTheModelRefusesLeavesTheStacks) {
+    const MediaPtr media = place(20, 10);
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 30)));
+    track->addMedia(clip(10), 20);
+    const Snapshot before = snapshot();
+    const size_t undoable = steps();
+    EXPECT_FALSE(project->undo());
+    EXPECT_EQ(snapshot(), before);
+    EXPECT_EQ(media->startTime(), 50);
+    EXPECT_EQ(steps(), undoable);
+    EXPECT_TRUE(project->commandHistory()->redoStack().empty());
 }

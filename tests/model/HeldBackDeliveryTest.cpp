@@ -28,7 +28,7 @@ TEST(ModelDeliveryConcurrency, AClipLetGoOfDuringItsDeliveryStaysWholeUntilItsOb
     BlockingObserver reader;
     reader.body = [&](Observable* changed) {
         delivering = true;
-        letGoDuringDelivery = waitFor(letGo, std::chrono::seconds(5));
+        letGoDuringDelivery = waitFor(letGo, std::chrono::seconds(30));
         if (!letGoDuringDelivery) return;
         Media& media = dynamic_cast<Media&>(*changed);
         name = media.identifier();

@@ -1,5 +1,6 @@
 #include "MediaTestSupport.h"
 
+#include <VelaMediaLib/time/rational/RationalUtil.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/MediaEditor.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
@@ -199,7 +200,8 @@ TEST_F(MediaTiming, DurationIsAlwaysTheMediaDurationTimesTheScalarRounded) {
     // The default state plays all the media again, and keeps the rule too.
     auto quarter = placeholder(0, SafeRational(1, 4), 8); // two ticks of a quarter tick of media
     const MediaState whole = quarter->defaultState();
-    EXPECT_EQ(whole.duration, RationalMediaEditor::durationFor(whole.mediaDuration, whole.scalar));
+    EXPECT_EQ(whole.duration,
+              RationalUtil::toVelaTime(RationalUtil::Round(whole.mediaDuration * whole.scalar)));
     quarter->restoreState(whole, 0);
     auto longer = placeholder(0, 50, 2);
     longer->trimStart(10);
@@ -227,7 +229,9 @@ TEST_F(MediaTiming, SeededEditsKeepTheDurationRuleAndRestoreExactly) {
                 EXPECT_TRUE(media->state() == before) << "a refused edit changed the clip";
             }
             const MediaState now = media->state();
-            ASSERT_EQ(now.duration, RationalMediaEditor::durationFor(now.mediaDuration, now.scalar)) << step;
+            ASSERT_EQ(now.duration,
+                      RationalUtil::toVelaTime(RationalUtil::Round(now.mediaDuration * now.scalar)))
+                << step;
             ASSERT_TRUE(now.mediaStart >= now.minMediaStart && now.mediaEnd() <= now.maxMediaEnd)
                 << "step " << step << " of editor " << kind << " plays outside its media";
             history.push_back(now);

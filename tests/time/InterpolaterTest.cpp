@@ -97,6 +97,7 @@ TEST(Interpolater, NamesSharedInstancesAndUnknownNames) {
         EXPECT_THROW(InterpolaterFactory<std::string>::byName(name), ParserException) << name;
     try {
         InterpolaterFactory<double>::byName("nope");
+        ADD_FAILURE() << "an unknown name was read";
     } catch (const ParserException& e) {
         EXPECT_STREQ(e.what(), "trying to read an unknown interpolater");
     }

@@ -187,12 +187,12 @@ TEST(NotificationConcurrency, ObserversDetachingEachOtherDoNotWaitForEachOther) 
     BlockingObserver a, b;
     a.body = [&](Observable*) {
         aRunning = true;
-        waitFor(bRunning, seconds(5));
+        waitFor(bRunning, seconds(30));
         second.detach(&b);
     };
     b.body = [&](Observable*) {
         bRunning = true;
-        waitFor(aRunning, seconds(5));
+        waitFor(aRunning, seconds(30));
         first.detach(&a);
     };
     first.attach(&a);

@@ -22,7 +22,7 @@ struct AtomicCounter : Observer {
 // A reader holds the read lock while a writer waits for the write lock. What the reader first uses inside its
 // snapshot (and is made on demand) must not let the writer in: the writer's change stays unseen until the
 // reader lets go.
-class ReaderSnapshot : public ::testing::Test {
+class ReaderSnapshotConcurrency : public ::testing::Test {
 protected:
     void expectSnapshotHoldsAcross(const std::function<void()>& firstUse) {
         Deadline deadline;
@@ -108,7 +108,7 @@ TEST(ParametricConcurrency, ReadersSeeWholeCurvesAndSnapshotsWhileEditsRunAndObs
     parameter->detach(&steady);
 }
 
-TEST_F(ReaderSnapshot, PartsMadeOnFirstUseLetNoWriterIn) {
+TEST_F(ReaderSnapshotConcurrency, PartsMadeOnFirstUseLetNoWriterIn) {
     const auto parameter = ParameterImpl<double>::create(project, "gain", 2.0);
     const std::pair<const char*, std::function<void()>> firstUses[] = {
         {"a declared parameter",
@@ -127,7 +127,7 @@ TEST_F(ReaderSnapshot, PartsMadeOnFirstUseLetNoWriterIn) {
     EXPECT_EQ(parameter->metaDataPtr(), parameter->metaDataPtr());
 }
 
-TEST_F(ReaderSnapshot, AttributesKeepOneTypePerName) {
+TEST_F(ReaderSnapshotConcurrency, AttributesKeepOneTypePerName) {
     knob.addAttribute<int>("width", 640);
     EXPECT_EQ(knob.attributeOrAdd<int>("width", 1)->value(), 640);
     EXPECT_THROW(knob.attributeOrAdd<bool>("width", false), TypeException);
