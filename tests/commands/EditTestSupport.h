@@ -1,7 +1,6 @@
 #pragma once
-// A project with a track for edit tests, which keeps every clip, transition
-// and track it makes, so that a test can take a snapshot of all an edit may
-// change and ask that undo and redo give back exact states.
+// A project for edit tests that keeps every clip, transition and track it
+// makes, so that a test can ask that undo and redo give back exact states.
 
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>

@@ -67,11 +67,9 @@ TEST_F(ProjectConcurrency, ReadersQueryWhileOneThreadEditsThroughTheHistory) {
     EXPECT_EQ(clips.back()->startTime(), 190);
 }
 
-// The magnetizer hears a clip on whichever thread edits it: two threads
-// rename clips of a magnetic track (each hearing under the read lock only,
-// so both may be heard at once) while the editing thread makes gaps directly
-// and runs commands that drain the queued closings. ThreadSanitizer sees any
-// unguarded request state; at the end the track has no gap.
+// The magnetizer hears clips renamed on two threads at once (under the read
+// lock only) while this thread makes gaps directly and runs commands that drain
+// the queued closings: ThreadSanitizer sees any unguarded request state.
 TEST_F(ProjectConcurrency, AMagnetizerHeardOnSeveralThreadsQueuesSafely) {
     for (int i = 0; i < 3; ++i) track->addMedia(clip(10), 10 * i);
     const auto other = newTrack();

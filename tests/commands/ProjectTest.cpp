@@ -70,11 +70,9 @@ TEST(ProjectCreation, RatesDefaultsAndTheEditRate) {
     project->detachEditRateObserver(&reader);
 }
 
-// A host may keep the history, a composite, a clip and its track past the
-// project. The history then refuses with a clear exception instead of reaching
-// into the project that has gone (AddressSanitizer finds any such read); a
-// composite hands its handler to its inner history only while it runs; a clip
-// works on without a lock.
+// Kept past the project, the history refuses instead of reaching into it
+// (AddressSanitizer finds any such read), a composite's inner history holds no
+// handler between runs, and a clip works on without a lock.
 TEST_F(ProjectTest, WhatTheHostKeepsPastTheProjectRefusesOrWorksAlone) {
     const MediaPtr media = place(0, 10);
     ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 5)));

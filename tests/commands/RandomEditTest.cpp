@@ -1,9 +1,7 @@
-// A seeded run of random edits through the project, valid and invalid, on
-// three tracks of which one is magnetic. Some clips carry transitions, so
-// adds, removes and moves join and part them; every clip has metadata and a
-// keyframed parameter, edited too. After every step the model must hold its
-// invariants, a refused edit must have changed nothing, and at the end
-// undoing everything and redoing everything must give back the exact states.
+// A seeded run of random edits, valid and invalid, on three tracks (one
+// magnetic), joining and parting transitions and editing clip metadata and a
+// keyframed parameter too. After every step the model holds its invariants and
+// a refused edit has changed nothing; undoing and redoing everything is exact.
 #include "EditTestSupport.h"
 
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
