@@ -55,7 +55,9 @@ std::vector<std::string> MetaDatable::metaDataKeys() const {
 
 // Null once the project has gone: edits there take no lock, so a caller that
 // holds this one must not be taken for a writer.
-ReadWriteMutex* MetaDatable::metaDataMutex() const { return projectMutex().expired() ? nullptr : projectLock(); }
+ReadWriteMutex* MetaDatable::metaDataMutex() const {
+    return projectMutex().expired() ? nullptr : projectLock();
+}
 
 void MetaDatable::setMetaDataProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) {
     ScopedWriteLock lock(projectMutex());
