@@ -43,6 +43,7 @@ TEST(ProjectCreation, RatesDefaultsAndTheEditRate) {
     EXPECT_THROW(Project::create(30, 0), boost::bad_rational);
     const ProjectPtr project = Project::create(Rate(25));
     EXPECT_EQ(project->targetLoudnessAttribute()->value(), -18.0);
+    EXPECT_FALSE(project->voxaneMetaDataAttribute()->value());
     EXPECT_FALSE(project->shouldApplyLoudnessNormalizationAttribute()->value());
     EXPECT_TRUE(project->allowSubFrameEditingAttribute()->value());
     EXPECT_EQ(project->authorAttribute()->value(), "");

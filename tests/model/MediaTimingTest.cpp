@@ -139,6 +139,8 @@ TEST_F(MediaTiming, StretchAndTheOlderEditors) {
     EXPECT_DOUBLE_EQ(media->findScalar(50), 0.5);
     expectRefused<Trim>(*media, "invalid media duration trim offset",
                         [&] { media->mediaEditor().trimEnd(-1); });
+    expectRefused<Trim>(*media, "invalid media duration trim offset",
+                        [&] { media->mediaEditor().trimStart(-1); });
     media->mediaEditor().trimEnd(100);
     EXPECT_EQ(media->duration(), 100);
     auto colour = ColorMedia::create(project, rate, 0, 10);

@@ -319,6 +319,9 @@ TEST_F(TrackTest, CopiesAndLocks) {
     EXPECT_EQ(copied[second]->trackRange(), Ticks(10, 10));
     EXPECT_EQ(first->duration(), 10);
     EXPECT_TRUE(LockData::IsMediaLocked(*first));
+    EXPECT_TRUE(track->mediasIntersectingRange(Ticks(5, 0)).empty()); // an empty range holds no tick
+    EXPECT_EQ(Track::getTouchingMediaToRightOfMedia(first), second);
+    EXPECT_FALSE(Track::getTouchingMediaToRightOfMedia(second));
     EXPECT_FALSE(LockData::IsMediaEditable(*second) || LockData::IsMediaLocked(*clip(3)));
     EXPECT_TRUE(
         track->recursivelyVisitAllMediaWithEarlyExitFlag([](const MediaPtr&, bool& stop) { stop = true; }));
@@ -332,6 +335,10 @@ TEST_F(TrackTest, TransitionsAreJoinedAgainWhenTouchingClipsMeet) {
     EXPECT_EQ(second->leftTransition(), shared);
     EXPECT_EQ(Clips({shared->leftMedia(), shared->rightMedia()}), Clips({first, second}));
     EXPECT_EQ(track->transitions().size(), 1u);
+    EXPECT_FALSE(LockData::IsTransitionHidden(*shared) || LockData::IsTransitionLocked(*shared));
+    track->videoHiddenAttribute()->setValue(true);
+    EXPECT_TRUE(LockData::IsTransitionHidden(*shared));
+    track->videoHiddenAttribute()->setValue(false);
     EXPECT_EQ(track->move(first, -5), Track::TransitionAndNeighbour(shared, second));
 }
 
@@ -366,6 +373,11 @@ TEST(TimelineCamera, RightAndLeftHandedTransforms) {
     EXPECT_NEAR(onScreen(Point3d(-960, 540, 0)).y, 0.0, 1e-6);
     EXPECT_NEAR(onScreen(Point3d(960, -540, 0)).x, 1920.0, 1e-6);
     EXPECT_NEAR(onScreen(Point3d(960, -540, 0)).y, 1080.0, 1e-6);
+    // The left-handed projection takes the near plane to depth 0 and the far plane to depth 1.
+    const TransformMatrix lh = timeline->projectionTransformAtTimeLH(zero);
+    const auto depth = [&](double z) { return lh.at(2, 2) + lh.at(2, 3) / z; }; // (A z + B) / z
+    EXPECT_NEAR(depth(1.0), 0.0, 1e-9);
+    EXPECT_NEAR(depth(100000.0), 1.0, 1e-9);
     const TransformerImpl& placement = *timeline; // the timeline places its content unchanged
     EXPECT_EQ(placement.transformAtTime(RationalTime(3)), TransformMatrix());
 }

@@ -73,6 +73,7 @@ TEST(Interpolater, SpringSettlesOnTheValueAfterOvershooting) {
     EXPECT_NEAR(SpringResponse(40.0, 100.0).response(0.1), 0.177737, 1e-6);
     EXPECT_THROW(SpringInterpolater<double>(0.0, 100.0), VelaMediaLibException);
     EXPECT_THROW(SpringInterpolater<double>(10.0, -1.0), VelaMediaLibException);
+    EXPECT_THROW(SpringInterpolater<double>(10.0, 0.0), VelaMediaLibException); // no stiffness, no spring
 }
 
 TEST(Interpolater, CompoundValuesBlendMemberByMemberAndIntegersRound) {
