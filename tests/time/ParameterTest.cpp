@@ -225,6 +225,9 @@ TEST_F(ParameterTest, EqualityComparesWholeKeyFrames) {
     EXPECT_TRUE(*a == *b); // the same curve: linear is what the keyframe followed
     b->keyframeAtTime(10)->setInterpolater(EaseInInterpolater<double>::getInstance());
     EXPECT_FALSE(*a == *b);
+    b = ramp();
+    b->addKeyFrame(20, 10.0, 0); // one more keyframe, where a's curve holds the same value
+    EXPECT_FALSE(*a == *b);
     // Bezier paths compare their control points and temporal curve.
     const auto curve = [&](const Point3d& cp2, const char* temporal) {
         auto parameter = ParameterImpl<Point3d>::create(project, "p", Point3d(0, 0, 0));
