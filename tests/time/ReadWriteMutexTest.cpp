@@ -1,6 +1,7 @@
 #include "../ThreadTestSupport.h"
 
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
+#include <VelaMediaLib/time/sync/detail/AsymmetricFence.h>
 
 #include <atomic>
 #include <boost/make_shared.hpp>
@@ -69,6 +70,92 @@ TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
     Deadline deadline;
     runMixedLoad(4, 3000);
     runMixedLoad(72, 200);
+}
+
+// A reader and a writer that start at the same instant, over and over: the
+// tightest race between a reader's announcement and the writer's flag.
+// Returns how often both were inside at once.
+namespace {
+int overlapsOfReaderAndWriterStartingTogether(ReadWriteMutex& mutex, int rounds) {
+    std::atomic<int> round{-1}, arrived{0}, overlaps{0};
+    std::atomic<bool> readerIn{false}, writerIn{false};
+    auto inside = [&](std::atomic<bool>& mine, const std::atomic<bool>& other) {
+        mine.exchange(true);
+        if (other.load()) ++overlaps;
+        mine.store(false);
+    };
+    std::thread reader([&] {
+        for (int r = 0; r < rounds; ++r) {
+            ++arrived;
+            while (round.load(std::memory_order_acquire) != r) {}
+            ScopedReadLock lock(mutex);
+            inside(readerIn, writerIn);
+        }
+    });
+    for (int r = 0; r < rounds; ++r) {
+        while (arrived.load() != r + 1) {}
+        round.store(r, std::memory_order_release);
+        for (volatile int spin = 0; spin < r % 97; ++spin) { // sweeps the writer across the reader's entry
+        }
+        ScopedWriteLock lock(mutex);
+        inside(writerIn, readerIn);
+    }
+    reader.join();
+    return overlaps.load();
+}
+} // namespace
+
+// Both ways of ordering a reader's entry against a writer: writes this close
+// together make the reader fence itself; with no busy gap the writer always
+// fences for it. In an optimised build this can catch either fence missing.
+TEST(ReadWriteMutexConcurrency, AReaderAndAWriterStartingTogetherNeverOverlap) {
+    Deadline deadline;
+    ReadWriteMutex readersFence;
+    EXPECT_EQ(overlapsOfReaderAndWriterStartingTogether(readersFence, 30000), 0);
+    EXPECT_TRUE(readersFence.readersFenceThemselves());
+    ReadWriteMutex writerFences(std::chrono::nanoseconds(0));
+    EXPECT_EQ(overlapsOfReaderAndWriterStartingTogether(writerFences, 30000), 0);
+    EXPECT_EQ(writerFences.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
+}
+
+// Close writes turn readers' own fencing on; once writes are quiet, reading
+// turns it off again.
+TEST(ReadWriteMutex, ReadersFenceThemselvesOnlyWhileWritesAreBusy) {
+    ReadWriteMutex mutex;
+    EXPECT_EQ(mutex.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
+    for (int i = 0; i < 3; ++i) ScopedWriteLock lock(mutex);
+    EXPECT_TRUE(mutex.readersFenceThemselves());
+    for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
+    EXPECT_TRUE(mutex.readersFenceThemselves()); // not quiet yet
+    std::this_thread::sleep_for(std::chrono::milliseconds(60));
+    for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
+    EXPECT_EQ(mutex.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
+}
+
+// A writer alone skips fencing for readers; a thread born meanwhile must
+// still see its flag on its first read, or it would read a half-made write.
+TEST(ReadWriteMutexConcurrency, ThreadsBornDuringWritesReadWholeWrites) {
+    Deadline deadline;
+    ReadWriteMutex mutex;
+    long long first = 0, second = 0; // equal outside the write lock
+    std::atomic<bool> done{false};
+    std::atomic<int> torn{0};
+    std::thread births([&] {
+        for (int i = 0; i < 300; ++i)
+            std::thread([&] {
+                ScopedReadLock lock(mutex);
+                if (first != second) ++torn;
+            }).join();
+        done = true;
+    });
+    while (!done.load()) {
+        ScopedWriteLock lock(mutex);
+        ++first;
+        for (volatile int spin = 0; spin < 200; ++spin) {}
+        ++second;
+    }
+    births.join();
+    EXPECT_EQ(torn.load(), 0);
 }
 
 // One thread may nest reads and writes, upgrade and downgrade; a downgraded writer still excludes writers.

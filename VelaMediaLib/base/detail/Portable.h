@@ -51,3 +51,16 @@ inline int lowestSetBit(unsigned long long value) {
 #define VELA_LIKELY(x) (x)
 #define VELA_TLS
 #endif
+
+/// ThreadSanitizer neither takes standalone fences nor sees a process-wide
+/// barrier: under it the lock fences each reader instead.
+#if defined(__SANITIZE_THREAD__)
+#define VELA_THREAD_SANITIZER 1
+#elif defined(__has_feature)
+#if __has_feature(thread_sanitizer)
+#define VELA_THREAD_SANITIZER 1
+#endif
+#endif
+#ifndef VELA_THREAD_SANITIZER
+#define VELA_THREAD_SANITIZER 0
+#endif

@@ -3,7 +3,9 @@
 #include <VelaMediaLib/time/sync/ThreadSafe.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/base/detail/Portable.h>
+#include <VelaMediaLib/time/sync/detail/AsymmetricFence.h>
 
+#include <chrono>
 #include <thread>
 
 namespace VelaMediaLib {
@@ -11,6 +13,19 @@ namespace {
 
 const int kOwnedSlots = 64;
 const int kSharedSlot = kOwnedSlots;
+
+// Write locks taken closer together than the mutex's busy gap make readers
+// fence themselves, so that a busy writer does not stop every running thread
+// each time; once no write has come for the quiet time, a reader turns that
+// off again, looking at the clock once every so many fenced entries.
+const long long kQuietNs = 50000000;
+const int kFencedEntriesPerLook = 1024;
+
+long long nowNs() {
+    return std::chrono::duration_cast<std::chrono::nanoseconds>(
+               std::chrono::steady_clock::now().time_since_epoch())
+        .count();
+}
 
 // Which reader slot this thread owns; indices go back to the pool when the
 // thread ends. Threads beyond the pool use the shared slot.
@@ -32,10 +47,23 @@ int claimSlot() {
     unsigned long long used = slotPool.load(std::memory_order_relaxed);
     while (~used != 0) {
         const int index = detail::lowestSetBit(~used);
-        if (slotPool.compare_exchange_weak(used, used | (1ULL << index), std::memory_order_acquire))
+        if (slotPool.compare_exchange_weak(used, used | (1ULL << index), std::memory_order_seq_cst)) {
+            // A writer that saw no other slot taken skipped its heavy fence;
+            // this full fence makes sure such a writer's flag is seen here.
+#if !VELA_THREAD_SANITIZER
+            std::atomic_thread_fence(std::memory_order_seq_cst);
+#endif
             return slotOfThread = index;
+        }
     }
     return slotOfThread = kSharedSlot;
+}
+
+// Whether a thread other than this one may hold a read share: only threads
+// with a slot (or beyond the pool) can.
+bool otherThreadsMayRead(int ownSlot) {
+    const unsigned long long own = ownSlot < kOwnedSlots ? 1ULL << ownSlot : 0;
+    return (slotPool.load(std::memory_order_seq_cst) & ~own) != 0 || ownSlot == kSharedSlot;
 }
 
 inline int threadSlot() { return VELA_LIKELY(slotOfThread >= 0) ? slotOfThread : claimSlot(); }
@@ -96,7 +124,26 @@ void enterWhenNoWriter(const std::atomic<bool>& writer, Enter enter, Withdraw wi
 
 } // namespace
 
-ReadWriteMutex::ReadWriteMutex() = default;
+ReadWriteMutex::ReadWriteMutex(std::chrono::nanoseconds busyGap)
+    : asymmetric_(detail::asymmetricFenceAvailable()), busyGapNs_(busyGap.count()) {}
+
+// The mode is read after the store: a writer that turned fencing on fenced
+// every running thread, so a reader that still saw it off had its store
+// seen by then.
+void ReadWriteMutex::announceReader(Slot& own) {
+    std::atomic<int>& readers = own.readers;
+    if (!asymmetric_) {
+        readers.exchange(1, std::memory_order_seq_cst);
+        return;
+    }
+    readers.store(1, std::memory_order_relaxed);
+    detail::lightFence();
+    if (!fencedReaders_.load(std::memory_order_seq_cst)) return;
+    readers.exchange(1, std::memory_order_seq_cst);
+    if (++own.fencedEntries % kFencedEntriesPerLook == 0 &&
+        nowNs() - lastWrite_.load(std::memory_order_relaxed) > kQuietNs)
+        fencedReaders_.store(false, std::memory_order_seq_cst);
+}
 
 void ReadWriteMutex::lockRead() {
     const int index = threadSlot();
@@ -108,8 +155,19 @@ void ReadWriteMutex::lockRead() {
         return;
     }
     enterWhenNoWriter(
-        writer_, [&] { readers.exchange(1, std::memory_order_seq_cst); },
-        [&] { readers.store(0, std::memory_order_release); });
+        writer_, [&] { announceReader(slot(index)); }, [&] { readers.store(0, std::memory_order_release); });
+}
+
+// Readers that announce themselves without a fence must each pass one before
+// the writer looks at their slots; when writes come thick and fast the
+// writer has readers fence themselves instead.
+void ReadWriteMutex::fenceForReaders() {
+    const long long now = nowNs();
+    const bool busy = now - lastWrite_.load(std::memory_order_relaxed) < busyGapNs_;
+    lastWrite_.store(now, std::memory_order_relaxed);
+    if (fencedReaders_.load(std::memory_order_seq_cst)) return;
+    if (busy) fencedReaders_.store(true, std::memory_order_seq_cst);
+    if (otherThreadsMayRead(threadSlot())) detail::heavyFence();
 }
 
 void ReadWriteMutex::unlockRead() {
@@ -157,6 +215,7 @@ void ReadWriteMutex::acquireExclusive() {
         expected = false;
         backoff.pause();
     }
+    if (asymmetric_) fenceForReaders();
     for (Slot& each : slots_)
         while (each.readers.load(std::memory_order_seq_cst) != 0) backoff.pause();
 }

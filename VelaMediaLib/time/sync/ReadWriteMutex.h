@@ -1,9 +1,15 @@
 #pragma once
-// The project's reader-writer lock. Each thread owns a cache-line-sized
-// reader slot (up to 64 threads at once; further threads share one counted
-// slot), so readers on different cores never write the same line and a read
-// lock costs one exchange; a writer raises one flag and waits for every slot
-// to drain. Waiting spins with a back-off that doubles
+// The project's reader-writer lock. Each thread owns a reader slot two cache
+// lines wide (up to 64 threads at once; further threads share one counted
+// slot), so readers on different cores never write the same line, nor a line
+// the processor prefetches with it. A read lock is a plain store and load:
+// on systems with a process-wide barrier (Linux, Windows) the writer, which
+// raises one flag and waits for every slot to drain, makes the running
+// readers fence for it, so that a read never stalls on a fence; a writer
+// with no other thread about skips that too. While write locks follow each
+// other closely (within a millisecond) readers fence themselves instead, with
+// one exchange, until writes have been quiet for 50 ms; elsewhere they always
+// do. Waiting spins with a back-off that doubles
 // from 1 to 64 pauses and then stays there, yielding the processor at the
 // ceiling so that a waiting thread does not starve the holder on a small
 // machine.
@@ -18,6 +24,7 @@
 
 #include <boost/weak_ptr.hpp>
 #include <atomic>
+#include <chrono>
 #include <boost/shared_ptr.hpp>
 
 namespace VelaMediaLib {
@@ -26,7 +33,9 @@ class ThreadSafe;
 
 class VELAMEDIALIB_API ReadWriteMutex {
 public:
-    ReadWriteMutex();
+    /// Write locks taken less than `busyGap` apart make readers fence
+    /// themselves for a while (see above); zero never does.
+    explicit ReadWriteMutex(std::chrono::nanoseconds busyGap = std::chrono::milliseconds(1));
     ReadWriteMutex(const ReadWriteMutex&) = delete;
     ReadWriteMutex& operator=(const ReadWriteMutex&) = delete;
 
@@ -36,6 +45,9 @@ public:
     void unlockWrite();
     /// Whether a writer holds the lock or waits for it (for diagnostics and tests).
     bool hasWriter() const { return writer_.load(std::memory_order_acquire); }
+    /// Whether readers fence themselves now, rather than writers for them
+    /// (for diagnostics and tests).
+    bool readersFenceThemselves() const { return !asymmetric_ || fencedReaders_.load(); }
     /// Whether the calling thread holds the lock, for reading or writing.
     bool heldByThisThread() const;
 
@@ -75,8 +87,9 @@ public:
 
 private:
     static const int kOwnedSlots = 64;
-    struct alignas(64) Slot {
+    struct alignas(128) Slot {
         std::atomic<int> readers{0};
+        int fencedEntries = 0; // the owning thread's, between looks at the clock
     };
 
     Slot& slot(int index) { return slots_[index]; }
@@ -85,9 +98,15 @@ private:
     int dropReadShareForWrite(int index);
     void restoreReadShareAfterWrite(int index);
     void acquireExclusive();
+    void announceReader(Slot& own);
+    void fenceForReaders();
 
     Slot slots_[kOwnedSlots + 1]; // the last slot is shared by the threads beyond 64
-    alignas(64) std::atomic<bool> writer_{false};
+    alignas(128) std::atomic<bool> writer_{false};
+    const bool asymmetric_; // writers can fence for readers
+    const long long busyGapNs_;
+    std::atomic<bool> fencedReaders_{false}; // readers fence themselves while writes are busy
+    std::atomic<long long> lastWrite_{0};    // when the last write lock was taken, in ns
     std::atomic<const void*> writerOwner_{nullptr};
     int writeDepth_ = 0; // touched only by the writer
     int savedReads_ = 0; // the writer's own read share, given up while it writes
