@@ -25,6 +25,11 @@ inline double nanoseconds(Clock::duration d) {
 /// A query run over `count` inputs starting at input `first` (wrapping).
 typedef std::function<void(size_t first, size_t count)> Batch;
 
+inline double median(std::vector<double> values) {
+    std::nth_element(values.begin(), values.begin() + std::ptrdiff_t(values.size() / 2), values.end());
+    return values[values.size() / 2];
+}
+
 /// Alternates baseline and library batches, taking turns at going first;
 /// reports ns per query of each and "ratio_to_baseline", the median over the
 /// iterations of library time / baseline time, so that a batch cut short by
@@ -49,10 +54,9 @@ inline void compare(benchmark::State& state, size_t batch, const Batch& baseline
         first += batch;
     }
     const double queries = double(state.iterations()) * double(batch);
-    std::nth_element(ratios.begin(), ratios.begin() + std::ptrdiff_t(ratios.size() / 2), ratios.end());
     state.counters["baseline_ns"] = nanoseconds(spentBaseline) / queries;
     state.counters["library_ns"] = nanoseconds(spentLibrary) / queries;
-    state.counters["ratio_to_baseline"] = ratios[ratios.size() / 2];
+    state.counters["ratio_to_baseline"] = median(ratios);
 }
 
 /// Wall time of `threads` threads running `count` queries each at once, each
@@ -77,20 +81,24 @@ inline Clock::duration runThreads(int threads, size_t count, const Batch& query)
 
 /// Alternates rounds of one thread and of two threads over the same query;
 /// reports "scaling" (two threads' queries per second over one thread's) for
-/// the library and, as the machine's own limit, for the baseline.
+/// the library and, as the machine's own limit, for the baseline: each the
+/// median over the iterations, as in compare.
 inline void scaling(benchmark::State& state, size_t count, const Batch& baseline, const Batch& library) {
-    Clock::duration one{}, two{}, baseOne{}, baseTwo{};
+    std::vector<double> scalings, baselineScalings;
     bool oneFirst = true;
     for (auto _ : state) {
+        Clock::duration one{}, two{}, baseOne{}, baseTwo{};
         for (int turn = 0; turn < 2; ++turn) {
             const int threads = (turn == 0) == oneFirst ? 1 : 2;
             (threads == 1 ? one : two) += runThreads(threads, count, library);
             (threads == 1 ? baseOne : baseTwo) += runThreads(threads, count, baseline);
         }
+        scalings.push_back(2.0 * nanoseconds(one) / nanoseconds(two));
+        baselineScalings.push_back(2.0 * nanoseconds(baseOne) / nanoseconds(baseTwo));
         oneFirst = !oneFirst;
     }
-    state.counters["scaling"] = 2.0 * nanoseconds(one) / nanoseconds(two);
-    state.counters["baseline_scaling"] = 2.0 * nanoseconds(baseOne) / nanoseconds(baseTwo);
+    state.counters["scaling"] = median(scalings);
+    state.counters["baseline_scaling"] = median(baselineScalings);
 }
 
 } // namespace Interleaved

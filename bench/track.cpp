@@ -62,15 +62,28 @@ struct Filled {
     }
     VelaTime tick(size_t i) const { return ticks[i % ticks.size()]; }
 
-    Track::Pair flat(VelaTime t) const {
+    // The positions of the clips holding t, `none` where there is none.
+    static constexpr size_t none = size_t(-1);
+    std::pair<size_t, size_t> flat(VelaTime t) const {
         const size_t count = size_t(std::upper_bound(starts.begin(), starts.end(), t) - starts.begin());
-        if (count == 0) return Track::Pair();
+        if (count == 0) return {none, none};
         const size_t at = count - 1;
-        if (starts[at] == t && at > 0 && ends[at - 1] == t) return Track::Pair(clips[at - 1], clips[at]);
-        return t < ends[at] ? Track::Pair(clips[at], MediaPtr()) : Track::Pair();
+        if (starts[at] == t && at > 0 && ends[at - 1] == t) return {at - 1, at};
+        return t < ends[at] ? std::make_pair(at, none) : std::make_pair(none, none);
     }
+    MediaPtr shared(size_t at) const { return at == none ? MediaPtr() : clips[at]; }
+    Media* raw(size_t at) const { return at == none ? nullptr : clips[at].get(); }
     void flatArrays(size_t first, size_t count) const {
-        for (size_t i = first; i < first + count; ++i) benchmark::DoNotOptimize(flat(tick(i)));
+        for (size_t i = first; i < first + count; ++i) {
+            const std::pair<size_t, size_t> at = flat(tick(i));
+            benchmark::DoNotOptimize(Track::Pair(shared(at.first), shared(at.second)));
+        }
+    }
+    void flatArraysRaw(size_t first, size_t count) const {
+        for (size_t i = first; i < first + count; ++i) {
+            const std::pair<size_t, size_t> at = flat(tick(i));
+            benchmark::DoNotOptimize(Track::RawPair(raw(at.first), raw(at.second)));
+        }
     }
     void map(size_t first, size_t count) const {
         for (size_t i = first; i < first + count; ++i) {
@@ -82,6 +95,12 @@ struct Filled {
     void library(size_t first, size_t count) const {
         for (size_t i = first; i < first + count; ++i) benchmark::DoNotOptimize(track->mediaAtTime(tick(i)));
     }
+    // As a host would around one frame's queries: the lock once, then raw answers.
+    void libraryUnderLock(size_t first, size_t count) const {
+        ScopedReadLock lock(track->projectLock());
+        for (size_t i = first; i < first + count; ++i)
+            benchmark::DoNotOptimize(track->mediaAtTimeUnderLock(tick(i)));
+    }
 };
 
 void BM_MediaAtTime_VsFlatArrays(benchmark::State& state) {
@@ -89,6 +108,13 @@ void BM_MediaAtTime_VsFlatArrays(benchmark::State& state) {
     Interleaved::compare(
         state, 256, [&](size_t first, size_t count) { filled.flatArrays(first, count); },
         [&](size_t first, size_t count) { filled.library(first, count); });
+}
+
+void BM_MediaAtTimeUnderLock_VsFlatArrays(benchmark::State& state) {
+    const Filled& filled = Filled::once();
+    Interleaved::compare(
+        state, 256, [&](size_t first, size_t count) { filled.flatArraysRaw(first, count); },
+        [&](size_t first, size_t count) { filled.libraryUnderLock(first, count); });
 }
 
 void BM_MediaAtTime_VsStdMap(benchmark::State& state) {
@@ -150,6 +176,7 @@ void BM_AllMediasAtTime_20TracksOf5000(benchmark::State& state) {
 
 BENCHMARK(BM_MediaAtTime_VsFlatArrays);
 BENCHMARK(BM_MediaAtTime_VsStdMap);
+BENCHMARK(BM_MediaAtTimeUnderLock_VsFlatArrays);
 BENCHMARK(BM_MediaAtTime_TwoReaders)->Unit(benchmark::kMillisecond)->Iterations(10);
 BENCHMARK(BM_PlaceClipsEndToEnd)->Unit(benchmark::kMillisecond)->Iterations(2);
 BENCHMARK(BM_PlaceClipsFrontFirst)->Unit(benchmark::kMillisecond)->Iterations(2);

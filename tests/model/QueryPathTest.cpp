@@ -63,7 +63,13 @@ TEST(ClipIndex, AgreesWithTheClipsAfterRandomEdits) {
             // refused edits change nothing, which the check below also covers
         }
         const std::vector<MediaPtr> now = track->medias();
-        for (VelaTime t = -1; t <= 300; ++t) ASSERT_EQ(track->mediaAtTime(t), expectedAt(now, t)) << t;
+        ScopedReadLock held(track->projectLock());
+        for (VelaTime t = -1; t <= 300; ++t) {
+            const Track::Pair expected = expectedAt(now, t);
+            ASSERT_EQ(track->mediaAtTime(t), expected) << t;
+            ASSERT_EQ(track->mediaAtTimeUnderLock(t),
+                      Track::RawPair(expected.first.get(), expected.second.get()));
+        }
     }
 }
 

@@ -7,10 +7,6 @@
 
 namespace VelaMediaLib {
 
-size_t ClipIndex::countStartingBy(VelaTime t) const {
-    return size_t(std::upper_bound(starts_.begin(), starts_.end(), t) - starts_.begin());
-}
-
 size_t ClipIndex::find(VelaTime start) const {
     return size_t(std::lower_bound(starts_.begin(), starts_.end(), start) - starts_.begin());
 }

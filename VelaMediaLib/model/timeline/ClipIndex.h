@@ -5,6 +5,7 @@
 
 #include <boost/shared_ptr.hpp>
 #include <cstddef>
+#include <algorithm>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -24,7 +25,9 @@ public:
     const boost::shared_ptr<Media>& media(size_t i) const { return medias_[i]; }
 
     /// How many clips start at or before t: the one holding t, if any, is the last of them.
-    size_t countStartingBy(VelaTime t) const;
+    size_t countStartingBy(VelaTime t) const {
+        return size_t(std::upper_bound(starts_.begin(), starts_.end(), t) - starts_.begin());
+    }
 
     void insert(VelaTime start, VelaTime end, const boost::shared_ptr<Media>& media);
     /// Drops the clip starting at start (one must).

@@ -149,14 +149,30 @@ std::vector<TransitionPtr> Track::transitions() const {
 
 // The last clip starting at or before t holds t, unless t is where it starts
 // and the clip before ends: then both touching clips hold it.
+// Hands `answer` the index positions of the clips holding the tick, kNone
+// where there is none; the safe and the raw query differ only in the answer.
+template <typename Answer>
+auto Track::answerAtTime(VelaTime time, Answer answer) const {
+    const size_t count = index_.countStartingBy(time);
+    if (count == 0) return answer(kNone, kNone);
+    const size_t at = count - 1;
+    if (index_.start(at) == time && at > 0 && index_.end(at - 1) == time) return answer(at - 1, at);
+    return time < index_.end(at) ? answer(at, kNone) : answer(kNone, kNone);
+}
+
 Track::Pair Track::mediaAtTime(VelaTime time) const {
     ScopedReadLock lock(projectLock());
-    const size_t count = index_.countStartingBy(time);
-    if (count == 0) return Pair();
-    const size_t at = count - 1;
-    if (index_.start(at) == time && at > 0 && index_.end(at - 1) == time)
-        return Pair(index_.media(at - 1), index_.media(at));
-    return time < index_.end(at) ? Pair(index_.media(at), MediaPtr()) : Pair();
+    return answerAtTime(time, [this](size_t first, size_t second) {
+        return Pair(first == kNone ? MediaPtr() : index_.media(first),
+                    second == kNone ? MediaPtr() : index_.media(second));
+    });
+}
+
+Track::RawPair Track::mediaAtTimeUnderLock(VelaTime time) const {
+    return answerAtTime(time, [this](size_t first, size_t second) {
+        return RawPair(first == kNone ? nullptr : index_.media(first).get(),
+                       second == kNone ? nullptr : index_.media(second).get());
+    });
 }
 
 namespace {

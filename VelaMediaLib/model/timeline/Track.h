@@ -38,6 +38,8 @@ public:
     typedef std::pmr::map<VelaTime, MediaPtr> MediaMap;
     /// The clip at a time, or the two touching clips there (the earlier first).
     typedef std::pair<MediaPtr, MediaPtr> Pair;
+    /// The answer of a query made under a lock the caller holds.
+    typedef std::pair<Media*, Media*> RawPair;
     typedef Media::TransitionAndNeighbour TransitionAndNeighbour;
     typedef boost::function<void(const MediaPtr&)> MediaVisitor;
     /// A visitor that may set its flag to stop the walk.
@@ -79,7 +81,14 @@ public:
     std::vector<TransitionPtr> transitions() const;
 
     // Queries by time
+    /// The clip that holds the tick; at a cut between two touching clips,
+    /// both, left then right.
     Pair mediaAtTime(VelaTime time) const;
+    /// The same answer without taking the lock or sharing the clips: for a
+    /// host that holds the project's read lock (ScopedReadLock on
+    /// projectLock()) around many queries. The pointers stay valid while it
+    /// holds the lock.
+    RawPair mediaAtTimeUnderLock(VelaTime time) const;
     std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,
                                                   const MediaPtr& leftOut = MediaPtr()) const;
     std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,
@@ -171,6 +180,9 @@ private:
     /// The clip's entry: it is on this track when the track is its parent,
     /// keyed under its start (every timing edit of a placed clip re-keys it).
     MediaMap::const_iterator findMedia(const MediaPtr& media) const;
+    static constexpr size_t kNone = size_t(-1);
+    template <typename Answer>
+    auto answerAtTime(VelaTime time, Answer answer) const;
     /// A timing edit of a clip on this track, under the write lock the caller
     /// holds: the clip's preview checked for collisions, the edit computed
     /// (it may refuse), taken and re-keyed in one step with no other code
