@@ -118,18 +118,33 @@ TEST(ReadWriteMutexConcurrency, AReaderAndAWriterStartingTogetherNeverOverlap) {
     EXPECT_EQ(writerFences.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
 }
 
-// Close writes turn readers' own fencing on; once writes are quiet, reading
-// turns it off again.
-TEST(ReadWriteMutex, ReadersFenceThemselvesOnlyWhileWritesAreBusy) {
+// Close writes turn readers' own fencing on, but only with another thread
+// about to read; once writes are quiet, reading turns it off again.
+TEST(ReadWriteMutexConcurrency, ReadersFenceThemselvesOnlyWhileWritesAreBusy) {
+    Deadline deadline;
     ReadWriteMutex mutex;
-    EXPECT_EQ(mutex.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
-    for (int i = 0; i < 3; ++i) ScopedWriteLock lock(mutex);
+    const bool always = !detail::asymmetricFenceAvailable();
+    const auto busyWrites = [&] {
+        for (int i = 0; i < 3; ++i) ScopedWriteLock lock(mutex);
+    };
+    busyWrites();
+    EXPECT_EQ(mutex.readersFenceThemselves(), always); // alone: nobody to fence for
+    std::atomic<bool> done{false}, holding{false};
+    std::thread other([&] {
+        { ScopedReadLock lock(mutex); } // takes a reader slot and keeps it while it lives
+        holding = true;
+        while (!done.load()) std::this_thread::yield();
+    });
+    while (!holding.load()) std::this_thread::yield();
+    busyWrites();
     EXPECT_TRUE(mutex.readersFenceThemselves());
     for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
     EXPECT_TRUE(mutex.readersFenceThemselves()); // not quiet yet
     std::this_thread::sleep_for(std::chrono::milliseconds(60));
     for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
-    EXPECT_EQ(mutex.readersFenceThemselves(), !detail::asymmetricFenceAvailable());
+    EXPECT_EQ(mutex.readersFenceThemselves(), always);
+    done = true;
+    other.join();
 }
 
 // A writer alone skips fencing for readers; a thread born meanwhile must

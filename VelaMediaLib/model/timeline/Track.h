@@ -180,9 +180,8 @@ private:
     /// The clip's entry: it is on this track when the track is its parent,
     /// keyed under its start (every timing edit of a placed clip re-keys it).
     MediaMap::const_iterator findMedia(const MediaPtr& media) const;
-    static constexpr size_t kNone = size_t(-1);
     template <typename Answer>
-    auto answerAtTime(VelaTime time, Answer answer) const;
+    typename Answer::Result answerAtTime(VelaTime time) const;
     /// A timing edit of a clip on this track, under the write lock the caller
     /// holds: the clip's preview checked for collisions, the edit computed
     /// (it may refuse), taken and re-keyed in one step with no other code

@@ -160,14 +160,16 @@ void ReadWriteMutex::lockRead() {
 
 // Readers that announce themselves without a fence must each pass one before
 // the writer looks at their slots; when writes come thick and fast the
-// writer has readers fence themselves instead.
+// writer has readers fence themselves instead. A writer with no other
+// thread about has no reader to fence for, and leaves the mode alone.
 void ReadWriteMutex::fenceForReaders() {
+    if (!otherThreadsMayRead(threadSlot())) return;
     const long long now = nowNs();
     const bool busy = now - lastWrite_.load(std::memory_order_relaxed) < busyGapNs_;
     lastWrite_.store(now, std::memory_order_relaxed);
     if (fencedReaders_.load(std::memory_order_seq_cst)) return;
     if (busy) fencedReaders_.store(true, std::memory_order_seq_cst);
-    if (otherThreadsMayRead(threadSlot())) detail::heavyFence();
+    detail::heavyFence();
 }
 
 void ReadWriteMutex::unlockRead() {
