@@ -140,8 +140,9 @@ TEST(ReadWriteMutexConcurrency, ReadersFenceThemselvesOnlyWhileWritesAreBusy) {
     busyWrites();
     EXPECT_TRUE(mutex.readersFenceThemselves());
     for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
-    if (std::chrono::steady_clock::now() - lastWrite < std::chrono::milliseconds(40))
+    if (std::chrono::steady_clock::now() - lastWrite < std::chrono::milliseconds(40)) {
         EXPECT_TRUE(mutex.readersFenceThemselves()); // not quiet yet (unless this thread was held up)
+    }
     std::this_thread::sleep_for(std::chrono::milliseconds(60));
     for (int i = 0; i < 5000; ++i) ScopedReadLock lock(mutex);
     EXPECT_EQ(mutex.readersFenceThemselves(), always);
