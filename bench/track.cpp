@@ -62,28 +62,26 @@ struct Filled {
     }
     VelaTime tick(size_t i) const { return ticks[i % ticks.size()]; }
 
-    // The positions of the clips holding t, `none` where there is none.
-    static constexpr size_t none = size_t(-1);
-    std::pair<size_t, size_t> flat(VelaTime t) const {
+    // The track's search over the same arrays, building the answer straight
+    // from them as the track does; `hand` gives a clip out shared or raw.
+    template <typename Result, typename Hand>
+    Result flat(VelaTime t, Hand hand) const {
         const size_t count = size_t(std::upper_bound(starts.begin(), starts.end(), t) - starts.begin());
-        if (count == 0) return {none, none};
+        if (count == 0) return Result();
         const size_t at = count - 1;
-        if (starts[at] == t && at > 0 && ends[at - 1] == t) return {at - 1, at};
-        return t < ends[at] ? std::make_pair(at, none) : std::make_pair(none, none);
+        if (starts[at] == t && at > 0 && ends[at - 1] == t)
+            return Result(hand(clips[at - 1]), hand(clips[at]));
+        return t < ends[at] ? Result(hand(clips[at]), typename Result::second_type()) : Result();
     }
-    MediaPtr shared(size_t at) const { return at == none ? MediaPtr() : clips[at]; }
-    Media* raw(size_t at) const { return at == none ? nullptr : clips[at].get(); }
     void flatArrays(size_t first, size_t count) const {
-        for (size_t i = first; i < first + count; ++i) {
-            const std::pair<size_t, size_t> at = flat(tick(i));
-            benchmark::DoNotOptimize(Track::Pair(shared(at.first), shared(at.second)));
-        }
+        const auto shared = [](const MediaPtr& clip) -> const MediaPtr& { return clip; };
+        for (size_t i = first; i < first + count; ++i)
+            benchmark::DoNotOptimize(flat<Track::Pair>(tick(i), shared));
     }
     void flatArraysRaw(size_t first, size_t count) const {
-        for (size_t i = first; i < first + count; ++i) {
-            const std::pair<size_t, size_t> at = flat(tick(i));
-            benchmark::DoNotOptimize(Track::RawPair(raw(at.first), raw(at.second)));
-        }
+        const auto raw = [](const MediaPtr& clip) { return clip.get(); };
+        for (size_t i = first; i < first + count; ++i)
+            benchmark::DoNotOptimize(flat<Track::RawPair>(tick(i), raw));
     }
     void map(size_t first, size_t count) const {
         for (size_t i = first; i < first + count; ++i) {

@@ -6,6 +6,7 @@
 #include <VelaMediaLib/time/rational/RationalUtil.h>
 
 #include <algorithm>
+#include <cassert>
 
 namespace VelaMediaLib {
 namespace {
@@ -182,7 +183,11 @@ Track::Pair Track::mediaAtTime(VelaTime time) const {
     return answerAtTime<SharedAnswer>(time);
 }
 
-Track::RawPair Track::mediaAtTimeUnderLock(VelaTime time) const { return answerAtTime<RawAnswer>(time); }
+Track::RawPair Track::mediaAtTimeUnderLock(VelaTime time) const {
+    assert((!projectLock() || projectLock()->heldByThisThread()) &&
+           "mediaAtTimeUnderLock needs the read lock held");
+    return answerAtTime<RawAnswer>(time);
+}
 
 namespace {
 

@@ -5,10 +5,13 @@
 #include <cstdio>
 #include <cstdlib>
 
-#if defined(__linux__)
+#if defined(__linux__) && defined(__has_include)
+#if __has_include(<linux/membarrier.h>)
 #include <linux/membarrier.h>
+#include <sys/mman.h>
 #include <sys/syscall.h>
 #include <unistd.h>
+#endif
 #elif defined(_WIN32)
 #include <windows.h>
 #endif
@@ -16,18 +19,36 @@
 namespace VelaMediaLib {
 namespace detail {
 
-#if VELA_THREAD_SANITIZER
+#if VELA_THREAD_SANITIZER || defined(VELA_NO_ASYMMETRIC_FENCE)
 
 bool asymmetricFenceAvailable() { return false; }
 void heavyFence() {}
 
-#elif defined(__linux__) && defined(__NR_membarrier)
+#elif defined(__linux__) && defined(MEMBARRIER_CMD_PRIVATE_EXPEDITED) && defined(__NR_membarrier)
 
 namespace {
 
 long membarrier(int command) { return syscall(__NR_membarrier, command, 0, 0); }
 
 bool registerExpedited() { return membarrier(MEMBARRIER_CMD_REGISTER_PRIVATE_EXPEDITED) == 0; }
+
+// Changing a page's protection makes the kernel shoot its translation down on
+// every processor running the process, by interrupt, which fences each of
+// them: on x86 a barrier for a process that a sandbox no longer lets make the
+// membarrier call.
+bool protectionChangeFence() {
+#if defined(__x86_64__) || defined(__i386__)
+    static void* const page = mmap(nullptr, size_t(sysconf(_SC_PAGESIZE)), PROT_READ | PROT_WRITE,
+                                   MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    if (page == MAP_FAILED) return false;
+    const size_t size = size_t(sysconf(_SC_PAGESIZE));
+    if (mprotect(page, size, PROT_READ | PROT_WRITE) != 0) return false;
+    *static_cast<volatile char*>(page) = 1; // the page must be mapped for the change to reach others
+    return mprotect(page, size, PROT_READ) == 0;
+#else
+    return false; // elsewhere processors may drop translations without interrupting each other
+#endif
+}
 
 } // namespace
 
@@ -36,14 +57,18 @@ bool asymmetricFenceAvailable() {
     return available;
 }
 
-// The expedited barrier fails only if the registration got lost; registering
-// again mends that, and the slow global barrier is the last resort.
+// The expedited barrier fails only if the registration got lost (registering
+// again mends that) or a sandbox installed since refuses the call: then a
+// protection change does the same on x86. Readers rely on the fence, so with
+// none left going on could let a writer run beside them.
 void heavyFence() {
     if (membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
     if (registerExpedited() && membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
-    if (membarrier(MEMBARRIER_CMD_GLOBAL) == 0) return;
-    std::fputs("VelaMediaLib: the process-wide memory barrier stopped working\n", stderr);
-    std::abort(); // readers rely on it: going on could let a writer run beside them
+    if (protectionChangeFence()) return;
+    std::fputs("VelaMediaLib: no process-wide memory barrier is left (membarrier refused); "
+               "build with VELA_ASYMMETRIC_FENCE=OFF for sandboxes that refuse it\n",
+               stderr);
+    std::abort();
 }
 
 #elif defined(_WIN32)
@@ -54,7 +79,7 @@ void heavyFence() { FlushProcessWriteBuffers(); }
 #else
 
 bool asymmetricFenceAvailable() { return false; }
-void heavyFence() { std::atomic_thread_fence(std::memory_order_seq_cst); }
+void heavyFence() {}
 
 #endif
 
