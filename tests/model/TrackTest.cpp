@@ -263,6 +263,16 @@ TEST_F(TrackTest, MixerIndexRulesAndPuttingATrackBack) {
     EXPECT_FALSE(loose->removeTrack(GenericTrack::create(project)));
 }
 
+// A mixer spans from the earliest clip of any track to the latest end; an
+// empty track (which starts at 0) does not pull the start back.
+TEST_F(TrackTest, AMixerSpansItsTracksClips) {
+    placed(20, 10);
+    newTrack();
+    other->addMedia(clip(30), 50);
+    EXPECT_EQ(mixer->startTime(), 20);
+    EXPECT_EQ(mixer->endTime(), 80);
+}
+
 TEST_F(TrackTest, ATimelineKeepsNamedMixersAndRelaysClipEvents) {
     const TimelinePtr named = Timeline::create(project);
     EXPECT_FALSE(named->mixer());
