@@ -82,6 +82,7 @@ TEST_F(Notification, ADelayCoalescesChangesAndTheUndelayedHearAtOnce) {
         EXPECT_EQ(observer.count, 0);
     }
     EXPECT_FALSE(NotifyDelay::isActive(project));
+    EXPECT_FALSE(NotifyDelay::isActive(nullptr) || NotifyDelay::isNotifying(nullptr)); // no project, no delay
     EXPECT_EQ(observer.count, 1);
     EXPECT_EQ(otherObserver.count, 1);
     EXPECT_EQ(immediate.count, 2); // not told again at the end of the delay
