@@ -4,13 +4,15 @@
 
 #include <cstdio>
 #include <cstdlib>
+#include <mutex>
 
 #if defined(__linux__) && defined(__has_include)
 #if __has_include(<linux/membarrier.h>)
-#include <linux/membarrier.h>
+#include <linux/membarrier.h> // its commands are enumerators, not macros
 #include <sys/mman.h>
 #include <sys/syscall.h>
 #include <unistd.h>
+#define VELA_HAVE_MEMBARRIER 1
 #endif
 #elif defined(_WIN32)
 #include <windows.h>
@@ -24,7 +26,7 @@ namespace detail {
 bool asymmetricFenceAvailable() { return false; }
 void heavyFence() {}
 
-#elif defined(__linux__) && defined(MEMBARRIER_CMD_PRIVATE_EXPEDITED) && defined(__NR_membarrier)
+#elif defined(VELA_HAVE_MEMBARRIER) && defined(__NR_membarrier)
 
 namespace {
 
@@ -36,12 +38,18 @@ bool registerExpedited() { return membarrier(MEMBARRIER_CMD_REGISTER_PRIVATE_EXP
 // every processor running the process, by interrupt, which fences each of
 // them: on x86 a barrier for a process that a sandbox no longer lets make the
 // membarrier call.
+// One writer at a time: another's read-only step between this one's two
+// steps would fault its write. The page is locked in, or a page swapped out
+// might change without a shoot-down.
 bool protectionChangeFence() {
 #if defined(__x86_64__) || defined(__i386__)
+    static std::mutex serial;
     static void* const page = mmap(nullptr, size_t(sysconf(_SC_PAGESIZE)), PROT_READ | PROT_WRITE,
                                    MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
     if (page == MAP_FAILED) return false;
     const size_t size = size_t(sysconf(_SC_PAGESIZE));
+    std::lock_guard<std::mutex> lock(serial);
+    (void)mlock(page, size);
     if (mprotect(page, size, PROT_READ | PROT_WRITE) != 0) return false;
     *static_cast<volatile char*>(page) = 1; // the page must be mapped for the change to reach others
     return mprotect(page, size, PROT_READ) == 0;
@@ -59,12 +67,13 @@ bool asymmetricFenceAvailable() {
 
 // The expedited barrier fails only if the registration got lost (registering
 // again mends that) or a sandbox installed since refuses the call: then a
-// protection change does the same on x86. Readers rely on the fence, so with
+// protection change does the same on x86, and the slow global barrier is the
+// last resort. Readers rely on the fence, so with
 // none left going on could let a writer run beside them.
 void heavyFence() {
     if (membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
     if (registerExpedited() && membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
-    if (protectionChangeFence()) return;
+    if (protectionChangeFence() || membarrier(MEMBARRIER_CMD_GLOBAL) == 0) return;
     std::fputs("VelaMediaLib: no process-wide memory barrier is left (membarrier refused); "
                "build with VELA_ASYMMETRIC_FENCE=OFF for sandboxes that refuse it\n",
                stderr);
