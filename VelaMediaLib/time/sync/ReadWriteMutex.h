@@ -9,10 +9,10 @@
 // with no other thread about skips that too. While write locks follow each
 // other closely (within a millisecond) readers fence themselves instead, with
 // one exchange, until a reader finds writes quiet for 50 ms (it looks every
-// 1,024 fenced entries); elsewhere they always do. Waiting spins with a back-off that doubles
-// from 1 to 64 pauses and then stays there, yielding the processor at the
-// ceiling so that a waiting thread does not starve the holder on a small
-// machine.
+// 1,024 fenced entries); elsewhere they always do. Waiting spins with a
+// back-off that doubles from 1 to 64 pauses and then stays there, yielding
+// the processor at the ceiling so that a waiting thread does not starve the
+// holder on a small machine.
 //
 // The lock is reentrant per thread: a thread that holds it (for reading or
 // writing) may take it again for reading or writing. A reader that asks for

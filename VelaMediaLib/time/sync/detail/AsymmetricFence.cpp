@@ -21,12 +21,14 @@
 namespace VelaMediaLib {
 namespace detail {
 
+// ThreadSanitizer sees no process-wide barrier, and a build may opt out.
 #if VELA_THREAD_SANITIZER || defined(VELA_NO_ASYMMETRIC_FENCE)
+#define VELA_BARRIER_WANTED 0
+#else
+#define VELA_BARRIER_WANTED 1
+#endif
 
-bool asymmetricFenceAvailable() { return false; }
-void heavyFence() {}
-
-#elif defined(VELA_HAVE_MEMBARRIER) && defined(__NR_membarrier)
+#if VELA_BARRIER_WANTED && defined(VELA_HAVE_MEMBARRIER) && defined(__NR_membarrier)
 
 namespace {
 
@@ -37,10 +39,9 @@ bool registerExpedited() { return membarrier(MEMBARRIER_CMD_REGISTER_PRIVATE_EXP
 // Changing a page's protection makes the kernel shoot its translation down on
 // every processor running the process, by interrupt, which fences each of
 // them: on x86 a barrier for a process that a sandbox no longer lets make the
-// membarrier call.
-// One writer at a time: another's read-only step between this one's two
-// steps would fault its write. The page is locked in, or a page swapped out
-// might change without a shoot-down.
+// membarrier call. One writer at a time (another's read-only step between
+// this one's two steps would fault its write), and the page locked in (a page
+// swapped out might change without a shoot-down).
 bool protectionChangeFence() {
 #if defined(__x86_64__) || defined(__i386__)
     static std::mutex serial;
@@ -68,8 +69,8 @@ bool asymmetricFenceAvailable() {
 // The expedited barrier fails only if the registration got lost (registering
 // again mends that) or a sandbox installed since refuses the call: then a
 // protection change does the same on x86, and the slow global barrier is the
-// last resort. Readers rely on the fence, so with
-// none left going on could let a writer run beside them.
+// last resort. Readers rely on the fence: with none left, going on could let
+// a writer run beside them.
 void heavyFence() {
     if (membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
     if (registerExpedited() && membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
@@ -80,7 +81,7 @@ void heavyFence() {
     std::abort();
 }
 
-#elif defined(_WIN32)
+#elif VELA_BARRIER_WANTED && defined(_WIN32)
 
 bool asymmetricFenceAvailable() { return true; }
 void heavyFence() { FlushProcessWriteBuffers(); }
