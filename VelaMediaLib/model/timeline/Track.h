@@ -87,7 +87,8 @@ public:
     /// The same answer without taking the lock or sharing the clips: for a
     /// host that holds the project's read lock (ScopedReadLock on
     /// projectLock()) around many queries. The pointers stay valid while it
-    /// holds the lock and makes no edit itself: an edit on the holding
+    /// holds the lock, the project lives (edits of a project that has gone
+    /// take no lock) and it makes no edit itself: an edit on the holding
     /// thread gives the read share up meanwhile, and may free the clips.
     RawPair mediaAtTimeUnderLock(VelaTime time) const;
     std::vector<MediaPtr> mediasIntersectingRange(const Range<VelaTime>& range,

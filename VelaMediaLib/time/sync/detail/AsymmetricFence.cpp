@@ -39,7 +39,9 @@ bool registerExpedited() { return membarrier(MEMBARRIER_CMD_REGISTER_PRIVATE_EXP
 // Changing a page's protection makes the kernel shoot its translation down on
 // every processor running the process, by interrupt, which fences each of
 // them: on x86 a barrier for a process that a sandbox no longer lets make the
-// membarrier call. One writer at a time (another's read-only step between
+// membarrier call. Best effort: a processor that drops translations by a
+// broadcast instruction rather than an interrupt would not fence; sandboxed
+// hosts should build without the barrier instead. One writer at a time (another's read-only step between
 // this one's two steps would fault its write), and the page locked in (a page
 // swapped out might change without a shoot-down).
 bool protectionChangeFence() {
