@@ -7,6 +7,8 @@
 
 namespace VelaMediaLib {
 
+class Project;
+
 /// What commands reach the model through. Each operation takes the track and
 /// the clip and answers the track and clip after the edit (an edit may
 /// replace the clip), or an empty pair when the model refused it.
@@ -26,6 +28,10 @@ public:
                                             const MediaState& state) = 0;
     virtual TrackAndMedia addMedia(const TrackPtr& track, const MediaPtr& media, VelaTime start) = 0;
     virtual TrackAndMedia removeMedia(const TrackPtr& track, const MediaPtr& media) = 0;
+    /// The project the commands act on, for those that need more than its
+    /// tracks (loading a source); null for a handler of no project. A handler
+    /// that stands in front of a project's passes it on.
+    virtual boost::shared_ptr<Project> project() { return boost::shared_ptr<Project>(); }
 };
 
 /// The handler for commands that need nothing of a project but its tracks:

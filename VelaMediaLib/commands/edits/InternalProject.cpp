@@ -49,7 +49,7 @@ void InternalProject::init() {
     setMetaDataProjectMutex(projectToken); // the one token of the project's own parts
     editRate_.setProjectMutex(projectToken);
     subject_.setOwner(this);
-    sourceBin_.reset(new SourceBin(projectToken));
+    sourceBin_.reset(new SourceBin(projectToken, editRateToken()));
     timeline_ = Timeline::create(projectToken);
     clipBoard_.reset(new ClipBoard(projectToken));
     // The project is the history's handler; the history holds it alive

@@ -46,7 +46,8 @@ public:
     void detachEditRateObserver(Observer* observer) const override {
         editRate_.detachEditRateObserver(observer);
     }
-    void setEditRate(const boost::rational<unsigned long>& rate) override { editRate_.setEditRate(rate); }
+    /// Every source of the bin takes the rate too.
+    void setEditRate(const boost::rational<unsigned long>& rate) override;
 
     // Observation
     void attach(Observer* observer) override { subject_.attach(observer); }
@@ -67,6 +68,22 @@ public:
     void removeMixer(const MixerPtr& mixer) override { timeline_->removeMixer(mixer); }
     void addClipping(const MixerPtr& clipping) override { clipBoard_->addClipping(clipping); }
     bool removeClipping(const MixerPtr& clipping) override { return clipBoard_->removeClipping(clipping); }
+
+    // Sources
+    boost::shared_ptr<Source> loadSource(const std::string& path) override { return loadSourceAtIndex(path, -1); }
+    boost::shared_ptr<Source> loadSourceAtIndex(const std::string& path, int index) override {
+        return sourceBin_->loadFileAtIndex(path, index);
+    }
+    int unloadSource(const boost::shared_ptr<Source>& source) override;
+    bool bringSourceOnline(const boost::shared_ptr<Source>& source) override;
+    void dropSourceOffline(const boost::shared_ptr<Source>& source) override;
+    void changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) override;
+    void renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) override {
+        sourceBin_->renameSourcesFile(source, path);
+    }
+    void addSourceBinSentry(Observer* sentry) override { sourceBin_->attach(sentry); }
+    /// The project acts on its own commands: load and unload reach it here.
+    boost::shared_ptr<Project> project() override { return shared_from_this(); }
 
     // Commands
     /// Executes through the history; when that throws, the history is put back
@@ -103,6 +120,8 @@ public:
 private:
     explicit InternalProject(const boost::rational<unsigned long>& rate);
     void init();
+    /// The timeline's clips of the source take its streams' new ranges.
+    void refitInstancesOf(const boost::shared_ptr<Source>& source) const;
 
     SimpleProjectEditRate editRate_;
     PartSubject subject_{*this}; // notifies under the project's own token

@@ -1,8 +1,13 @@
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
 
+#include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/media/ScreenIMFile.h>
+#include <VelaMediaLib/model/media/ScreenVMFile.h>
+#include <VelaMediaLib/model/media/VMFile.h>
 
 namespace VelaMediaLib {
 
@@ -12,6 +17,16 @@ void ConstMediaDispatcher::dispatchPlaceholderMedia(const PlaceholderMedia& medi
     dispatchAnyMedia(media);
 }
 void ConstMediaDispatcher::dispatchColorMedia(const ColorMedia& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchVMFile(VMFile& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchVMFile(const VMFile& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchAMFile(AMFile& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchAMFile(const AMFile& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchIMFile(IMFile& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchIMFile(const IMFile& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchScreenVMFile(ScreenVMFile& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchScreenVMFile(const ScreenVMFile& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchScreenIMFile(ScreenIMFile& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchScreenIMFile(const ScreenIMFile& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

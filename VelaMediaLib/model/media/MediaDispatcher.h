@@ -4,9 +4,14 @@
 
 namespace VelaMediaLib {
 
+class AMFile;
 class ColorMedia;
+class IMFile;
 class Media;
 class PlaceholderMedia;
+class ScreenIMFile;
+class ScreenVMFile;
+class VMFile;
 
 /// A visitor over the concrete clip kinds; each kind's dispatch calls the
 /// operation of its own kind. Kinds a visitor does not handle fall through
@@ -16,6 +21,11 @@ public:
     virtual ~MediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(PlaceholderMedia& media);
     virtual void dispatchColorMedia(ColorMedia& media);
+    virtual void dispatchVMFile(VMFile& media);
+    virtual void dispatchAMFile(AMFile& media);
+    virtual void dispatchIMFile(IMFile& media);
+    virtual void dispatchScreenVMFile(ScreenVMFile& media);
+    virtual void dispatchScreenIMFile(ScreenIMFile& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -27,6 +37,11 @@ public:
     virtual ~ConstMediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(const PlaceholderMedia& media);
     virtual void dispatchColorMedia(const ColorMedia& media);
+    virtual void dispatchVMFile(const VMFile& media);
+    virtual void dispatchAMFile(const AMFile& media);
+    virtual void dispatchIMFile(const IMFile& media);
+    virtual void dispatchScreenVMFile(const ScreenVMFile& media);
+    virtual void dispatchScreenIMFile(const ScreenIMFile& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

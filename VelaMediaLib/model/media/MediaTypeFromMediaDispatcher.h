@@ -12,6 +12,11 @@ class VELAMEDIALIB_API MediaTypeFromMediaDispatcher : public ConstMediaDispatche
 public:
     void dispatchPlaceholderMedia(const PlaceholderMedia&) override { type_ = "PlaceholderMedia"; }
     void dispatchColorMedia(const ColorMedia&) override { type_ = "ColorMedia"; }
+    void dispatchVMFile(const VMFile&) override { type_ = "VMFile"; }
+    void dispatchAMFile(const AMFile&) override { type_ = "AMFile"; }
+    void dispatchIMFile(const IMFile&) override { type_ = "IMFile"; }
+    void dispatchScreenVMFile(const ScreenVMFile&) override { type_ = "ScreenVMFile"; }
+    void dispatchScreenIMFile(const ScreenIMFile&) override { type_ = "ScreenIMFile"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);

@@ -13,6 +13,7 @@
 namespace VelaMediaLib {
 
 class CommandHandler;
+class Source;
 
 /// The document: the timeline, the source bin, the clipboard, the command
 /// history and the settings, and the one reader-writer lock of the whole
@@ -84,6 +85,31 @@ public:
     virtual void removeMixer(const MixerPtr& mixer) = 0;
     virtual void addClipping(const MixerPtr& clipping) = 0;
     virtual bool removeClipping(const MixerPtr& clipping) = 0;
+
+    // Sources. Loading and unloading go through LoadSourceCmd and
+    // UnloadSourceCmd to be undoable; these act at once.
+
+    /// The file's source: the one the bin holds, or a new one appended.
+    virtual boost::shared_ptr<Source> loadSource(const std::string& path) = 0;
+    /// The same, a new source inserted at the index (-1 appends); see SourceBin::loadFileAtIndex.
+    virtual boost::shared_ptr<Source> loadSourceAtIndex(const std::string& path, int index) = 0;
+    /// Takes the source out of the bin and returns where it was. Throws
+    /// VelaMediaLibException "unable to remove a source that still has
+    /// instances on the timeline." while a clip on the timeline plays it, and
+    /// AddRemoveException when the bin does not hold it.
+    virtual int unloadSource(const boost::shared_ptr<Source>& source) = 0;
+    /// Brings an offline source back when its file can be read again and
+    /// its streams still match (its clips take their ranges); returns
+    /// whether it is online.
+    virtual bool bringSourceOnline(const boost::shared_ptr<Source>& source) = 0;
+    virtual void dropSourceOffline(const boost::shared_ptr<Source>& source) = 0;
+    /// See SourceBin::changeSourcesFile; the timeline's clips of the source
+    /// take the new streams' ranges.
+    virtual void changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) = 0;
+    virtual void renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) = 0;
+    /// The observer hears of every change of the source bin (load, unload,
+    /// change or rename of a file), told as the bin's observers are.
+    virtual void addSourceBinSentry(Observer* sentry) = 0;
 
     // Commands. execute (from CommandExecutor) first runs the follow-ups
     // queued while the history was idle (a host editing a magnetic track

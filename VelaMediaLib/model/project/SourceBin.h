@@ -2,32 +2,88 @@
 
 #include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
-#include <VelaMediaLib/time/sync/ProjectToken.h>
-#include <VelaMediaLib/time/sync/ThreadSafe.h>
+#include <VelaMediaLib/time/parameters/MetaDatable.h>
+#include <VelaMediaLib/time/sync/Subject.h>
 
+#include <boost/enable_shared_from_this.hpp>
 #include <boost/shared_ptr.hpp>
+#include <string>
+#include <unordered_map>
 #include <vector>
 
 namespace VelaMediaLib {
 
+class FileSystem;
+class ProjectEditRate;
 class Source;
 
-/// The project's imported sources, in the order they came.
-class VELAMEDIALIB_API SourceBin : public VelaObject, public ProjectToken {
+/// The project's imported sources, in the order they came, with an index by
+/// file path (paths are compared as written, after lexical normalisation:
+/// "a/./b" and "a/b" are one file). Reads take the project's read lock,
+/// changes its write lock; files are read with no lock held. Observers
+/// attached to the bin (the project's source-bin sentries) hear of every
+/// source loaded, unloaded, renamed or given another file.
+class VELAMEDIALIB_API SourceBin : public VelaObject,
+                                   public ObjectSubject,
+                                   public MetaDatable,
+                                   public boost::enable_shared_from_this<SourceBin> {
 public:
-    explicit SourceBin(const boost::weak_ptr<const ThreadSafe>& token) : ProjectToken(token) {}
+    typedef std::vector<boost::shared_ptr<Source>> Sources;
 
-    std::vector<boost::shared_ptr<Source>> sources() const {
-        ScopedReadLock lock(projectLock());
-        return sources_;
-    }
-    size_t size() const {
-        ScopedReadLock lock(projectLock());
-        return sources_.size();
-    }
+    SourceBin(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate);
+    ~SourceBin() override;
+    boost::weak_ptr<const void> lifeline() const override { return weak_from_this(); }
+
+    /// Iterators over the list itself: the caller holds the project's read
+    /// lock while it uses them, or edits on this thread only.
+    Sources::const_iterator begin() const { return sources_.begin(); }
+    Sources::const_iterator end() const { return sources_.end(); }
+    Sources sources() const;
+    size_t numSources() const;
+    size_t size() const { return numSources(); }
+    /// The source's position, or -1.
+    int indexOfSource(const boost::shared_ptr<const Source>& source) const;
+    bool containsSource(const boost::shared_ptr<const Source>& source) const;
+    bool isFileLoaded(const std::string& path) const;
+    /// The source of the file, or null.
+    boost::shared_ptr<Source> sourceForFile(const std::string& path) const;
+
+    /// The file's source: the one the bin holds, or a new one appended.
+    boost::shared_ptr<Source> loadFile(const std::string& path);
+    /// The same, a new source inserted at the index (-1 appends). Throws
+    /// IndexException "source index out of range" and the exceptions of
+    /// Source::create; the bin is then unchanged.
+    boost::shared_ptr<Source> loadFileAtIndex(const std::string& path, int index);
+    /// Puts a source in the bin at the index (-1 appends), as a load and
+    /// its redo do. Throws AddRemoveException when the bin holds it or
+    /// another source of its file, and "list too long" when full.
+    void insertSource(const boost::shared_ptr<Source>& source, int index);
+    /// Takes the source out; returns where it was. Throws AddRemoveException
+    /// "source is not in the source bin".
+    int removeSource(const boost::shared_ptr<const Source>& source);
+    /// Gives the source another file whose streams match its own (see
+    /// MediaFileStats::areCompatibleForChange); its clips take the new
+    /// streams' ranges. Throws VelaMediaLibException "file is not compatible
+    /// with the source's file: <path>", AddRemoveException when another
+    /// source has the file, and the exceptions of MediaFileStats::create.
+    void changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path);
+    /// Records that the source's file now lives under another path.
+    void renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path);
+
+    /// The file system new sources ask about their files (the host's by default).
+    void setFileSystem(const boost::shared_ptr<FileSystem>& fileSystem);
 
 private:
-    std::vector<boost::shared_ptr<Source>> sources_;
+    static std::string keyOf(const std::string& path);
+    void checkInsertable(const Source& source, const std::string& key, int index) const;
+    void checkHeld(const boost::shared_ptr<const Source>& source) const;
+    boost::shared_ptr<Source> lockedSourceForKey(const std::string& key) const;
+    void rekey(const boost::shared_ptr<Source>& source, const std::string& oldKey);
+
+    boost::weak_ptr<ProjectEditRate> rate_;
+    boost::shared_ptr<FileSystem> fileSystem_;
+    Sources sources_;
+    std::unordered_map<std::string, boost::shared_ptr<Source>> byPath_;
 };
 
 } // namespace VelaMediaLib

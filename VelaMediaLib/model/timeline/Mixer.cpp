@@ -1,6 +1,7 @@
 #include <VelaMediaLib/model/timeline/Mixer.h>
 
 #include <VelaMediaLib/model/media/AudioMedia.h>
+#include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
 
@@ -88,6 +89,10 @@ std::vector<MediaPtr> Mixer::allMedias() const {
         clips.insert(clips.end(), more.begin(), more.end());
     });
     return clips;
+}
+
+std::vector<boost::shared_ptr<const Source>> Mixer::allSources() const {
+    return Sourceable::sourcesOf(allMedias());
 }
 
 namespace {

@@ -7,6 +7,8 @@
 
 namespace VelaMediaLib {
 
+class Source;
+
 class Timeline;
 
 /// An ordered list of tracks; a track's index is its place in the list. A
@@ -47,6 +49,8 @@ public:
 
     // The tracks together
     std::vector<MediaPtr> allMedias() const;
+    /// The sources the clips play, each once.
+    std::vector<boost::shared_ptr<const Source>> allSources() const;
     bool hasAudio() const;
     bool hasVisual() const;
     VelaTime startTime() const override;

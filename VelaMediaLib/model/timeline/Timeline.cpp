@@ -173,6 +173,14 @@ std::vector<MediaPtr> Timeline::allMediasAtTime(VelaTime time) const {
     return clips;
 }
 
+std::vector<boost::shared_ptr<const Source>> Timeline::allSources() const {
+    return Sourceable::sourcesOf(allMedias());
+}
+
+std::vector<MediaPtr> Timeline::instancesOf(const boost::shared_ptr<const Source>& source) const {
+    return Sourceable::clipsOf(allMedias(), source);
+}
+
 size_t Timeline::swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,
                                              const boost::shared_ptr<const Source>& to) {
     size_t swapped = 0;

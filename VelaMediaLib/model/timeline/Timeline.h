@@ -78,6 +78,13 @@ public:
     bool hasInstanceOf() const {
         return !instancesOf<Kind>().empty();
     }
+    /// The sources the clips play, each once.
+    std::vector<boost::shared_ptr<const Source>> allSources() const;
+    /// The clips that play the source.
+    std::vector<MediaPtr> instancesOf(const boost::shared_ptr<const Source>& source) const;
+    bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
+        return !instancesOf(source).empty();
+    }
     /// Gives every clip that plays `from` the source `to`; returns how many changed.
     size_t swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,
                                        const boost::shared_ptr<const Source>& to);

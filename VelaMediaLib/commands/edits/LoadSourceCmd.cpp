@@ -1,0 +1,44 @@
+#include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
+
+#include <VelaMediaLib/commands/edits/SourceCommandSupport.h>
+#include <VelaMediaLib/model/source/Source.h>
+
+namespace VelaMediaLib {
+
+boost::shared_ptr<LoadSourceCmd> LoadSourceCmd::create(const boost::shared_ptr<Source>& source) {
+    if (!source) throw VelaMediaLibException("no source to load");
+    const boost::shared_ptr<LoadSourceCmd> command(new LoadSourceCmd(source, source->filename(), -1));
+    command->setName("Import Media");
+    return command;
+}
+
+boost::shared_ptr<LoadSourceCmd> LoadSourceCmd::create(const std::string& path, int index) {
+    const boost::shared_ptr<LoadSourceCmd> command(new LoadSourceCmd(SourcePtr(), path, index));
+    command->setName("Import Media");
+    return command;
+}
+
+bool LoadSourceCmd::execute(CommandHandler* handler) {
+    const boost::shared_ptr<Project> project = projectForSourceCommand(handler);
+    const boost::shared_ptr<SourceBin> bin = project->sourceBin();
+    if (bin->isFileLoaded(path_)) return false; // nothing to load, nothing to undo
+    if (source_) {
+        bin->insertSource(source_, index_);
+    } else {
+        source_ = project->loadSourceAtIndex(path_, index_);
+    }
+    index_ = bin->indexOfSource(source_);
+    return true;
+}
+
+bool LoadSourceCmd::unexecute(CommandHandler* handler) {
+    projectForSourceCommand(handler)->unloadSource(source_);
+    return true;
+}
+
+bool LoadSourceCmd::reexecute(CommandHandler* handler) {
+    projectForSourceCommand(handler)->sourceBin()->insertSource(source_, index_);
+    return true;
+}
+
+} // namespace VelaMediaLib
