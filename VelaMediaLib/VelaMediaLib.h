@@ -68,6 +68,16 @@
 #include <VelaMediaLib/model/project/SourceBin.h>
 #include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/model/project/SubProject.h>
+#include <VelaMediaLib/model/source/BoostFileSystem.h>
+#include <VelaMediaLib/model/source/CachingStatsLoader.h>
+#include <VelaMediaLib/model/source/FileSystem.h>
+#include <VelaMediaLib/model/source/MediaFileStats.h>
+#include <VelaMediaLib/model/source/MediaOrientation.h>
+#include <VelaMediaLib/model/source/OfflineStatus.h>
+#include <VelaMediaLib/model/source/SimpleMediaFileStats.h>
+#include <VelaMediaLib/model/source/StatsLoader.h>
+#include <VelaMediaLib/model/source/TrackStats.h>
+#include <VelaMediaLib/model/source/TrackType.h>
 #include <VelaMediaLib/model/timeline/ClipBoard.h>
 #include <VelaMediaLib/model/timeline/ClipIndex.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
