@@ -12,7 +12,7 @@ namespace VelaMediaLib {
 /// normalisation and the source file offset are the audio clips' attributes.
 class VELAMEDIALIB_API AMFile : public AudioMediaImpl, public FileMedia {
 public:
-    static const int allChannels = -1;
+    static constexpr int allChannels = -1;
 
     /// The whole stream at normal speed, from start on the track.
     static boost::shared_ptr<AMFile> create(const boost::shared_ptr<const Source>& source, int stream,

@@ -67,7 +67,7 @@ boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, in
     // Reading the file may take long: no lock is held meanwhile.
     const boost::shared_ptr<Source> source = Source::create(rate_, projectMutex(), path, fileSystem);
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         // Another thread may have loaded the file meanwhile; its source wins.
         if (const boost::shared_ptr<Source> loaded = lockedSourceForKey(keyOf(path))) return loaded;
         checkInsertable(*source, keyOf(path), index);
@@ -93,7 +93,7 @@ void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index)
         throw AddRemoveException("the source belongs to another project");
     const std::string key = keyOf(source->filename());
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         checkInsertable(*source, key, index);
         sources_.insert(index < 0 ? sources_.end() : sources_.begin() + index, source);
         byPath_[key] = source;
@@ -104,7 +104,7 @@ void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index)
 int SourceBin::removeSource(const boost::shared_ptr<const Source>& source) {
     int index = -1;
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         const auto found = std::find(sources_.begin(), sources_.end(), source);
         if (found == sources_.end()) throw AddRemoveException("source is not in the source bin");
         index = static_cast<int>(found - sources_.begin());
@@ -134,7 +134,7 @@ void SourceBin::changeSourcesFile(const boost::shared_ptr<Source>& source, const
     const std::string oldKey = keyOf(source->filename());
     source->setStats(stats);
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         rekey(source, oldKey);
     }
     notify();
@@ -147,14 +147,14 @@ void SourceBin::renameSourcesFile(const boost::shared_ptr<Source>& source, const
     const std::string oldKey = keyOf(source->filename());
     source->setFilename(path);
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         rekey(source, oldKey);
     }
     notify();
 }
 
 void SourceBin::setFileSystem(const boost::shared_ptr<FileSystem>& fileSystem) {
-    ScopedWriteLock lock(projectLock());
+    ScopedWriteLock lock(projectMutex());
     fileSystem_ = fileSystem;
 }
 

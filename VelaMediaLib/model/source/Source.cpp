@@ -173,7 +173,7 @@ std::vector<boost::shared_ptr<ParameterInterface>> Source::parameterVector(int s
 
 void Source::setEditRate(const boost::rational<unsigned long>& rate) {
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         editRate_ = rate;
     }
     refitStreamMedia();
@@ -182,7 +182,7 @@ void Source::setEditRate(const boost::rational<unsigned long>& rate) {
 void Source::setStats(const boost::shared_ptr<MediaFileStats>& stats) {
     if (!stats) throw VelaMediaLibException("a source needs the stats of its file");
     {
-        ScopedWriteLock lock(projectLock());
+        ScopedWriteLock lock(projectMutex());
         stats_ = stats;
     }
     refitStreamMedia();
