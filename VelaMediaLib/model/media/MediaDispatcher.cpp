@@ -1,5 +1,7 @@
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
 
+#include <VelaMediaLib/model/media/Callout.h>
+#include <VelaMediaLib/model/media/Caption.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
@@ -12,6 +14,10 @@ void ConstMediaDispatcher::dispatchPlaceholderMedia(const PlaceholderMedia& medi
     dispatchAnyMedia(media);
 }
 void ConstMediaDispatcher::dispatchColorMedia(const ColorMedia& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchCallout(Callout& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchCaption(Caption& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchCallout(const Callout& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchCaption(const Caption& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

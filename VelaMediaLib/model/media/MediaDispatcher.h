@@ -4,6 +4,8 @@
 
 namespace VelaMediaLib {
 
+class Callout;
+class Caption;
 class ColorMedia;
 class Media;
 class PlaceholderMedia;
@@ -16,6 +18,8 @@ public:
     virtual ~MediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(PlaceholderMedia& media);
     virtual void dispatchColorMedia(ColorMedia& media);
+    virtual void dispatchCallout(Callout& media);
+    virtual void dispatchCaption(Caption& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -27,6 +31,8 @@ public:
     virtual ~ConstMediaDispatcher() = default;
     virtual void dispatchPlaceholderMedia(const PlaceholderMedia& media);
     virtual void dispatchColorMedia(const ColorMedia& media);
+    virtual void dispatchCallout(const Callout& media);
+    virtual void dispatchCaption(const Caption& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

@@ -12,6 +12,8 @@ class VELAMEDIALIB_API MediaTypeFromMediaDispatcher : public ConstMediaDispatche
 public:
     void dispatchPlaceholderMedia(const PlaceholderMedia&) override { type_ = "PlaceholderMedia"; }
     void dispatchColorMedia(const ColorMedia&) override { type_ = "ColorMedia"; }
+    void dispatchCallout(const Callout&) override { type_ = "Callout"; }
+    void dispatchCaption(const Caption&) override { type_ = "Caption"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);
