@@ -45,6 +45,8 @@
 #include <VelaMediaLib/effects/Effectable.h>
 #include <VelaMediaLib/model/media/AudioMedia.h>
 #include <VelaMediaLib/model/media/AudioMediaImpl.h>
+#include <VelaMediaLib/model/media/Callout.h>
+#include <VelaMediaLib/model/media/Caption.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
 #include <VelaMediaLib/model/media/EdgeModification.h>
@@ -59,6 +61,9 @@
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 #include <VelaMediaLib/model/media/RationalStaticEditor.h>
 #include <VelaMediaLib/model/media/RationalTemporalEditor.h>
+#include <VelaMediaLib/model/media/ScreenDataProvider.h>
+#include <VelaMediaLib/model/media/ScreenMetaDataProvider.h>
+#include <VelaMediaLib/model/media/ScreenRecordingData.h>
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>

@@ -1,6 +1,8 @@
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
 
 #include <VelaMediaLib/model/media/AMFile.h>
+#include <VelaMediaLib/model/media/Callout.h>
+#include <VelaMediaLib/model/media/Caption.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
@@ -27,6 +29,10 @@ void MediaDispatcher::dispatchScreenVMFile(ScreenVMFile& media) { dispatchAnyMed
 void ConstMediaDispatcher::dispatchScreenVMFile(const ScreenVMFile& media) { dispatchAnyMedia(media); }
 void MediaDispatcher::dispatchScreenIMFile(ScreenIMFile& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchScreenIMFile(const ScreenIMFile& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchCallout(Callout& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchCaption(Caption& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchCallout(const Callout& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchCaption(const Caption& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

@@ -5,6 +5,8 @@
 namespace VelaMediaLib {
 
 class AMFile;
+class Callout;
+class Caption;
 class ColorMedia;
 class IMFile;
 class Media;
@@ -26,6 +28,8 @@ public:
     virtual void dispatchIMFile(IMFile& media);
     virtual void dispatchScreenVMFile(ScreenVMFile& media);
     virtual void dispatchScreenIMFile(ScreenIMFile& media);
+    virtual void dispatchCallout(Callout& media);
+    virtual void dispatchCaption(Caption& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -42,6 +46,8 @@ public:
     virtual void dispatchIMFile(const IMFile& media);
     virtual void dispatchScreenVMFile(const ScreenVMFile& media);
     virtual void dispatchScreenIMFile(const ScreenIMFile& media);
+    virtual void dispatchCallout(const Callout& media);
+    virtual void dispatchCaption(const Caption& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

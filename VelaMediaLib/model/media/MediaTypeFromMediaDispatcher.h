@@ -17,6 +17,8 @@ public:
     void dispatchIMFile(const IMFile&) override { type_ = "IMFile"; }
     void dispatchScreenVMFile(const ScreenVMFile&) override { type_ = "ScreenVMFile"; }
     void dispatchScreenIMFile(const ScreenIMFile&) override { type_ = "ScreenIMFile"; }
+    void dispatchCallout(const Callout&) override { type_ = "Callout"; }
+    void dispatchCaption(const Caption&) override { type_ = "Caption"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);
