@@ -22,11 +22,13 @@
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
@@ -43,6 +45,8 @@
 #include <VelaMediaLib/effects/Effect.h>
 #include <VelaMediaLib/effects/EffectList.h>
 #include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/model/media/AMFile.h>
+#include <VelaMediaLib/model/media/AbstractIMFile.h>
 #include <VelaMediaLib/model/media/AudioMedia.h>
 #include <VelaMediaLib/model/media/AudioMediaImpl.h>
 #include <VelaMediaLib/model/media/Callout.h>
@@ -50,6 +54,8 @@
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
 #include <VelaMediaLib/model/media/EdgeModification.h>
+#include <VelaMediaLib/model/media/FileMedia.h>
+#include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/media/Media.h>
 #include <VelaMediaLib/model/media/MediaDispatcher.h>
@@ -62,11 +68,14 @@
 #include <VelaMediaLib/model/media/RationalStaticEditor.h>
 #include <VelaMediaLib/model/media/RationalTemporalEditor.h>
 #include <VelaMediaLib/model/media/ScreenDataProvider.h>
+#include <VelaMediaLib/model/media/ScreenIMFile.h>
 #include <VelaMediaLib/model/media/ScreenMetaDataProvider.h>
 #include <VelaMediaLib/model/media/ScreenRecordingData.h>
+#include <VelaMediaLib/model/media/ScreenVMFile.h>
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>
+#include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>
 #include <VelaMediaLib/model/project/Project.h>
@@ -80,6 +89,8 @@
 #include <VelaMediaLib/model/source/MediaOrientation.h>
 #include <VelaMediaLib/model/source/OfflineStatus.h>
 #include <VelaMediaLib/model/source/SimpleMediaFileStats.h>
+#include <VelaMediaLib/model/source/Source.h>
+#include <VelaMediaLib/model/source/SourceMediaIterator.h>
 #include <VelaMediaLib/model/source/StatsLoader.h>
 #include <VelaMediaLib/model/source/TrackStats.h>
 #include <VelaMediaLib/model/source/TrackType.h>

@@ -19,7 +19,8 @@ class SourceCommandTest : public ::testing::Test {
 protected:
     SourceCommandTest() {
         for (const char* path : {"a.mov", "b.mov", "c.mov"})
-            loader->set(path, {stream(TrackType::Video, 0, 3000, 600), stream(TrackType::Audio, 0, 48000, 48000, 2)});
+            loader->set(
+                path, {stream(TrackType::Video, 0, 3000, 600), stream(TrackType::Audio, 0, 48000, 48000, 2)});
         project->sourceBin()->setFileSystem(files);
         project->timeline()->addTrack(project->newMixer("main"), track);
     }
@@ -106,7 +107,8 @@ TEST_F(SourceCommandTest, OfflineSourcesComeBackWhenTheirFileMatches) {
     files->present.insert("a.mov");
     loader->set("a.mov", {stream(TrackType::Video, 0, 600, 600)});
     EXPECT_FALSE(project->bringSourceOnline(a)); // it lost its sound
-    loader->set("a.mov", {stream(TrackType::Video, 0, 1200, 600), stream(TrackType::Audio, 0, 4800, 48000, 2)});
+    loader->set("a.mov",
+                {stream(TrackType::Video, 0, 1200, 600), stream(TrackType::Audio, 0, 4800, 48000, 2)});
     EXPECT_TRUE(project->bringSourceOnline(a));
     EXPECT_EQ(a->offlineStatus(), OfflineStatus::Online);
     EXPECT_EQ(a->timeRangeForTrack(0), Range<VelaTime>(0, 60));

@@ -9,6 +9,7 @@
 #include <VelaMediaLib/model/project/SourceBin.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/parameters/SymbolTable.h>
 
 namespace VelaMediaLib {
 namespace testing {
@@ -18,8 +19,8 @@ class SourceTest : public ModelTest {
 protected:
     SourceTest() {
         // 10 s of video at 600 ticks a second from 0.5 s on, and 2 s of stereo audio at 48 kHz.
-        loader->set("movie.mov", {stream(TrackType::Video, 300, 6000, 600),
-                                  stream(TrackType::Audio, 0, 96000, 48000, 2)});
+        loader->set("movie.mov",
+                    {stream(TrackType::Video, 300, 6000, 600), stream(TrackType::Audio, 0, 96000, 48000, 2)});
         loader->set("still.png", {stream(TrackType::Image, 0, 1, 1)});
         loader->set("voice.wav", {stream(TrackType::Audio, 0, 48000, 48000, 1)});
         bin->setFileSystem(files);
@@ -82,7 +83,8 @@ TEST_F(SourceTest, StreamsAreMeasuredInTheProjectsTicksExactly) {
     EXPECT_EQ(movie->timeRange(), Range<VelaTime>(0, 315));
     loader->set("odd.wav", {stream(TrackType::Audio, 1, 1000, 48000, 1)});
     const SourcePtr odd = load("odd.wav"); // 1000 samples: 0.625 ticks from 1/1600
-    EXPECT_EQ(odd->rationalTimeRangeForTrack(0), Range<SafeRational>(SafeRational(1, 1600), SafeRational(5, 8)));
+    EXPECT_EQ(odd->rationalTimeRangeForTrack(0),
+              Range<SafeRational>(SafeRational(1, 1600), SafeRational(5, 8)));
     EXPECT_EQ(odd->timeRangeForTrack(0), Range<VelaTime>(0, 1));
     EXPECT_EQ(movie->trackRect(0), Rect<int>(0, 0, 640, 480));
     EXPECT_THROW(movie->timeRangeForTrack(2), IndexException);
@@ -103,8 +105,10 @@ TEST_F(SourceTest, AVideoClipIsLimitedByItsStreamsRange) {
     const auto slice = VMFile::create(movie, 0, 0, SafeRational(20), SafeRational(10), SafeRational(2));
     EXPECT_EQ(slice->trackRange(), Range<VelaTime>(0, 20));
     EXPECT_EQ(slice->trimEndLimit(), -570); // 285 ticks of media left, at half speed
-    EXPECT_THROW(VMFile::create(movie, 0, 0, SafeRational(10), SafeRational(10)), ValueException<const SafeRational>);
-    EXPECT_THROW(VMFile::create(movie, 0, 0, SafeRational(310), SafeRational(10)), ValueException<const SafeRational>);
+    EXPECT_THROW(VMFile::create(movie, 0, 0, SafeRational(10), SafeRational(10)),
+                 ValueException<const SafeRational>);
+    EXPECT_THROW(VMFile::create(movie, 0, 0, SafeRational(310), SafeRational(10)),
+                 ValueException<const SafeRational>);
     EXPECT_THROW(VMFile::create(movie, 1, 0), TypeException);
     EXPECT_THROW(VMFile::create(movie, 2, 0), IndexException);
     EXPECT_THROW(VMFile::create(SourcePtr(), 0, 0), VelaMediaLibException);
@@ -166,7 +170,8 @@ TEST_F(SourceTest, ClipsHoldTheirSourceButTheSourcesOwnClipsDoNot) {
 TEST_F(SourceTest, AnotherFileMustMatchTheStreams) {
     const SourcePtr movie = load("movie.mov");
     const auto clip = VMFile::create(movie, 0, 0, SafeRational(200), SafeRational(100));
-    loader->set("short.mov", {stream(TrackType::Video, 0, 1200, 600), stream(TrackType::Audio, 0, 4800, 48000, 2)});
+    loader->set("short.mov",
+                {stream(TrackType::Video, 0, 1200, 600), stream(TrackType::Audio, 0, 4800, 48000, 2)});
     loader->set("mute.mov", {stream(TrackType::Video, 0, 6000, 600)});
     EXPECT_THROW(bin->changeSourcesFile(movie, "mute.mov"), VelaMediaLibException);
     EXPECT_EQ(movie->filename(), "movie.mov");

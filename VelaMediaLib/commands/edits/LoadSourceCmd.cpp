@@ -1,6 +1,6 @@
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 
-#include <VelaMediaLib/commands/edits/SourceCommandSupport.h>
+#include <VelaMediaLib/commands/edits/detail/SourceCommandSupport.h>
 #include <VelaMediaLib/model/source/Source.h>
 
 namespace VelaMediaLib {

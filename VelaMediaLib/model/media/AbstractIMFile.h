@@ -14,7 +14,8 @@ public:
     /// The state of a still shown from start for duration ticks. Throws as
     /// FileMedia::stateFor does, and ValueException<const SafeRational>
     /// "invalid duration after media stretch (<=0)" for a duration of 0 or less.
-    static MediaState stillState(const SourceLink& link, StreamFilter plays, VelaTime start, VelaTime duration);
+    static MediaState stillState(const SourceLink& link, StreamFilter plays, VelaTime start,
+                                 VelaTime duration);
 
 protected:
     AbstractIMFile(const SourceLink& link, const MediaState& initial)

@@ -29,7 +29,9 @@ boost::shared_ptr<const Source> FileMedia::source() const {
     return weak_.lock();
 }
 
-void FileMedia::setSource(const boost::shared_ptr<const Source>& source) { boost::atomic_store(&strong_, source); }
+void FileMedia::setSource(const boost::shared_ptr<const Source>& source) {
+    boost::atomic_store(&strong_, source);
+}
 
 namespace {
 
@@ -70,20 +72,21 @@ MediaState FileMedia::stateFor(const SourceLink& link, StreamFilter plays, VelaT
     state.mediaStart = mediaStart;
     state.mediaDuration = mediaDuration;
     state.scalar = scalar;
-    state.duration = scalar > SafeRational(0) ? RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar))
-                                              : VelaTime(0);
+    state.duration = scalar > SafeRational(0)
+                         ? RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar))
+                         : VelaTime(0);
     if (state.duration <= 0)
         throw ValueException<const SafeRational>("invalid duration after media stretch (<=0)", scalar);
     return state;
 }
 
-MediaState FileMedia::wholeStreamState(const SourceLink& link, StreamFilter plays,
-                                       VelaTime start) {
+MediaState FileMedia::wholeStreamState(const SourceLink& link, StreamFilter plays, VelaTime start) {
     const Range<SafeRational> range = checkedSource(link, plays).rationalTimeRangeForTrack(link.stream);
     const SafeRational length = range.second();
     // A stream shorter than half a tick still gets a tick, played slower.
     const SafeRational ticks = std::max(RationalUtil::Round(length), SafeRational(1));
-    return stateFor(link, plays, start, range.first(), length, length > SafeRational(0) ? ticks / length : ticks);
+    return stateFor(link, plays, start, range.first(), length,
+                    length > SafeRational(0) ? ticks / length : ticks);
 }
 
 MediaState FileMedia::withStreamLimits(MediaState state, const Source& source, int stream) {

@@ -57,8 +57,7 @@ public:
     /// (the exceptions of stateFor).
     static void checkStream(const SourceLink& link, StreamFilter plays);
     /// The state of a clip that plays the whole stream at normal speed.
-    static MediaState wholeStreamState(const SourceLink& link, StreamFilter plays,
-                                       VelaTime start);
+    static MediaState wholeStreamState(const SourceLink& link, StreamFilter plays, VelaTime start);
     /// A state with the limits of the stream, widened where the clip plays
     /// beyond them (a shorter file taking a source's place loses no clip).
     static MediaState withStreamLimits(MediaState state, const Source& source, int stream);
@@ -70,7 +69,8 @@ public:
 protected:
     /// Gives the clip the limits of its source's stream (after a change of source).
     void takeStreamLimits(Media& clip) const;
-    explicit FileMedia(const SourceLink& link) : strong_(link.strong), weak_(link.weak), stream_(link.stream) {}
+    explicit FileMedia(const SourceLink& link)
+        : strong_(link.strong), weak_(link.weak), stream_(link.stream) {}
     /// A link like this clip's, holding the source strongly (for clones).
     SourceLink cloneLink() const { return SourceLink::holding(source(), stream_); }
 

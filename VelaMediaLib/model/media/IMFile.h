@@ -12,7 +12,9 @@ public:
     static boost::shared_ptr<IMFile> create(const boost::shared_ptr<const Source>& source, int stream,
                                             VelaTime start, VelaTime duration);
     static boost::shared_ptr<IMFile> create(const SourceLink& link, const MediaState& state);
-    static bool playsStream(TrackType type) { return type == TrackType::Image || type == TrackType::ScreenImage; }
+    static bool playsStream(TrackType type) {
+        return type == TrackType::Image || type == TrackType::ScreenImage;
+    }
 
     boost::shared_ptr<Media> clone() const override;
     void dispatch(MediaDispatcher& dispatcher) override;

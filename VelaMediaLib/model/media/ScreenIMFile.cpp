@@ -8,8 +8,8 @@ boost::shared_ptr<ScreenIMFile> ScreenIMFile::create(const SourceLink& link, con
     return boost::shared_ptr<ScreenIMFile>(new ScreenIMFile(link, state));
 }
 
-boost::shared_ptr<ScreenIMFile> ScreenIMFile::create(const boost::shared_ptr<const Source>& source, int stream,
-                                                     VelaTime start, VelaTime duration) {
+boost::shared_ptr<ScreenIMFile> ScreenIMFile::create(const boost::shared_ptr<const Source>& source,
+                                                     int stream, VelaTime start, VelaTime duration) {
     const SourceLink link = SourceLink::holding(source, stream);
     return create(link, stillState(link, playsStream, start, duration));
 }
@@ -22,6 +22,8 @@ boost::shared_ptr<Media> ScreenIMFile::clone() const {
 }
 
 void ScreenIMFile::dispatch(MediaDispatcher& dispatcher) { dispatcher.dispatchScreenIMFile(*this); }
-void ScreenIMFile::dispatch(ConstMediaDispatcher& dispatcher) const { dispatcher.dispatchScreenIMFile(*this); }
+void ScreenIMFile::dispatch(ConstMediaDispatcher& dispatcher) const {
+    dispatcher.dispatchScreenIMFile(*this);
+}
 
 } // namespace VelaMediaLib

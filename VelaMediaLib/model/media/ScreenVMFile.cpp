@@ -8,14 +8,15 @@ boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const SourceLink& link, con
     return boost::shared_ptr<ScreenVMFile>(new ScreenVMFile(link, state));
 }
 
-boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source, int stream,
-                                                     VelaTime start) {
+boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source,
+                                                     int stream, VelaTime start) {
     const SourceLink link = SourceLink::holding(source, stream);
     return create(link, wholeStreamState(link, playsStream, start));
 }
 
-boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source, int stream,
-                                                     VelaTime start, const SafeRational& mediaStart,
+boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source,
+                                                     int stream, VelaTime start,
+                                                     const SafeRational& mediaStart,
                                                      const SafeRational& mediaDuration,
                                                      const SafeRational& scalar) {
     const SourceLink link = SourceLink::holding(source, stream);
@@ -30,6 +31,8 @@ boost::shared_ptr<Media> ScreenVMFile::clone() const {
 }
 
 void ScreenVMFile::dispatch(MediaDispatcher& dispatcher) { dispatcher.dispatchScreenVMFile(*this); }
-void ScreenVMFile::dispatch(ConstMediaDispatcher& dispatcher) const { dispatcher.dispatchScreenVMFile(*this); }
+void ScreenVMFile::dispatch(ConstMediaDispatcher& dispatcher) const {
+    dispatcher.dispatchScreenVMFile(*this);
+}
 
 } // namespace VelaMediaLib

@@ -22,7 +22,9 @@ public:
     /// A clip of the link's stream with a state already checked (sources and documents).
     static boost::shared_ptr<VMFile> create(const SourceLink& link, const MediaState& state);
     /// The stream kinds a video clip plays.
-    static bool playsStream(TrackType type) { return type == TrackType::Video || type == TrackType::ScreenVideo; }
+    static bool playsStream(TrackType type) {
+        return type == TrackType::Video || type == TrackType::ScreenVideo;
+    }
 
     boost::shared_ptr<Media> clone() const override;
     void dispatch(MediaDispatcher& dispatcher) override;

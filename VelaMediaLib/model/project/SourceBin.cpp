@@ -5,20 +5,45 @@
 #include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 
 #include <algorithm>
-#include <boost/filesystem/path.hpp>
 
 namespace VelaMediaLib {
 
-SourceBin::SourceBin(const boost::weak_ptr<const ThreadSafe>& token, const boost::weak_ptr<ProjectEditRate>& rate)
+SourceBin::SourceBin(const boost::weak_ptr<const ThreadSafe>& token,
+                     const boost::weak_ptr<ProjectEditRate>& rate)
     : ObjectSubject(token), MetaDatable(token), rate_(rate) {}
 
 SourceBin::~SourceBin() = default;
 
+namespace {
+
+/// The path without empty and "." segments, each ".." taking the segment
+/// before it (as text: links are not followed).
+std::string normalPath(const std::string& path) {
+    const bool absolute = !path.empty() && path[0] == '/';
+    std::vector<std::string> parts;
+    size_t begin = 0;
+    while (begin <= path.size()) {
+        const size_t end = std::min(path.find('/', begin), path.size());
+        const std::string part = path.substr(begin, end - begin);
+        if (part == ".." && !parts.empty() && parts.back() != "..") {
+            parts.pop_back();
+        } else if (!part.empty() && part != "." && !(part == ".." && absolute && parts.empty())) {
+            parts.push_back(part);
+        }
+        begin = end + 1;
+    }
+    std::string normal = absolute ? "/" : "";
+    for (size_t i = 0; i < parts.size(); ++i) normal += (i ? "/" : "") + parts[i];
+    return normal.empty() ? "." : normal;
+}
+
+} // namespace
+
 std::string SourceBin::keyOf(const std::string& path) {
     // Most paths are normal already; normalising costs more than the lookup.
-    const bool plain = path.find("//") == std::string::npos && path.find("/.") == std::string::npos &&
-                       path.compare(0, 2, "./") != 0 && (path.empty() || path.back() != '/');
-    return plain ? path : boost::filesystem::path(path).lexically_normal().string();
+    const bool plain = !path.empty() && path[0] != '.' && path.back() != '/' &&
+                       path.find("//") == std::string::npos && path.find("/.") == std::string::npos;
+    return plain ? path : normalPath(path);
 }
 
 SourceBin::Sources SourceBin::sources() const {
@@ -58,7 +83,8 @@ boost::shared_ptr<Source> SourceBin::loadFile(const std::string& path) { return 
 
 boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, int index) {
     if (const boost::shared_ptr<Source> loaded = sourceForFile(path)) return loaded;
-    if (index < -1 || index > static_cast<int>(numSources())) throw IndexException("source index out of range");
+    if (index < -1 || index > static_cast<int>(numSources()))
+        throw IndexException("source index out of range");
     boost::shared_ptr<FileSystem> fileSystem;
     {
         ScopedReadLock lock(projectLock());
@@ -79,7 +105,8 @@ boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, in
 }
 
 void SourceBin::checkInsertable(const Source& source, const std::string& key, int index) const {
-    if (index < -1 || index > static_cast<int>(sources_.size())) throw IndexException("source index out of range");
+    if (index < -1 || index > static_cast<int>(sources_.size()))
+        throw IndexException("source index out of range");
     if (sources_.size() >= sources_.max_size()) throw VelaMediaLibException("list too long");
     if (byPath_.count(key) || std::find_if(sources_.begin(), sources_.end(), [&](const auto& held) {
                                   return held.get() == &source;
@@ -89,7 +116,8 @@ void SourceBin::checkInsertable(const Source& source, const std::string& key, in
 
 void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index) {
     if (!source) throw AddRemoveException("no source to insert");
-    if (source->projectMutex().owner_before(projectMutex()) || projectMutex().owner_before(source->projectMutex()))
+    if (source->projectMutex().owner_before(projectMutex()) ||
+        projectMutex().owner_before(source->projectMutex()))
         throw AddRemoveException("the source belongs to another project");
     const std::string key = keyOf(source->filename());
     {

@@ -18,8 +18,9 @@ class ProjectEditRate;
 class Source;
 
 /// The project's imported sources, in the order they came, with an index by
-/// file path (paths are compared as written, after lexical normalisation:
-/// "a/./b" and "a/b" are one file). Reads take the project's read lock,
+/// file path. Paths are compared as text after removing empty and "."
+/// segments and folding ".." ("a/./b", "a//b" and "c/../a/b" are one file);
+/// links are not followed and case counts. Reads take the project's read lock,
 /// changes its write lock; files are read with no lock held. Observers
 /// attached to the bin (the project's source-bin sentries) hear of every
 /// source loaded, unloaded, renamed or given another file.

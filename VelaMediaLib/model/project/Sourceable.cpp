@@ -11,7 +11,8 @@ std::vector<boost::shared_ptr<const Source>> Sourceable::sourcesOf(const std::ve
     for (const MediaPtr& clip : clips)
         if (const auto sourceable = boost::dynamic_pointer_cast<Sourceable>(clip))
             if (const auto source = sourceable->source())
-                if (std::find(sources.begin(), sources.end(), source) == sources.end()) sources.push_back(source);
+                if (std::find(sources.begin(), sources.end(), source) == sources.end())
+                    sources.push_back(source);
     return sources;
 }
 

@@ -30,15 +30,18 @@ std::string utcNow() {
 /// Ticks of `from` as ticks of `to`, exactly.
 SafeRational convertTicks(long long ticks, const boost::rational<unsigned long>& from,
                           const boost::rational<unsigned long>& to) {
-    const SafeRational seconds = SafeRational(ticks) / SafeRational(static_cast<long long>(from.numerator()),
-                                                                    static_cast<long long>(from.denominator()));
-    return seconds * SafeRational(static_cast<long long>(to.numerator()), static_cast<long long>(to.denominator()));
+    const SafeRational seconds =
+        SafeRational(ticks) /
+        SafeRational(static_cast<long long>(from.numerator()), static_cast<long long>(from.denominator()));
+    return seconds *
+           SafeRational(static_cast<long long>(to.numerator()), static_cast<long long>(to.denominator()));
 }
 
 } // namespace
 
 Source::Source(const boost::weak_ptr<ProjectEditRate>& rate, const boost::weak_ptr<const ThreadSafe>& token,
-               const boost::shared_ptr<MediaFileStats>& stats, const boost::shared_ptr<FileSystem>& fileSystem)
+               const boost::shared_ptr<MediaFileStats>& stats,
+               const boost::shared_ptr<FileSystem>& fileSystem)
     : MetaDatable(token), Attributable(token), rateToken_(rate), stats_(stats),
       fileSystem_(fileSystem ? fileSystem : BoostFileSystem::instance()) {
     const boost::shared_ptr<ProjectEditRate> project = rate.lock();
@@ -49,7 +52,8 @@ Source::Source(const boost::weak_ptr<ProjectEditRate>& rate, const boost::weak_p
 Source::~Source() = default;
 
 boost::shared_ptr<Source> Source::create(const boost::weak_ptr<ProjectEditRate>& rate,
-                                         const boost::weak_ptr<const ThreadSafe>& token, const std::string& path,
+                                         const boost::weak_ptr<const ThreadSafe>& token,
+                                         const std::string& path,
                                          const boost::shared_ptr<FileSystem>& fileSystem) {
     return create(rate, token, MediaFileStats::create(path, token), fileSystem);
 }
@@ -84,7 +88,8 @@ MediaPtr Source::makeStreamMedia(int stream) const {
     const SourceLink link = SourceLink::ownedBy(shared_from_this(), stream);
     const Range<SafeRational> range = rationalTimeRangeForTrack(stream);
     if (range.second() <= SafeRational(0)) return MediaPtr(); // nothing to play
-    const VelaTime length = std::max(RationalUtil::toVelaTime(RationalUtil::Round(range.second())), VelaTime(1));
+    const VelaTime length =
+        std::max(RationalUtil::toVelaTime(RationalUtil::Round(range.second())), VelaTime(1));
     switch (stats()->trackType(stream)) {
     case TrackType::Video:
         return VMFile::create(link, FileMedia::wholeStreamState(link, VMFile::playsStream, 0));
@@ -117,7 +122,8 @@ OfflineStatus Source::offlineStatus() const {
     const std::string path = filename();
     if (!fileSystem_->exists(path)) return OfflineStatus::FileMissing;
     if (!fileSystem_->isReadable(path)) return OfflineStatus::FileUnreadable;
-    return MediaFileStats::isFileOpenable(path) ? OfflineStatus::Reconnectable : OfflineStatus::StatsUnavailable;
+    return MediaFileStats::isFileOpenable(path) ? OfflineStatus::Reconnectable
+                                                : OfflineStatus::StatsUnavailable;
 }
 
 boost::rational<unsigned long> Source::editRate() const {
@@ -195,7 +201,9 @@ void Source::refitStreamMedia() {
         const MediaPtr& media = streamMedia_[stream];
         if (!media || boost::dynamic_pointer_cast<AbstractIMFile>(media)) continue; // stills have no extent
         const SourceLink link = SourceLink::ownedBy(shared_from_this(), static_cast<int>(stream));
-        media->restoreState(FileMedia::wholeStreamState(link, [](TrackType) { return true; }, 0), 0);
+        media->restoreState(FileMedia::wholeStreamState(
+                                link, [](TrackType) { return true; }, 0),
+                            0);
     }
 }
 

@@ -15,7 +15,7 @@ namespace VelaMediaLib {
 /// it walks is fixed when the source is made, so an iterator stays valid as
 /// long as its source lives.
 template <typename Kind>
-class SourceMediaIterator {
+class VELAMEDIALIB_TEMPLATE_API SourceMediaIterator {
 public:
     typedef std::forward_iterator_tag iterator_category;
     typedef boost::shared_ptr<Kind> value_type;
