@@ -1,5 +1,10 @@
 // A tour of what VelaMediaLib answers, printed readably. It grows with the library.
+#include "HeaderStatsLoader.h"
+
 #include <VelaMediaLib/VelaMediaLib.h>
+
+#include <boost/filesystem.hpp>
+#include <boost/make_shared.hpp>
 
 #include <iomanip>
 #include <iostream>
@@ -196,6 +201,75 @@ void project() {
 
 } // namespace
 
+const char* typeName(TrackType type) {
+    switch (type) {
+    case TrackType::Video: return "video";
+    case TrackType::Audio: return "audio";
+    case TrackType::Image: return "image";
+    case TrackType::ScreenVideo: return "screen video";
+    case TrackType::ScreenImage: return "screen image";
+    case TrackType::Unknown: break;
+    }
+    return "unknown";
+}
+
+void printSources(const char* step, const Project& project) {
+    std::cout << "  " << step << ":";
+    for (const SourcePtr& source : project.sourceBin()->sources())
+        std::cout << " " << boost::filesystem::path(source->filename()).filename().string();
+    std::cout << " (" << project.sourceBin()->numSources() << " in the bin)\n";
+}
+
+/// Files written by the demo itself, imported through the example loader.
+void sources() {
+    std::cout << "\nImporting files: the host's stats loader reads WAV and PNG headers\n";
+    namespace fs = boost::filesystem;
+    const fs::path folder = fs::temp_directory_path() / fs::unique_path("vela-demo-%%%%%%%%");
+    fs::create_directories(folder);
+    const std::string voice = (folder / "voice.wav").string(), logo = (folder / "logo.png").string();
+    VelaExamples::writeTestWav(voice, 48000, 2, 1.5);
+    VelaExamples::writeTestPng(logo, 320, 200);
+    const auto loader = boost::make_shared<VelaExamples::HeaderStatsLoader>();
+    MediaFileStats::addStatsLoader(loader, 1);
+
+    const ProjectPtr project = Project::create(30, 1);
+    const auto track = project->timeline()->newTrack();
+    project->timeline()->addTrack(project->newMixer("main"), track);
+    for (const std::string& path : {voice, logo, voice}) project->execute(LoadSourceCmd::create(path));
+    printSources("voice, logo and voice again imported", *project);
+    for (const SourcePtr& source : project->sourceBin()->sources()) {
+        const auto stats = source->stats();
+        std::cout << "    " << fs::path(source->filename()).filename().string() << ": "
+                  << typeName(stats->trackType(0)) << " stream, " << text(stats->sampleRate(0))
+                  << " per second, " << stats->numChannels(0) << " channels, " << stats->trackRect(0).width
+                  << "x" << stats->trackRect(0).height << ", ticks " << source->timeRangeForTrack(0) << "\n";
+    }
+    const SourcePtr sound = project->sourceBin()->sourceForFile(voice);
+    const SourcePtr picture = project->sourceBin()->sourceForFile(logo);
+    project->execute(AddMediaCmd::create(track, AMFile::create(sound, 0, 0), 0));
+    project->execute(AddMediaCmd::create(track, IMFile::create(picture, 0, 0, 60), 45));
+    for (const MediaPtr& clip : track->medias()) printClip(MediaTypeFromMediaDispatcher::typeOf(*clip).c_str(), *clip);
+    try {
+        project->unloadSource(sound);
+    } catch (const VelaMediaLibException& refused) {
+        std::cout << "  unloading voice.wav: " << refused.what() << "\n";
+    }
+
+    fs::remove(logo);
+    project->dropSourceOffline(picture);
+    std::cout << "  logo.png deleted: offline status " << static_cast<int>(picture->offlineStatus())
+              << " (1: the file is gone)\n";
+    for (int step = 0; step < 4; ++step) project->undo(); // the two clips, then the two imports
+    printSources("undo four times", *project);
+    project->redo();
+    printSources("redo: the same voice source back", *project);
+    std::cout << "  the bin's voice is the one the clips played: " << std::boolalpha
+              << (project->sourceBin()->sourceForFile(voice) == sound) << "\n";
+
+    MediaFileStats::removeStatsLoader(loader);
+    fs::remove_all(folder);
+}
+
 int main() {
     std::cout << "VelaMediaLib: exact time at work\n\n";
     frameRates();
@@ -205,5 +279,6 @@ int main() {
     parameters();
     clips();
     project();
+    sources();
     return 0;
 }

@@ -39,12 +39,12 @@ std::string normalPath(const std::string& path) {
 
 } // namespace
 
-std::string SourceBin::keyOf(const std::string& path) {
-    // Most paths are normal already; normalising costs more than the lookup.
-    const bool plain = !path.empty() && path[0] != '.' && path.back() != '/' &&
-                       path.find("//") == std::string::npos && path.find("/.") == std::string::npos;
-    return plain ? path : normalPath(path);
+bool SourceBin::isNormal(const std::string& path) {
+    return !path.empty() && path[0] != '.' && path.back() != '/' && path.find("//") == std::string::npos &&
+           path.find("/.") == std::string::npos;
 }
+
+std::string SourceBin::keyOf(const std::string& path) { return isNormal(path) ? path : normalPath(path); }
 
 SourceBin::Sources SourceBin::sources() const {
     ScopedReadLock lock(projectLock());
@@ -69,9 +69,10 @@ bool SourceBin::containsSource(const boost::shared_ptr<const Source>& source) co
 bool SourceBin::isFileLoaded(const std::string& path) const { return bool(sourceForFile(path)); }
 
 boost::shared_ptr<Source> SourceBin::sourceForFile(const std::string& path) const {
-    const std::string key = keyOf(path);
+    if (!isNormal(path)) return sourceForFile(normalPath(path));
+    // Most paths are normal already: they are looked up as they are, uncopied.
     ScopedReadLock lock(projectLock());
-    return lockedSourceForKey(key);
+    return lockedSourceForKey(path);
 }
 
 boost::shared_ptr<Source> SourceBin::lockedSourceForKey(const std::string& key) const {

@@ -75,6 +75,8 @@ public:
     void setFileSystem(const boost::shared_ptr<FileSystem>& fileSystem);
 
 private:
+    /// Whether normalising would leave the path as it is (the usual case).
+    static bool isNormal(const std::string& path);
     static std::string keyOf(const std::string& path);
     void checkInsertable(const Source& source, const std::string& key, int index) const;
     void checkHeld(const boost::shared_ptr<const Source>& source) const;
