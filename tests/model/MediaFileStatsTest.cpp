@@ -115,6 +115,7 @@ TEST_F(MediaFileStatsTest, PriorityPutsALoaderFirstAndZeroLastAndAddingAgainMove
     EXPECT_TRUE(MediaFileStats::removeStatsLoader(c));
     EXPECT_FALSE(MediaFileStats::removeStatsLoader(c));
     EXPECT_EQ(ours(), (std::vector<boost::shared_ptr<StatsLoader>>{b, a}));
+    EXPECT_THROW(MediaFileStats::addStatsLoader(nullptr), VelaMediaLibException);
 }
 
 TEST_F(MediaFileStatsTest, TheFirstLoaderThatAnswersFillsAFreshRecordNamedAfterThePath) {
