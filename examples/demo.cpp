@@ -203,12 +203,18 @@ void project() {
 
 const char* typeName(TrackType type) {
     switch (type) {
-    case TrackType::Video: return "video";
-    case TrackType::Audio: return "audio";
-    case TrackType::Image: return "image";
-    case TrackType::ScreenVideo: return "screen video";
-    case TrackType::ScreenImage: return "screen image";
-    case TrackType::Unknown: break;
+    case TrackType::Video:
+        return "video";
+    case TrackType::Audio:
+        return "audio";
+    case TrackType::Image:
+        return "image";
+    case TrackType::ScreenVideo:
+        return "screen video";
+    case TrackType::ScreenImage:
+        return "screen image";
+    case TrackType::Unknown:
+        break;
     }
     return "unknown";
 }
@@ -239,16 +245,22 @@ void sources() {
     printSources("voice, logo and voice again imported", *project);
     for (const SourcePtr& source : project->sourceBin()->sources()) {
         const auto stats = source->stats();
+        const Range<VelaTime> ticks = source->timeRangeForTrack(0);
         std::cout << "    " << fs::path(source->filename()).filename().string() << ": "
-                  << typeName(stats->trackType(0)) << " stream, " << text(stats->sampleRate(0))
-                  << " per second, " << stats->numChannels(0) << " channels, " << stats->trackRect(0).width
-                  << "x" << stats->trackRect(0).height << ", ticks " << source->timeRangeForTrack(0) << "\n";
+                  << typeName(stats->trackType(0)) << " stream, ";
+        if (stats->trackType(0) == TrackType::Audio)
+            std::cout << stats->numChannels(0) << " channels at "
+                      << RationalUtil::toVelaTime(stats->sampleRate(0)) << " Hz";
+        else
+            std::cout << stats->trackRect(0).width << "x" << stats->trackRect(0).height << " pixels";
+        std::cout << ", " << ticks.duration() << " ticks of the project\n";
     }
     const SourcePtr sound = project->sourceBin()->sourceForFile(voice);
     const SourcePtr picture = project->sourceBin()->sourceForFile(logo);
     project->execute(AddMediaCmd::create(track, AMFile::create(sound, 0, 0), 0));
     project->execute(AddMediaCmd::create(track, IMFile::create(picture, 0, 0, 60), 45));
-    for (const MediaPtr& clip : track->medias()) printClip(MediaTypeFromMediaDispatcher::typeOf(*clip).c_str(), *clip);
+    for (const MediaPtr& clip : track->medias())
+        printClip(MediaTypeFromMediaDispatcher::typeOf(*clip).c_str(), *clip);
     try {
         project->unloadSource(sound);
     } catch (const VelaMediaLibException& refused) {
