@@ -117,7 +117,8 @@ void BM_SourceForFile_VsBareMap(benchmark::State& state) {
             }
         },
         [&](size_t first, size_t count) {
-            for (size_t i = 0; i < count; ++i) found += bool(bin->sourceForFile(queries[(first + i) % kSources]));
+            for (size_t i = 0; i < count; ++i)
+                found += bool(bin->sourceForFile(queries[(first + i) % kSources]));
         });
     benchmark::DoNotOptimize(found);
 }

@@ -70,7 +70,9 @@ public:
     bool removeClipping(const MixerPtr& clipping) override { return clipBoard_->removeClipping(clipping); }
 
     // Sources
-    boost::shared_ptr<Source> loadSource(const std::string& path) override { return loadSourceAtIndex(path, -1); }
+    boost::shared_ptr<Source> loadSource(const std::string& path) override {
+        return loadSourceAtIndex(path, -1);
+    }
     boost::shared_ptr<Source> loadSourceAtIndex(const std::string& path, int index) override {
         return sourceBin_->loadFileAtIndex(path, index);
     }
