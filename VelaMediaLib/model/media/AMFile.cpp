@@ -18,15 +18,13 @@ boost::shared_ptr<AMFile> AMFile::create(const SourceLink& link, const MediaStat
 
 boost::shared_ptr<AMFile> AMFile::create(const boost::shared_ptr<const Source>& source, int stream,
                                          VelaTime start) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, wholeStreamState(link, playsStream, start));
+    return createWhole<AMFile>(source, stream, start);
 }
 
 boost::shared_ptr<AMFile> AMFile::create(const boost::shared_ptr<const Source>& source, int stream,
                                          VelaTime start, const SafeRational& mediaStart,
                                          const SafeRational& mediaDuration, const SafeRational& scalar) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, stateFor(link, playsStream, start, mediaStart, mediaDuration, scalar));
+    return createSlice<AMFile>(source, stream, start, mediaStart, mediaDuration, scalar);
 }
 
 void AMFile::setChannelNumber(int channel) {

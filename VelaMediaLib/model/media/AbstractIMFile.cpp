@@ -8,11 +8,7 @@ MediaState AbstractIMFile::stillState(const SourceLink& link, StreamFilter plays
     if (duration <= 0)
         throw ValueException<const SafeRational>("invalid duration after media stretch (<=0)",
                                                  SafeRational(duration));
-    MediaState state;
-    state.start = start;
-    state.duration = duration;
-    state.mediaDuration = SafeRational(duration);
-    return state;
+    return MediaState::unbounded(start, duration);
 }
 
 } // namespace VelaMediaLib

@@ -18,6 +18,13 @@ public:
                                  VelaTime duration);
 
 protected:
+    /// A still of the kind (the kinds' create functions).
+    template <typename Kind>
+    static boost::shared_ptr<Kind> createStill(const boost::shared_ptr<const Source>& source, int stream,
+                                               VelaTime start, VelaTime duration) {
+        const SourceLink link = SourceLink::holding(source, stream);
+        return Kind::create(link, stillState(link, Kind::playsStream, start, duration));
+    }
     AbstractIMFile(const SourceLink& link, const MediaState& initial)
         : Media(tokenOf(link)), VisualMedia(tokenOf(link)),
           VisualMediaImpl(tokenOf(link), rateOf(link), initial, Static), FileMedia(link) {}

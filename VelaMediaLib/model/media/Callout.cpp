@@ -8,10 +8,7 @@ namespace VelaMediaLib {
 boost::shared_ptr<Callout> Callout::create(const boost::weak_ptr<const ThreadSafe>& token,
                                            const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
                                            VelaTime duration, const TextAttributeList& text) {
-    MediaState state;
-    state.start = start;
-    state.duration = duration;
-    state.mediaDuration = SafeRational(duration);
+    const MediaState state = MediaState::unbounded(start, duration);
     const boost::shared_ptr<Callout> media(new Callout(token, rate, state));
     media->addAttribute("autoRotateText", false);
     if (text != TextAttributeList()) media->setText(text);

@@ -12,10 +12,7 @@ constexpr long long Caption::kNoMaxMediaDuration;
 boost::shared_ptr<Caption> Caption::create(const boost::weak_ptr<const ThreadSafe>& token,
                                            const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
                                            VelaTime duration, const CaptionData& caption) {
-    MediaState state;
-    state.start = start;
-    state.duration = duration;
-    state.mediaDuration = SafeRational(duration);
+    const MediaState state = MediaState::unbounded(start, duration);
     const boost::shared_ptr<Caption> media(new Caption(token, rate, state));
     if (caption != CaptionData()) media->setCaption(caption);
     return media;

@@ -7,10 +7,7 @@ namespace VelaMediaLib {
 boost::shared_ptr<ColorMedia> ColorMedia::create(const boost::weak_ptr<const ThreadSafe>& token,
                                                  const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
                                                  VelaTime duration, const TemplatedColor<int>& color) {
-    MediaState state;
-    state.start = start;
-    state.duration = duration;
-    state.mediaDuration = SafeRational(duration);
+    const MediaState state = MediaState::unbounded(start, duration);
     const boost::shared_ptr<ColorMedia> media(new ColorMedia(token, rate, state));
     media->addAttribute("color", color);
     return media;

@@ -67,6 +67,23 @@ public:
     static boost::weak_ptr<ProjectEditRate> rateOf(const SourceLink& link);
 
 protected:
+    /// A clip of the kind playing the whole stream, or a slice of it (the
+    /// kinds' create functions).
+    template <typename Kind>
+    static boost::shared_ptr<Kind> createWhole(const boost::shared_ptr<const Source>& source, int stream,
+                                               VelaTime start) {
+        const SourceLink link = SourceLink::holding(source, stream);
+        return Kind::create(link, wholeStreamState(link, Kind::playsStream, start));
+    }
+    template <typename Kind>
+    static boost::shared_ptr<Kind> createSlice(const boost::shared_ptr<const Source>& source, int stream,
+                                               VelaTime start, const SafeRational& mediaStart,
+                                               const SafeRational& mediaDuration,
+                                               const SafeRational& scalar) {
+        const SourceLink link = SourceLink::holding(source, stream);
+        return Kind::create(link,
+                            stateFor(link, Kind::playsStream, start, mediaStart, mediaDuration, scalar));
+    }
     /// Gives the clip the limits of its source's stream (after a change of source).
     void takeStreamLimits(Media& clip) const;
     explicit FileMedia(const SourceLink& link)

@@ -10,8 +10,7 @@ boost::shared_ptr<IMFile> IMFile::create(const SourceLink& link, const MediaStat
 
 boost::shared_ptr<IMFile> IMFile::create(const boost::shared_ptr<const Source>& source, int stream,
                                          VelaTime start, VelaTime duration) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, stillState(link, playsStream, start, duration));
+    return createStill<IMFile>(source, stream, start, duration);
 }
 
 boost::shared_ptr<Media> IMFile::clone() const {

@@ -26,6 +26,16 @@ struct VELAMEDIALIB_API MediaState {
     bool hasStartOffset = false;
     RationalTime startOffset;
 
+    /// The state of a clip without media extent (generated content, stills)
+    /// on its track from start for duration ticks, without limits.
+    static MediaState unbounded(VelaTime start, VelaTime duration) {
+        MediaState state;
+        state.start = start;
+        state.duration = duration;
+        state.mediaDuration = SafeRational(duration);
+        return state;
+    }
+
     static SafeRational unboundedStart() { return SafeRational(std::numeric_limits<long long>::min()); }
     static SafeRational unboundedEnd() { return SafeRational(std::numeric_limits<long long>::max()); }
 

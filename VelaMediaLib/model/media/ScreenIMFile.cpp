@@ -10,8 +10,7 @@ boost::shared_ptr<ScreenIMFile> ScreenIMFile::create(const SourceLink& link, con
 
 boost::shared_ptr<ScreenIMFile> ScreenIMFile::create(const boost::shared_ptr<const Source>& source,
                                                      int stream, VelaTime start, VelaTime duration) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, stillState(link, playsStream, start, duration));
+    return createStill<ScreenIMFile>(source, stream, start, duration);
 }
 
 boost::shared_ptr<Media> ScreenIMFile::clone() const {

@@ -14,15 +14,13 @@ boost::shared_ptr<VMFile> VMFile::create(const SourceLink& link, const MediaStat
 
 boost::shared_ptr<VMFile> VMFile::create(const boost::shared_ptr<const Source>& source, int stream,
                                          VelaTime start) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, wholeStreamState(link, playsStream, start));
+    return createWhole<VMFile>(source, stream, start);
 }
 
 boost::shared_ptr<VMFile> VMFile::create(const boost::shared_ptr<const Source>& source, int stream,
                                          VelaTime start, const SafeRational& mediaStart,
                                          const SafeRational& mediaDuration, const SafeRational& scalar) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, stateFor(link, playsStream, start, mediaStart, mediaDuration, scalar));
+    return createSlice<VMFile>(source, stream, start, mediaStart, mediaDuration, scalar);
 }
 
 boost::shared_ptr<Media> VMFile::clone() const {
