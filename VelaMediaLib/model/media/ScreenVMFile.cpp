@@ -10,8 +10,7 @@ boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const SourceLink& link, con
 
 boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source,
                                                      int stream, VelaTime start) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, wholeStreamState(link, playsStream, start));
+    return createWhole<ScreenVMFile>(source, stream, start);
 }
 
 boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<const Source>& source,
@@ -19,8 +18,7 @@ boost::shared_ptr<ScreenVMFile> ScreenVMFile::create(const boost::shared_ptr<con
                                                      const SafeRational& mediaStart,
                                                      const SafeRational& mediaDuration,
                                                      const SafeRational& scalar) {
-    const SourceLink link = SourceLink::holding(source, stream);
-    return create(link, stateFor(link, playsStream, start, mediaStart, mediaDuration, scalar));
+    return createSlice<ScreenVMFile>(source, stream, start, mediaStart, mediaDuration, scalar);
 }
 
 boost::shared_ptr<Media> ScreenVMFile::clone() const {
