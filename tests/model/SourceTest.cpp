@@ -5,6 +5,8 @@
 #include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
+#include <VelaMediaLib/model/media/ScreenIMFile.h>
+#include <VelaMediaLib/model/media/ScreenVMFile.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/project/SourceBin.h>
 #include <VelaMediaLib/model/source/Source.h>
@@ -130,6 +132,28 @@ TEST_F(SourceTest, AudioAndStillClipsOfTheirStreams) {
     EXPECT_THROW(IMFile::create(load("still.png"), 0, 0, 0), ValueException<const SafeRational>);
     EXPECT_EQ(MediaTypeFromMediaDispatcher::typeOf(*still), "IMFile");
     EXPECT_EQ(MediaTypeFromMediaDispatcher::typeOf(*sound), "AMFile");
+}
+
+TEST_F(SourceTest, ScreenRecordingsPlayThroughTheScreenKindsWithTheirData) {
+    loader->set("session.trec",
+                {stream(TrackType::ScreenVideo, 0, 600, 600), stream(TrackType::ScreenImage, 0, 1, 1)});
+    const SourcePtr session = load("session.trec");
+    EXPECT_TRUE(boost::dynamic_pointer_cast<ScreenVMFile>(session->mediaForTrackNumber(0)));
+    EXPECT_TRUE(boost::dynamic_pointer_cast<ScreenIMFile>(session->mediaForTrackNumber(1)));
+    EXPECT_NO_THROW(VMFile::create(session, 0, 0)); // a plain video clip may play it too
+    EXPECT_THROW(ScreenVMFile::create(load("movie.mov"), 0, 0), TypeException);
+
+    const auto clip = ScreenVMFile::create(session, 0, 0, SafeRational(5), SafeRational(10));
+    const auto data = boost::make_shared<ScreenRecordingData>(Rect<int>(0, 0, 1920, 1080));
+    data->addClick(RationalTime(7), ScreenClick::Left);
+    clip->setScreenData(data);
+    const auto copy = boost::dynamic_pointer_cast<ScreenVMFile>(clip->clone());
+    EXPECT_EQ(copy->screenData(), clip->screenData());
+    EXPECT_EQ(copy->rationalMediaRange(), clip->rationalMediaRange());
+    EXPECT_EQ(copy->clicksInRange(Range<RationalTime>(RationalTime(0), RationalTime(30))).size(), 1u);
+    EXPECT_EQ(MediaTypeFromMediaDispatcher::typeOf(*copy), "ScreenVMFile");
+    const auto still = ScreenIMFile::create(session, 1, 0, 90);
+    EXPECT_EQ(boost::dynamic_pointer_cast<ScreenIMFile>(still->clone())->source(), session);
 }
 
 TEST_F(SourceTest, ASourcePlaysEachStreamThroughAClipOfItsOwn) {
