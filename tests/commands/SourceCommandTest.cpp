@@ -4,6 +4,7 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
+#include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/time/sync/LambdaObserverWithoutNotifyDelay.h>
@@ -123,6 +124,96 @@ TEST_F(SourceCommandTest, TheEditRateReachesEverySource) {
     EXPECT_EQ(a->editRate(), boost::rational<unsigned long>(60));
     EXPECT_EQ(a->mediaForTrackNumber(0)->duration(), 300);
     EXPECT_EQ(a->mediaForTrackNumber(1)->maxRationalMediaEnd(), SafeRational(60));
+}
+
+/// Names its records by another path, as loaders of real files may.
+class RenamingLoader : public StatsLoader {
+    bool loadStats(const std::string& path, MediaFileStats& stats) override {
+        if (path != "rel.mov") return false;
+        stats.addTrackStats(stream(TrackType::Video, 0, 600, 600));
+        stats.setFilename("/abs/rel.mov");
+        return true;
+    }
+};
+
+TEST_F(SourceCommandTest, PathsAreKeptAsTheHostGaveThem) {
+    const auto bin = project->sourceBin();
+    for (const char* odd : {"/home/me/.cache/take.mov", "../take.mov", "", ".", "a/.."})
+        EXPECT_FALSE(bin->isFileLoaded(odd)) << odd;
+    const SourcePtr a = load("a.mov");
+    EXPECT_EQ(bin->sourceForFile("x/../a.mov"), a);
+    EXPECT_EQ(bin->sourceForFile("./x//../a.mov"), a);
+
+    const auto renaming = boost::make_shared<RenamingLoader>();
+    MediaFileStats::addStatsLoader(renaming, 1);
+    const SourcePtr rel = load("rel.mov");
+    MediaFileStats::removeStatsLoader(renaming);
+    EXPECT_EQ(rel->filename(), "rel.mov");
+    project->undo();
+    EXPECT_FALSE(bin->isFileLoaded("rel.mov"));
+    project->redo();
+    EXPECT_EQ(bin->sourceForFile("rel.mov"), rel);
+}
+
+TEST_F(SourceCommandTest, AFileThatCannotTakeTheSourcesPlaceChangesNothing) {
+    const SourcePtr a = project->loadSource("a.mov");
+    const MediaPtr clip = VMFile::create(a, 0, 0);
+    track->addMedia(clip, 0);
+    loader->set("hollow.mov",
+                {stream(TrackType::Video, 0, 1200, 600), stream(TrackType::Audio, 0, 0, 48000, 2)});
+    TrackStats noRate = stream(TrackType::Video, 0, 600, 600);
+    noRate.rangeEditRate = 0;
+    loader->set("norate.mov", {noRate, stream(TrackType::Audio, 0, 48000, 48000, 2)});
+    EXPECT_THROW(project->changeSourcesFile(a, "hollow.mov"), VelaMediaLibException);
+    EXPECT_THROW(project->changeSourcesFile(a, "norate.mov"), IOException);
+    EXPECT_THROW(project->loadSource("norate.mov"), IOException);
+    EXPECT_EQ(a->filename(), "a.mov");
+    EXPECT_EQ(a->mediaForTrackNumber(0)->duration(), 150);
+    EXPECT_EQ(project->sourceBin()->sourceForFile("a.mov"), a);
+
+    loader->set("longer.mov",
+                {stream(TrackType::Video, 0, 6000, 600), stream(TrackType::Audio, 0, 48000, 48000, 2)});
+    project->changeSourcesFile(a, "longer.mov");
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(300)); // the placed clip may reach the new end
+    EXPECT_FALSE(project->sourceBin()->isFileLoaded("a.mov"));
+}
+
+TEST_F(SourceCommandTest, ASwapToASourceWithoutTheStreamIsRefusedWhole) {
+    loader->set("mono.wav", {stream(TrackType::Audio, 0, 48000, 48000, 1)});
+    const SourcePtr a = project->loadSource("a.mov"), mono = project->loadSource("mono.wav");
+    const auto sound = AMFile::create(a, 1, 0);
+    const auto picture = VMFile::create(a, 0, 0);
+    track->addMedia(sound, 0);
+    track->addMedia(picture, 500);
+    EXPECT_THROW(project->timeline()->swapSourceForTimelineMedias(a, mono), IndexException);
+    EXPECT_EQ(sound->source(), a);
+    EXPECT_THROW(picture->setSource(mono), TypeException);
+    EXPECT_EQ(picture->source(), a);
+}
+
+TEST_F(SourceCommandTest, RateChangesReachSourcesInTheBinInTheHistoryAndOnTheTimeline) {
+    const SourcePtr a = project->loadSource("a.mov"), b = project->loadSource("b.mov");
+    const auto clip = VMFile::create(a, 0, 0);
+    track->addMedia(clip, 0);
+    ASSERT_TRUE(project->execute(UnloadSourceCmd::create(b)));
+    project->setEditRate(boost::rational<unsigned long>(60));
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(300));
+    project->undo(); // b comes back at the present rate
+    EXPECT_EQ(b->editRate(), boost::rational<unsigned long>(60));
+    EXPECT_EQ(b->mediaForTrackNumber(0)->duration(), 300);
+
+    EXPECT_THROW(project->setEditRate(boost::rational<unsigned long>(0)), VelaMediaLibException);
+    EXPECT_EQ(project->editRate(), boost::rational<unsigned long>(60));
+    EXPECT_EQ(a->editRate(), boost::rational<unsigned long>(60));
+    EXPECT_EQ(b->mediaForTrackNumber(0)->duration(), 300);
+}
+
+TEST_F(SourceCommandTest, RedoFindsItsPlaceAfterTheBinShrankOutsideTheHistory) {
+    const SourcePtr a = load("a.mov"), b = load("b.mov"), c = load("c.mov");
+    project->undo();          // c out
+    project->unloadSource(a); // directly, no step
+    project->redo();
+    EXPECT_EQ(sources(), (SourceBin::Sources{b, c}));
 }
 
 } // namespace

@@ -46,7 +46,9 @@ public:
     void detachEditRateObserver(Observer* observer) const override {
         editRate_.detachEditRateObserver(observer);
     }
-    /// Every source of the bin takes the rate too.
+    /// Every source of the bin takes the rate first, and the timeline's clips
+    /// their streams' new limits; refused whole (VelaMediaLibException) when a
+    /// source's stream would have no length at the rate.
     void setEditRate(const boost::rational<unsigned long>& rate) override;
 
     // Observation

@@ -8,11 +8,20 @@
 namespace VelaMediaLib {
 
 void InternalProject::setEditRate(const boost::rational<unsigned long>& rate) {
-    editRate_.setEditRate(rate);
-    for (const SourcePtr& source : sourceBin_->sources()) source->setEditRate(editRate());
+    const SourceBin::Sources sources = sourceBin_->sources();
+    {
+        // Every source must be able to take the rate before any does.
+        ScopedWriteLock lock(token());
+        std::vector<Source::Refit> refits;
+        for (const SourcePtr& source : sources) refits.push_back(source->refitFor(source->stats(), rate));
+        for (size_t i = 0; i < sources.size(); ++i) sources[i]->take(refits[i]);
+    }
+    editRate_.setEditRate(rate); // then the project, telling its observers outside the lock
+    for (const SourcePtr& source : sources) refitInstancesOf(source);
 }
 
 int InternalProject::unloadSource(const boost::shared_ptr<Source>& source) {
+    ScopedWriteLock lock(token()); // no clip may be placed between the check and the removal
     if (timeline_->hasInstanceOf(source))
         throw VelaMediaLibException("unable to remove a source that still has instances on the timeline.");
     return sourceBin_->removeSource(source);
@@ -27,14 +36,11 @@ bool InternalProject::bringSourceOnline(const boost::shared_ptr<Source>& source)
     if (source->isOnline()) return true;
     const std::string path = source->filename();
     if (source->offlineStatus() != OfflineStatus::Reconnectable) return false;
-    boost::shared_ptr<MediaFileStats> stats;
     try {
-        stats = MediaFileStats::create(path, token());
-    } catch (const VelaMediaLibException&) {
-        return false; // the file changed again since it was asked about
+        source->setStats(MediaFileStats::create(path, token())); // whole or not at all
+    } catch (const std::exception&) {
+        return false; // the file changed again since it was asked about, or no longer matches
     }
-    if (!stats->areCompatibleForChange(*source->stats())) return false;
-    source->setStats(stats);
     source->setOnline(true);
     refitInstancesOf(source);
     sourceBin_->notify();

@@ -25,14 +25,17 @@ bool LoadSourceCmd::execute(CommandHandler* handler) {
     if (source_) {
         bin->insertSource(source_, index_);
     } else {
-        source_ = project->loadSourceAtIndex(path_, index_);
+        bool added = false;
+        const SourcePtr source = bin->loadFileAtIndex(path_, index_, &added);
+        if (!added) return false; // another thread loaded the file meanwhile
+        source_ = source;
     }
     index_ = bin->indexOfSource(source_);
     return true;
 }
 
 bool LoadSourceCmd::unexecute(CommandHandler* handler) {
-    projectForSourceCommand(handler)->unloadSource(source_);
+    index_ = projectForSourceCommand(handler)->unloadSource(source_); // redo puts it back there
     return true;
 }
 

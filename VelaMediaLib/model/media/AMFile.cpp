@@ -8,7 +8,7 @@ namespace VelaMediaLib {
 
 AMFile::AMFile(const SourceLink& link, const MediaState& initial)
     : Media(tokenOf(link)), AudioMedia(tokenOf(link)),
-      AudioMediaImpl(tokenOf(link), rateOf(link), initial, Temporal), FileMedia(link) {}
+      AudioMediaImpl(tokenOf(link), rateOf(link), initial, Temporal), FileMedia(link, playsStream) {}
 
 boost::shared_ptr<AMFile> AMFile::create(const SourceLink& link, const MediaState& state) {
     const boost::shared_ptr<AMFile> media(new AMFile(link, state));

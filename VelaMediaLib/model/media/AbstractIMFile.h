@@ -25,9 +25,9 @@ protected:
         const SourceLink link = SourceLink::holding(source, stream);
         return Kind::create(link, stillState(link, Kind::playsStream, start, duration));
     }
-    AbstractIMFile(const SourceLink& link, const MediaState& initial)
+    AbstractIMFile(const SourceLink& link, const MediaState& initial, StreamFilter plays)
         : Media(tokenOf(link)), VisualMedia(tokenOf(link)),
-          VisualMediaImpl(tokenOf(link), rateOf(link), initial, Static), FileMedia(link) {}
+          VisualMediaImpl(tokenOf(link), rateOf(link), initial, Static), FileMedia(link, plays) {}
 };
 
 } // namespace VelaMediaLib

@@ -24,18 +24,29 @@ SourceLink SourceLink::ownedBy(const boost::shared_ptr<const Source>& source, in
     return link;
 }
 
+FileMedia::FileMedia(const SourceLink& link, StreamFilter plays)
+    : strong_(link.strong), weak_(link.weak), stream_(link.stream), plays_(plays) {
+    if (link.source()) checkStream(link, plays);
+}
+
 boost::shared_ptr<const Source> FileMedia::source() const {
     if (const auto held = boost::atomic_load(&strong_)) return held;
     return weak_.lock();
 }
 
+void FileMedia::checkSource(const boost::shared_ptr<const Source>& source) const {
+    if (source) checkStream(SourceLink::holding(source, stream_), plays_);
+}
+
 void FileMedia::setSource(const boost::shared_ptr<const Source>& source) {
+    checkSource(source);
     boost::atomic_store(&strong_, source);
 }
 
 namespace {
 
-const Source& checkedSource(const SourceLink& link, StreamFilter plays) {
+/// The link's source, checked to have the stream, of a kind the clip plays.
+boost::shared_ptr<const Source> checkedSource(const SourceLink& link, StreamFilter plays) {
     const boost::shared_ptr<const Source> source = link.source();
     if (!source) throw VelaMediaLibException("a file clip needs a source");
     const boost::shared_ptr<MediaFileStats> stats = source->stats();
@@ -43,7 +54,28 @@ const Source& checkedSource(const SourceLink& link, StreamFilter plays) {
     if (!plays(type))
         throw TypeException("stream " + std::to_string(link.stream) + " of " + stats->filename() +
                             " is not of a kind this clip plays");
-    return *source; // the link keeps it alive for the caller
+    return source;
+}
+
+/// A slice within the limits of a stream of the given range.
+MediaState sliceOf(const Range<SafeRational>& range, VelaTime start, const SafeRational& mediaStart,
+                   const SafeRational& mediaDuration, const SafeRational& scalar) {
+    MediaState state;
+    state.minMediaStart = range.first();
+    state.maxMediaEnd = range.first() + range.second();
+    if (mediaDuration <= SafeRational(0) || mediaStart < state.minMediaStart ||
+        mediaStart + mediaDuration > state.maxMediaEnd)
+        throw ValueException<const SafeRational>("media range outside the stream", mediaStart);
+    state.start = start;
+    state.mediaStart = mediaStart;
+    state.mediaDuration = mediaDuration;
+    state.scalar = scalar;
+    state.duration = scalar > SafeRational(0)
+                         ? RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar))
+                         : VelaTime(0);
+    if (state.duration <= 0)
+        throw ValueException<const SafeRational>("invalid duration after media stretch (<=0)", scalar);
+    return state;
 }
 
 } // namespace
@@ -63,30 +95,18 @@ boost::weak_ptr<ProjectEditRate> FileMedia::rateOf(const SourceLink& link) {
 MediaState FileMedia::stateFor(const SourceLink& link, StreamFilter plays, VelaTime start,
                                const SafeRational& mediaStart, const SafeRational& mediaDuration,
                                const SafeRational& scalar) {
-    const Source& source = checkedSource(link, plays);
-    MediaState state = withStreamLimits(MediaState(), source, link.stream);
-    if (mediaDuration <= SafeRational(0) || mediaStart < state.minMediaStart ||
-        mediaStart + mediaDuration > state.maxMediaEnd)
-        throw ValueException<const SafeRational>("media range outside the stream", mediaStart);
-    state.start = start;
-    state.mediaStart = mediaStart;
-    state.mediaDuration = mediaDuration;
-    state.scalar = scalar;
-    state.duration = scalar > SafeRational(0)
-                         ? RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar))
-                         : VelaTime(0);
-    if (state.duration <= 0)
-        throw ValueException<const SafeRational>("invalid duration after media stretch (<=0)", scalar);
-    return state;
+    const boost::shared_ptr<const Source> source = checkedSource(link, plays);
+    return sliceOf(source->rationalTimeRangeForTrack(link.stream), start, mediaStart, mediaDuration, scalar);
 }
 
 MediaState FileMedia::wholeStreamState(const SourceLink& link, StreamFilter plays, VelaTime start) {
-    const Range<SafeRational> range = checkedSource(link, plays).rationalTimeRangeForTrack(link.stream);
+    return wholeRangeState(checkedSource(link, plays)->rationalTimeRangeForTrack(link.stream), start);
+}
+
+MediaState FileMedia::wholeRangeState(const Range<SafeRational>& range, VelaTime start) {
     const SafeRational length = range.second();
-    // A stream shorter than half a tick still gets a tick, played slower.
     const SafeRational ticks = std::max(RationalUtil::Round(length), SafeRational(1));
-    return stateFor(link, plays, start, range.first(), length,
-                    length > SafeRational(0) ? ticks / length : ticks);
+    return sliceOf(range, start, range.first(), length, length > SafeRational(0) ? ticks / length : ticks);
 }
 
 MediaState FileMedia::withStreamLimits(MediaState state, const Source& source, int stream) {

@@ -39,7 +39,11 @@ public:
     boost::shared_ptr<const Source> source() const override;
     /// Safe against readers on other threads; the caller then tells the
     /// clip (mediaSourceChanged) so that it takes the new stream's limits.
+    /// Refuses, as checkSource does, a source the clip cannot play.
     void setSource(const boost::shared_ptr<const Source>& source) override;
+    /// Throws unless the source has the clip's stream, of a kind the clip
+    /// plays (the exceptions of checkStream); null passes.
+    void checkSource(const boost::shared_ptr<const Source>& source) const override;
     /// Whether the clip is one of its source's own.
     bool isSourcesOwnMedia() const { return !weak_.expired() && !boost::atomic_load(&strong_); }
 
@@ -58,6 +62,10 @@ public:
     static void checkStream(const SourceLink& link, StreamFilter plays);
     /// The state of a clip that plays the whole stream at normal speed.
     static MediaState wholeStreamState(const SourceLink& link, StreamFilter plays, VelaTime start);
+    /// The same for a stream of the given range (ticks of the edit rate):
+    /// its rounded length at scalar 1, or one tick at a slower scalar for a
+    /// stream shorter than half a tick. Throws as stateFor for no length.
+    static MediaState wholeRangeState(const Range<SafeRational>& range, VelaTime start);
     /// A state with the limits of the stream, widened where the clip plays
     /// beyond them (a shorter file taking a source's place loses no clip).
     static MediaState withStreamLimits(MediaState state, const Source& source, int stream);
@@ -86,8 +94,8 @@ protected:
     }
     /// Gives the clip the limits of its source's stream (after a change of source).
     void takeStreamLimits(Media& clip) const;
-    explicit FileMedia(const SourceLink& link)
-        : strong_(link.strong), weak_(link.weak), stream_(link.stream) {}
+    /// Checks the link (checkStream) when it leads to a source.
+    FileMedia(const SourceLink& link, StreamFilter plays);
     /// A link like this clip's, holding the source strongly (for clones).
     SourceLink cloneLink() const { return SourceLink::holding(source(), stream_); }
 
@@ -95,6 +103,7 @@ private:
     boost::shared_ptr<const Source> strong_; // read and written atomically
     const boost::weak_ptr<const Source> weak_;
     const int stream_;
+    const StreamFilter plays_;
 };
 
 } // namespace VelaMediaLib

@@ -22,7 +22,7 @@ public:
 
 private:
     IMFile(const SourceLink& link, const MediaState& initial)
-        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), AbstractIMFile(link, initial) {}
+        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), AbstractIMFile(link, initial, playsStream) {}
 };
 
 } // namespace VelaMediaLib

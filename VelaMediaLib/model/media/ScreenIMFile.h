@@ -22,7 +22,7 @@ public:
 
 private:
     ScreenIMFile(const SourceLink& link, const MediaState& initial)
-        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), AbstractIMFile(link, initial),
+        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), AbstractIMFile(link, initial, playsStream),
           ScreenDataHolder(tokenOf(link)) {}
 };
 

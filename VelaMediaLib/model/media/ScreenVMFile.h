@@ -26,7 +26,7 @@ public:
 
 private:
     ScreenVMFile(const SourceLink& link, const MediaState& initial)
-        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), VMFile(link, initial),
+        : Media(tokenOf(link)), VisualMedia(tokenOf(link)), VMFile(link, initial, playsStream),
           ScreenDataHolder(tokenOf(link)) {}
 };
 

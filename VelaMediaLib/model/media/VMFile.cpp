@@ -4,9 +4,9 @@
 
 namespace VelaMediaLib {
 
-VMFile::VMFile(const SourceLink& link, const MediaState& initial)
+VMFile::VMFile(const SourceLink& link, const MediaState& initial, StreamFilter plays)
     : Media(tokenOf(link)), VisualMedia(tokenOf(link)),
-      VisualMediaImpl(tokenOf(link), rateOf(link), initial, Temporal), FileMedia(link) {}
+      VisualMediaImpl(tokenOf(link), rateOf(link), initial, Temporal), FileMedia(link, plays) {}
 
 boost::shared_ptr<VMFile> VMFile::create(const SourceLink& link, const MediaState& state) {
     return boost::shared_ptr<VMFile>(new VMFile(link, state));

@@ -32,7 +32,7 @@ public:
     void mediaSourceChanged() override;
 
 protected:
-    VMFile(const SourceLink& link, const MediaState& initial);
+    VMFile(const SourceLink& link, const MediaState& initial, StreamFilter plays = playsStream);
 };
 
 } // namespace VelaMediaLib

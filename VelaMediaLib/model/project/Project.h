@@ -96,7 +96,9 @@ public:
     /// Takes the source out of the bin and returns where it was. Throws
     /// VelaMediaLibException "unable to remove a source that still has
     /// instances on the timeline." while a clip on the timeline plays it, and
-    /// AddRemoveException when the bin does not hold it.
+    /// AddRemoveException when the bin does not hold it. Clips elsewhere (the
+    /// clipboard, undo steps) keep the source alive but do not hold it in
+    /// the bin: pasting one back plays a source the bin no longer lists.
     virtual int unloadSource(const boost::shared_ptr<Source>& source) = 0;
     /// Brings an offline source back when its file can be read again and
     /// its streams still match (its clips take their ranges); returns

@@ -63,16 +63,21 @@ int SourceBin::indexOfSource(const boost::shared_ptr<const Source>& source) cons
 }
 
 bool SourceBin::containsSource(const boost::shared_ptr<const Source>& source) const {
-    return indexOfSource(source) >= 0;
+    ScopedReadLock lock(projectLock());
+    return keys_.count(source.get()) > 0;
 }
 
 bool SourceBin::isFileLoaded(const std::string& path) const { return bool(sourceForFile(path)); }
 
 boost::shared_ptr<Source> SourceBin::sourceForFile(const std::string& path) const {
-    if (!isNormal(path)) return sourceForFile(normalPath(path));
     // Most paths are normal already: they are looked up as they are, uncopied.
+    if (isNormal(path)) {
+        ScopedReadLock lock(projectLock());
+        return lockedSourceForKey(path);
+    }
+    const std::string key = normalPath(path);
     ScopedReadLock lock(projectLock());
-    return lockedSourceForKey(path);
+    return lockedSourceForKey(key);
 }
 
 boost::shared_ptr<Source> SourceBin::lockedSourceForKey(const std::string& key) const {
@@ -82,37 +87,38 @@ boost::shared_ptr<Source> SourceBin::lockedSourceForKey(const std::string& key) 
 
 boost::shared_ptr<Source> SourceBin::loadFile(const std::string& path) { return loadFileAtIndex(path, -1); }
 
-boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, int index) {
+boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, int index, bool* added) {
+    if (added) *added = false;
     if (const boost::shared_ptr<Source> loaded = sourceForFile(path)) return loaded;
-    if (index < -1 || index > static_cast<int>(numSources()))
-        throw IndexException("source index out of range");
     boost::shared_ptr<FileSystem> fileSystem;
     {
         ScopedReadLock lock(projectLock());
+        if (index < -1 || index > static_cast<int>(sources_.size()))
+            throw IndexException("source index out of range");
         fileSystem = fileSystem_;
     }
     // Reading the file may take long: no lock is held meanwhile.
     const boost::shared_ptr<Source> source = Source::create(rate_, projectMutex(), path, fileSystem);
+    const std::string key = keyOf(path);
     {
         ScopedWriteLock lock(projectMutex());
         // Another thread may have loaded the file meanwhile; its source wins.
-        if (const boost::shared_ptr<Source> loaded = lockedSourceForKey(keyOf(path))) return loaded;
-        checkInsertable(*source, keyOf(path), index);
-        sources_.insert(index < 0 ? sources_.end() : sources_.begin() + index, source);
-        byPath_[keyOf(path)] = source;
+        if (const boost::shared_ptr<Source> loaded = lockedSourceForKey(key)) return loaded;
+        if (index > static_cast<int>(sources_.size())) throw IndexException("source index out of range");
+        lockedInsert(source, key, index);
     }
+    if (added) *added = true;
     notify();
     return source;
 }
 
-void SourceBin::checkInsertable(const Source& source, const std::string& key, int index) const {
-    if (index < -1 || index > static_cast<int>(sources_.size()))
-        throw IndexException("source index out of range");
+void SourceBin::lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index) {
     if (sources_.size() >= sources_.max_size()) throw VelaMediaLibException("list too long");
-    if (byPath_.count(key) || std::find_if(sources_.begin(), sources_.end(), [&](const auto& held) {
-                                  return held.get() == &source;
-                              }) != sources_.end())
-        throw AddRemoveException("the source bin already holds a source of this file");
+    const auto at =
+        index < 0 || index > static_cast<int>(sources_.size()) ? sources_.end() : sources_.begin() + index;
+    sources_.insert(at, source);
+    byPath_[key] = source;
+    keys_[source.get()] = key;
 }
 
 void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index) {
@@ -120,12 +126,16 @@ void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index)
     if (source->projectMutex().owner_before(projectMutex()) ||
         projectMutex().owner_before(source->projectMutex()))
         throw AddRemoveException("the source belongs to another project");
-    const std::string key = keyOf(source->filename());
+    if (index < -1) throw IndexException("source index out of range");
+    const boost::shared_ptr<ProjectEditRate> rate = rate_.lock();
     {
         ScopedWriteLock lock(projectMutex());
-        checkInsertable(*source, key, index);
-        sources_.insert(index < 0 ? sources_.end() : sources_.begin() + index, source);
-        byPath_[key] = source;
+        const std::string key = keyOf(source->filename());
+        if (keys_.count(source.get()) || byPath_.count(key))
+            throw AddRemoveException("the source bin already holds a source of this file");
+        // A source kept by an undo step comes back at the project's present rate.
+        if (rate && source->editRate() != rate->editRate()) source->setEditRate(rate->editRate());
+        lockedInsert(source, key, index);
     }
     notify();
 }
@@ -134,52 +144,42 @@ int SourceBin::removeSource(const boost::shared_ptr<const Source>& source) {
     int index = -1;
     {
         ScopedWriteLock lock(projectMutex());
+        const auto key = keys_.find(source.get());
+        if (key == keys_.end()) throw AddRemoveException("source is not in the source bin");
         const auto found = std::find(sources_.begin(), sources_.end(), source);
-        if (found == sources_.end()) throw AddRemoveException("source is not in the source bin");
         index = static_cast<int>(found - sources_.begin());
-        byPath_.erase(keyOf(source->filename()));
+        byPath_.erase(key->second);
+        keys_.erase(key);
         sources_.erase(found);
     }
     notify();
     return index;
 }
 
-void SourceBin::checkHeld(const boost::shared_ptr<const Source>& source) const {
-    if (!containsSource(source)) throw AddRemoveException("source is not in the source bin");
-}
-
-void SourceBin::rekey(const boost::shared_ptr<Source>& source, const std::string& oldKey) {
-    byPath_.erase(oldKey);
-    byPath_[keyOf(source->filename())] = source;
+template <typename Change>
+void SourceBin::refile(const boost::shared_ptr<Source>& source, const std::string& path, Change change) {
+    const std::string key = keyOf(path);
+    {
+        ScopedWriteLock lock(projectMutex());
+        const auto held = keys_.find(source.get());
+        if (held == keys_.end()) throw AddRemoveException("source is not in the source bin");
+        const boost::shared_ptr<Source> holder = lockedSourceForKey(key);
+        if (holder && holder != source) throw AddRemoveException("another source has the file: " + path);
+        change();
+        byPath_.erase(held->second);
+        byPath_[key] = source;
+        held->second = key;
+    }
+    notify();
 }
 
 void SourceBin::changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
-    checkHeld(source);
-    const boost::shared_ptr<Source> holder = sourceForFile(path);
-    if (holder && holder != source) throw AddRemoveException("another source has the file: " + path);
     const boost::shared_ptr<MediaFileStats> stats = MediaFileStats::create(path, projectMutex());
-    if (!stats->areCompatibleForChange(*source->stats()))
-        throw VelaMediaLibException("file is not compatible with the source's file: " + path);
-    const std::string oldKey = keyOf(source->filename());
-    source->setStats(stats);
-    {
-        ScopedWriteLock lock(projectMutex());
-        rekey(source, oldKey);
-    }
-    notify();
+    refile(source, path, [&] { source->setStats(stats); });
 }
 
 void SourceBin::renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
-    checkHeld(source);
-    const boost::shared_ptr<Source> holder = sourceForFile(path);
-    if (holder && holder != source) throw AddRemoveException("another source has the file: " + path);
-    const std::string oldKey = keyOf(source->filename());
-    source->setFilename(path);
-    {
-        ScopedWriteLock lock(projectMutex());
-        rekey(source, oldKey);
-    }
-    notify();
+    refile(source, path, [&] { source->setFilename(path); });
 }
 
 void SourceBin::setFileSystem(const boost::shared_ptr<FileSystem>& fileSystem) {

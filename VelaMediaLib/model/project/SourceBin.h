@@ -51,24 +51,30 @@ public:
 
     /// The file's source: the one the bin holds, or a new one appended.
     boost::shared_ptr<Source> loadFile(const std::string& path);
-    /// The same, a new source inserted at the index (-1 appends). Throws
-    /// IndexException "source index out of range" and the exceptions of
-    /// Source::create; the bin is then unchanged.
-    boost::shared_ptr<Source> loadFileAtIndex(const std::string& path, int index);
-    /// Puts a source in the bin at the index (-1 appends), as a load and
-    /// its redo do. Throws AddRemoveException when the bin holds it or
-    /// another source of its file, and "list too long" when full.
+    /// The same, a new source inserted at the index (-1 appends); `added`,
+    /// when given, tells whether it was. Throws IndexException "source index
+    /// out of range" and the exceptions of Source::create; the bin is then
+    /// unchanged.
+    boost::shared_ptr<Source> loadFileAtIndex(const std::string& path, int index, bool* added = nullptr);
+    /// Puts a source in the bin at the index (-1 appends; past the end
+    /// appends too), as a load and its redo do; it takes the project's
+    /// present edit rate. Throws AddRemoveException when the bin holds it or
+    /// another source of its file, or it belongs to another project, and
+    /// "list too long" when full.
     void insertSource(const boost::shared_ptr<Source>& source, int index);
     /// Takes the source out; returns where it was. Throws AddRemoveException
     /// "source is not in the source bin".
     int removeSource(const boost::shared_ptr<const Source>& source);
     /// Gives the source another file whose streams match its own (see
-    /// MediaFileStats::areCompatibleForChange); its clips take the new
-    /// streams' ranges. Throws VelaMediaLibException "file is not compatible
-    /// with the source's file: <path>", AddRemoveException when another
-    /// source has the file, and the exceptions of MediaFileStats::create.
+    /// MediaFileStats::areCompatibleForChange); its own clips take the new
+    /// streams' ranges. Throws, changing nothing, VelaMediaLibException "file
+    /// is not compatible with the source's file: <path>" (or when a stream
+    /// would have no length), AddRemoveException when another source has the
+    /// file or the bin does not hold the source, and the exceptions of
+    /// MediaFileStats::create.
     void changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path);
-    /// Records that the source's file now lives under another path.
+    /// Records that the source's file now lives under another path; throws
+    /// AddRemoveException as changeSourcesFile does.
     void renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path);
 
     /// The file system new sources ask about their files (the host's by default).
@@ -78,15 +84,19 @@ private:
     /// Whether normalising would leave the path as it is (the usual case).
     static bool isNormal(const std::string& path);
     static std::string keyOf(const std::string& path);
-    void checkInsertable(const Source& source, const std::string& key, int index) const;
-    void checkHeld(const boost::shared_ptr<const Source>& source) const;
     boost::shared_ptr<Source> lockedSourceForKey(const std::string& key) const;
-    void rekey(const boost::shared_ptr<Source>& source, const std::string& oldKey);
+    /// Puts the source in the list and the index; the write lock is held.
+    void lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index);
+    /// Under one write lock: checks that the bin holds the source and no other
+    /// source has the path, lets `change` act, and files the source under the path.
+    template <typename Change>
+    void refile(const boost::shared_ptr<Source>& source, const std::string& path, Change change);
 
     boost::weak_ptr<ProjectEditRate> rate_;
     boost::shared_ptr<FileSystem> fileSystem_;
     Sources sources_;
     std::unordered_map<std::string, boost::shared_ptr<Source>> byPath_;
+    std::unordered_map<const Source*, std::string> keys_; // each source's key in byPath_
 };
 
 } // namespace VelaMediaLib

@@ -16,6 +16,8 @@ public:
     virtual ~Sourceable() = default;
     virtual boost::shared_ptr<const Source> source() const = 0;
     virtual void setSource(const boost::shared_ptr<const Source>& source) = 0;
+    /// Throws when the clip could not play the source; by default any passes.
+    virtual void checkSource(const boost::shared_ptr<const Source>&) const {}
 
     /// The sources the clips play, each once, in the order first met.
     static std::vector<boost::shared_ptr<const Source>>

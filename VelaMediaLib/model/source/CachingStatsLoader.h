@@ -14,7 +14,8 @@ namespace VelaMediaLib {
 /// A loader that keeps what it loaded by path and answers a repeated request
 /// from its map, so a file is read once however often it is imported.
 /// Thread-safe: the map has a mutex of its own, and the uncached load runs
-/// outside it.
+/// outside it. It keeps a record's contents (name, streams, picture); an
+/// effect definition the uncached load set is not kept.
 class VELAMEDIALIB_API CachingStatsLoader : public StatsLoader {
 public:
     explicit CachingStatsLoader(bool caching = true);

@@ -55,10 +55,20 @@ MediaFileStats::create(const std::string& path, const boost::weak_ptr<const Thre
         throw IOException(message);
     }
     // Still private to this thread: filled without locks, then given its project.
-    if (stats->contents_.tracks.empty()) throw IOException("file has no streams: " + path);
-    if (stats->contents_.filename.empty()) stats->contents_.filename = path;
+    // The record is named by the path it was made for, whatever a loader wrote.
+    stats->contents_.filename = path;
+    checkContents(stats->contents_);
     stats->setProjectMutex(projectMutex);
     return stats;
+}
+
+void MediaFileStats::checkContents(const Contents& contents) {
+    if (contents.tracks.empty()) throw IOException("file has no streams: " + contents.filename);
+    for (size_t i = 0; i < contents.tracks.size(); ++i) {
+        const TrackStats& track = contents.tracks[i];
+        if (track.rangeEditRate.numerator() == 0 || track.range.duration() < 0)
+            throw IOException("bad stream " + std::to_string(i) + " in file: " + contents.filename);
+    }
 }
 
 bool MediaFileStats::isFileOpenable(const std::string& path) {

@@ -48,13 +48,17 @@ public:
     /// An empty record of no project.
     static boost::shared_ptr<MediaFileStats> create();
     /// Asks the process-wide loaders in list order; the first that answers
-    /// true fills the record (its file name, when it leaves that empty, is
-    /// `path`). A loader that throws is passed over. Throws IOException
+    /// true fills the record, which is named `path` whatever the loader
+    /// wrote. A loader that throws is passed over. Throws IOException
     /// "no stats loader could read file: <path>" when none answers, followed
-    /// by " (<text>)" of the first loader that threw, and "file has no
-    /// streams: <path>" when the answer has no stream.
+    /// by " (<text>)" of the first loader that threw, and the exceptions of
+    /// checkContents for an answer without streams or with a bad one.
     static boost::shared_ptr<MediaFileStats>
     create(const std::string& path, const boost::weak_ptr<const ThreadSafe>& projectMutex = {});
+    /// Throws IOException "file has no streams: <path>" for contents without
+    /// streams, and "bad stream <index> in file: <path>" for a stream of no
+    /// rate or of a negative length.
+    static void checkContents(const Contents& contents);
     /// Whether create(path) would succeed; never throws.
     static bool isFileOpenable(const std::string& path);
 

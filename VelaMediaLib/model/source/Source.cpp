@@ -21,7 +21,11 @@ namespace {
 std::string utcNow() {
     const std::time_t now = std::time(nullptr);
     std::tm parts{};
+#ifdef _WIN32
+    gmtime_s(&parts, &now);
+#else
     gmtime_r(&now, &parts);
+#endif
     char text[32];
     std::strftime(text, sizeof text, "%Y-%m-%dT%H:%M:%SZ", &parts);
     return text;
@@ -35,6 +39,12 @@ SafeRational convertTicks(long long ticks, const boost::rational<unsigned long>&
         SafeRational(static_cast<long long>(from.numerator()), static_cast<long long>(from.denominator()));
     return seconds *
            SafeRational(static_cast<long long>(to.numerator()), static_cast<long long>(to.denominator()));
+}
+
+/// A stream's range in ticks of the rate, exactly.
+Range<SafeRational> streamRange(const TrackStats& track, const boost::rational<unsigned long>& rate) {
+    return Range<SafeRational>(convertTicks(track.range.first(), track.rangeEditRate, rate),
+                               convertTicks(track.range.second(), track.rangeEditRate, rate));
 }
 
 } // namespace
@@ -63,7 +73,7 @@ boost::shared_ptr<Source> Source::create(const boost::weak_ptr<ProjectEditRate>&
                                          const boost::shared_ptr<MediaFileStats>& stats,
                                          const boost::shared_ptr<FileSystem>& fileSystem) {
     if (!stats) throw VelaMediaLibException("a source needs the stats of its file");
-    if (stats->numTracks() == 0) throw IOException("file has no streams: " + stats->filename());
+    MediaFileStats::checkContents(stats->contents());
     const boost::shared_ptr<Source> source(new Source(rate, token, stats, fileSystem));
     source->addMetaData(timeAddedMetaDataKey(), utcNow());
     source->addAttribute<bool>("shouldApplyLoudnessNormalization", false);
@@ -133,10 +143,7 @@ boost::rational<unsigned long> Source::editRate() const {
 
 Range<SafeRational> Source::rationalTimeRangeForTrack(int stream) const {
     ScopedReadLock lock(projectLock());
-    const TrackStats track = stats_->trackStats(stream);
-    const SafeRational start = convertTicks(track.range.first(), track.rangeEditRate, editRate_);
-    const SafeRational duration = convertTicks(track.range.second(), track.rangeEditRate, editRate_);
-    return Range<SafeRational>(start, duration);
+    return streamRange(stats_->trackStats(stream), editRate_);
 }
 
 Range<VelaTime> Source::timeRangeForTrack(int stream) const {
@@ -177,34 +184,37 @@ std::vector<boost::shared_ptr<ParameterInterface>> Source::parameterVector(int s
     return parameters;
 }
 
-void Source::setEditRate(const boost::rational<unsigned long>& rate) {
-    {
-        ScopedWriteLock lock(projectMutex());
-        editRate_ = rate;
+Source::Refit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
+                               const boost::rational<unsigned long>& rate) const {
+    if (!stats) throw VelaMediaLibException("a source needs the stats of its file");
+    const MediaFileStats::Contents contents = stats->contents();
+    if (stats != this->stats() && !stats->areCompatibleForChange(*this->stats()))
+        throw VelaMediaLibException("file is not compatible with the source's file: " + contents.filename);
+    Refit refit{stats, rate, {}};
+    for (size_t stream = 0; stream < streamMedia_.size(); ++stream) {
+        const MediaPtr& media = streamMedia_[stream];
+        if (!media || boost::dynamic_pointer_cast<AbstractIMFile>(media)) {
+            refit.states.push_back(media ? media->state() : MediaState()); // stills have no extent
+            continue;
+        }
+        const Range<SafeRational> range = streamRange(contents.tracks[stream], rate);
+        if (range.second() <= SafeRational(0))
+            throw VelaMediaLibException("stream " + std::to_string(stream) + " of " + contents.filename +
+                                        " has no length at this edit rate");
+        refit.states.push_back(FileMedia::wholeRangeState(range, 0));
     }
-    refitStreamMedia();
+    return refit;
 }
 
-void Source::setStats(const boost::shared_ptr<MediaFileStats>& stats) {
-    if (!stats) throw VelaMediaLibException("a source needs the stats of its file");
-    {
-        ScopedWriteLock lock(projectMutex());
-        stats_ = stats;
-    }
-    refitStreamMedia();
+void Source::take(const Refit& refit) {
+    ScopedWriteLock lock(projectMutex()); // readers see the stats and the clips change together
+    stats_ = refit.stats;
+    editRate_ = refit.rate;
+    for (size_t stream = 0; stream < streamMedia_.size(); ++stream)
+        if (streamMedia_[stream] && streamMedia_[stream]->state() != refit.states[stream])
+            streamMedia_[stream]->restoreState(refit.states[stream], 0); // alone on its track: cannot collide
 }
 
 void Source::setFilename(const std::string& path) { stats()->setFilename(path); }
-
-void Source::refitStreamMedia() {
-    for (size_t stream = 0; stream < streamMedia_.size(); ++stream) {
-        const MediaPtr& media = streamMedia_[stream];
-        if (!media || boost::dynamic_pointer_cast<AbstractIMFile>(media)) continue; // stills have no extent
-        const SourceLink link = SourceLink::ownedBy(shared_from_this(), static_cast<int>(stream));
-        media->restoreState(FileMedia::wholeStreamState(
-                                link, [](TrackType) { return true; }, 0),
-                            0);
-    }
-}
 
 } // namespace VelaMediaLib

@@ -4,6 +4,7 @@
 #include <VelaMediaLib/base/Rect.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
+#include <VelaMediaLib/model/media/MediaState.h>
 #include <VelaMediaLib/model/source/OfflineStatus.h>
 #include <VelaMediaLib/model/source/SourceMediaIterator.h>
 #include <VelaMediaLib/time/parameters/Attributable.h>
@@ -36,6 +37,11 @@ class Timeline;
 /// A source is made online. Whether its file is still there is a question
 /// asked of its file system (offlineStatus); the project takes a source
 /// offline or back online (dropSourceOffline, bringSourceOnline).
+///
+/// Queries take the project's read lock and may be asked from any thread.
+/// The file, the edit rate and the stats change only through the project
+/// and its source bin (changeSourcesFile, renameSourcesFile, setEditRate),
+/// whole or not at all, under the write lock.
 class VELAMEDIALIB_API Source : public VelaObject,
                                 public XMLable,
                                 public MetaDatable,
@@ -50,8 +56,8 @@ public:
                                             const std::string& path,
                                             const boost::shared_ptr<FileSystem>& fileSystem = {});
     /// A source of stats already read. Throws VelaMediaLibException for a null
-    /// record or a project without an edit rate, and IOException "file has no
-    /// streams: <path>" for a record without streams.
+    /// record or a project without an edit rate, and the exceptions of
+    /// MediaFileStats::checkContents.
     static boost::shared_ptr<Source> create(const boost::weak_ptr<ProjectEditRate>& rate,
                                             const boost::weak_ptr<const ThreadSafe>& token,
                                             const boost::shared_ptr<MediaFileStats>& stats,
@@ -70,7 +76,9 @@ public:
     const boost::weak_ptr<ProjectEditRate>& editRateToken() const { return rateToken_; }
     bool isOnline() const { return online_.load(std::memory_order_acquire); }
     /// 0 online; 1 the file is gone; 2 it is there but unreadable; else 4
-    /// when stats can be made for it again (it can be reconnected), 3 when not.
+    /// when stats can be made for it again (it can be reconnected), 3 when
+    /// not. For an offline source this asks the file system and then the
+    /// stats loaders (which may read the file) on every call.
     OfflineStatus offlineStatus() const;
 
     // Time, in ticks of the source's edit rate
@@ -88,36 +96,61 @@ public:
     }
 
     // The source's own clips, one per stream of a kind a clip can play
-    boost::shared_ptr<Timeline> timeline() const { return timeline_; }
+    boost::shared_ptr<const Timeline> timeline() const { return timeline_; }
     /// The clip of the stream; null for a stream no clip kind plays.
     boost::shared_ptr<Media> mediaForTrackNumber(int stream) const;
     boost::shared_ptr<ParameterInterface> paramWithName(const std::string& name, int stream) const;
     std::vector<boost::shared_ptr<ParameterInterface>> parameterVector(int stream) const;
-    /// The source's clips of a kind (Media, VisualMedia or AudioMedia), in stream order.
+    /// The source's clips of a kind (Media, VisualMedia or AudioMedia), in
+    /// stream order; an iterator keeps the source alive.
     template <typename Kind = Media>
     SourceMediaIterator<Kind> mediaBegin() const {
-        return SourceMediaIterator<Kind>(&streamMedia_, 0);
+        return SourceMediaIterator<Kind>(streamMedia(), 0);
     }
     template <typename Kind = Media>
     SourceMediaIterator<Kind> mediaEnd() const {
-        return SourceMediaIterator<Kind>(&streamMedia_, streamMedia_.size());
+        return SourceMediaIterator<Kind>(streamMedia(), streamMedia_.size());
     }
 
-    // Changes, made by the project and its source bin
-    /// Rebuilds the limits of the source's own clips for the new rate.
-    void setEditRate(const boost::rational<unsigned long>& rate);
+    /// Marks the source offline or online (the project does, see
+    /// Project::dropSourceOffline and bringSourceOnline).
     void setOnline(bool online) { online_.store(online, std::memory_order_release); }
-    /// Takes the stats of another file: the source's clips take its streams' ranges.
-    void setStats(const boost::shared_ptr<MediaFileStats>& stats);
-    /// Renames the file: the stats record keeps its streams.
-    void setFilename(const std::string& path);
 
 private:
+    friend class SourceBin;
+    friend class InternalProject;
+
+    /// What a change of file or rate gives the source: the stats, the rate,
+    /// and the states its own clips take (stills keep theirs).
+    struct Refit {
+        boost::shared_ptr<MediaFileStats> stats;
+        boost::rational<unsigned long> rate;
+        std::vector<MediaState> states;
+    };
+
     Source(const boost::weak_ptr<ProjectEditRate>& rate, const boost::weak_ptr<const ThreadSafe>& token,
            const boost::shared_ptr<MediaFileStats>& stats, const boost::shared_ptr<FileSystem>& fileSystem);
     void buildStreamMedia();
+    /// The list of the source's own clips, keeping the source alive.
+    boost::shared_ptr<const std::vector<MediaPtr>> streamMedia() const {
+        return boost::shared_ptr<const std::vector<MediaPtr>>(shared_from_this(), &streamMedia_);
+    }
     MediaPtr makeStreamMedia(int stream) const;
-    void refitStreamMedia();
+
+    // Changes, made by the project and its source bin, whole or not at all
+    /// The refit for other stats and rate. Throws VelaMediaLibException "file
+    /// is not compatible with the source's file: <path>" for stats whose
+    /// streams do not match (MediaFileStats::areCompatibleForChange), and
+    /// "stream <i> of <path> has no length at this edit rate" when a stream
+    /// one of the source's clips plays would have none.
+    Refit refitFor(const boost::shared_ptr<MediaFileStats>& stats,
+                   const boost::rational<unsigned long>& rate) const;
+    /// Takes a refit under the project's write lock: cannot fail.
+    void take(const Refit& refit);
+    void setEditRate(const boost::rational<unsigned long>& rate) { take(refitFor(stats(), rate)); }
+    void setStats(const boost::shared_ptr<MediaFileStats>& stats) { take(refitFor(stats, editRate())); }
+    /// Renames the file: the stats record keeps its streams.
+    void setFilename(const std::string& path);
 
     boost::weak_ptr<ProjectEditRate> rateToken_;
     boost::rational<unsigned long> editRate_; // guarded by the project's lock

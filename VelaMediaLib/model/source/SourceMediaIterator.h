@@ -12,8 +12,8 @@ namespace VelaMediaLib {
 
 /// Walks a source's clips of one kind (Media, VisualMedia or AudioMedia) in
 /// stream order, skipping streams that no clip of the kind plays. The list
-/// it walks is fixed when the source is made, so an iterator stays valid as
-/// long as its source lives.
+/// it walks is fixed when the source is made, and the iterator holds the
+/// source alive.
 template <typename Kind>
 class VELAMEDIALIB_TEMPLATE_API SourceMediaIterator {
 public:
@@ -23,11 +23,14 @@ public:
     typedef const value_type* pointer;
     typedef value_type reference;
 
-    SourceMediaIterator(const std::vector<MediaPtr>* media, size_t index) : media_(media), index_(index) {
+    SourceMediaIterator(const boost::shared_ptr<const std::vector<MediaPtr>>& media, size_t index)
+        : media_(media), index_(index) {
         skip();
     }
 
     value_type operator*() const { return boost::dynamic_pointer_cast<Kind>((*media_)[index_]); }
+    /// The clip, which the source keeps.
+    Kind* operator->() const { return dynamic_cast<Kind*>((*media_)[index_].get()); }
     SourceMediaIterator& operator++() {
         ++index_;
         skip();
@@ -49,7 +52,7 @@ private:
         while (index_ < media_->size() && !boost::dynamic_pointer_cast<Kind>((*media_)[index_])) ++index_;
     }
 
-    const std::vector<MediaPtr>* media_;
+    boost::shared_ptr<const std::vector<MediaPtr>> media_;
     size_t index_;
 };
 

@@ -183,15 +183,14 @@ std::vector<MediaPtr> Timeline::instancesOf(const boost::shared_ptr<const Source
 
 size_t Timeline::swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,
                                              const boost::shared_ptr<const Source>& to) {
-    size_t swapped = 0;
-    for (const MediaPtr& media : allMedias()) {
-        const auto sourceable = boost::dynamic_pointer_cast<Sourceable>(media);
-        if (!sourceable || sourceable->source() != from) continue;
-        sourceable->setSource(to);
+    const std::vector<MediaPtr> clips = instancesOf(from);
+    // Every clip must be able to play the new source before any takes it.
+    for (const MediaPtr& media : clips) boost::dynamic_pointer_cast<Sourceable>(media)->checkSource(to);
+    for (const MediaPtr& media : clips) {
+        boost::dynamic_pointer_cast<Sourceable>(media)->setSource(to);
         media->mediaSourceChanged();
-        ++swapped;
     }
-    return swapped;
+    return clips.size();
 }
 
 VelaTime Timeline::endTime() const {

@@ -85,7 +85,9 @@ public:
     bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
         return !instancesOf(source).empty();
     }
-    /// Gives every clip that plays `from` the source `to`; returns how many changed.
+    /// Gives every clip that plays `from` the source `to`; returns how many
+    /// changed. Throws, changing no clip, when one cannot play `to` (see
+    /// Sourceable::checkSource).
     size_t swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,
                                        const boost::shared_ptr<const Source>& to);
 
