@@ -208,6 +208,24 @@ TEST_F(MediaFileStatsTest, MediaRangeSpansAllStreamsInSecondsAndFirstRatesComeFr
     EXPECT_EQ(simple.videoFrameRate, SafeRational(25));
 }
 
+TEST_F(MediaFileStatsTest, ThePictureIsTheFilesOrElseTheFirstVisualStreams) {
+    TrackStats audio = stream(TrackType::Audio), screen = stream(TrackType::ScreenVideo);
+    audio.rect = Rect<int>(0, 0, 1, 1); // no picture, whatever it says
+    screen.rect = Rect<int>(0, 0, 1280, 720);
+    const auto stats = record({audio, screen});
+    EXPECT_EQ(SimpleMediaFileStats::from(*stats).width, 1280);
+    for (const Rect<int>& rect : {Rect<int>(0, 0, 640, 0), Rect<int>(0, 0, 0, 480)}) {
+        stats->setRect(rect);
+        EXPECT_EQ(SimpleMediaFileStats::from(*stats).width, rect.width);
+        EXPECT_EQ(SimpleMediaFileStats::from(*stats).height, rect.height);
+    }
+    const std::vector<TrackType> visual = {TrackType::Video, TrackType::Image, TrackType::ScreenVideo,
+                                           TrackType::ScreenImage};
+    for (TrackType type : visual) EXPECT_TRUE(isVisualTrackType(type) && !isAudioTrackType(type));
+    EXPECT_FALSE(isVisualTrackType(TrackType::Audio) || isVisualTrackType(TrackType::Unknown));
+    EXPECT_TRUE(isAudioTrackType(TrackType::Audio));
+}
+
 TEST_F(MediaFileStatsTest, CompatibleForChangeNeedsTheSameStreamKindsAndChannels) {
     TrackStats stereo = stream(TrackType::Audio), mono = stereo;
     stereo.numChannels = 2;
