@@ -16,7 +16,9 @@
 #include <VelaMediaLib/model/source/StatsLoader.h>
 
 #include <boost/make_shared.hpp>
+#ifdef __GLIBC__
 #include <malloc.h>
+#endif
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -46,6 +48,15 @@ MediaFileStats::Contents recording(const std::string& path) {
     contents.tracks = {video, audio};
     contents.rect = video.rect;
     return contents;
+}
+
+/// Bytes the allocator has handed out and not had back (glibc; 0 elsewhere).
+double heapInUse() {
+#if defined(__GLIBC__) && (__GLIBC__ > 2 || __GLIBC_MINOR__ >= 33)
+    return double(mallinfo2().uordblks);
+#else
+    return 0;
+#endif
 }
 
 class MemoryLoader : public StatsLoader {
@@ -84,12 +95,12 @@ void BM_ImportSources(benchmark::State& state) {
         }
         const ProjectPtr project = Project::create(30, 1);
         const long long allocatedBefore = AllocationCounter::bytes().load();
-        const size_t heldBefore = mallinfo2().uordblks;
+        const double heldBefore = heapInUse();
         const auto start = Interleaved::Clock::now();
         for (const std::string& path : paths) project->loadSource(path);
         const double library = Interleaved::nanoseconds(Interleaved::Clock::now() - start);
         allocated += double(AllocationCounter::bytes().load() - allocatedBefore);
-        held += double(mallinfo2().uordblks) - double(heldBefore);
+        held += heapInUse() - heldBefore;
         baselineNs += baseline;
         libraryNs += library;
         ratios.push_back(library / baseline);

@@ -1,13 +1,16 @@
 // The project's source operations and the commands that load and unload sources.
 #include "../model/SourceTestSupport.h"
 
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/time/sync/LambdaObserverWithoutNotifyDelay.h>
+#include <VelaMediaLib/time/sync/ReadWriteMutex.h>
 
 #include <gtest/gtest.h>
 
@@ -176,6 +179,7 @@ TEST_F(SourceCommandTest, AFileThatCannotTakeTheSourcesPlaceChangesNothing) {
     project->changeSourcesFile(a, "longer.mov");
     EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(300)); // the placed clip may reach the new end
     EXPECT_FALSE(project->sourceBin()->isFileLoaded("a.mov"));
+    EXPECT_EQ(project->sourceBin()->sourceForFile("longer.mov"), a);
 }
 
 TEST_F(SourceCommandTest, ASwapToASourceWithoutTheStreamIsRefusedWhole) {
@@ -191,6 +195,86 @@ TEST_F(SourceCommandTest, ASwapToASourceWithoutTheStreamIsRefusedWhole) {
     EXPECT_EQ(picture->source(), a);
 }
 
+TEST_F(SourceCommandTest, RateChangesReachEveryClipBeforeTheyAreTold) {
+    const SourcePtr a = project->loadSource("a.mov");
+    loader->set("blip.wav", {stream(TrackType::Audio, 0, 1, 48000, 1)}); // a 48000th of a second
+    const SourcePtr blip = project->loadSource("blip.wav");
+    const auto loose = VMFile::create(a, 0, 0), clip = VMFile::create(a, 0, 0);
+    track->addMedia(loose, 0);
+    track->addMedia(clip, 1000);
+    MediaState rounded = loose->state();
+    rounded.duration += 1; // a restore with a tolerance leaves a clip one tick off
+    loose->restoreState(rounded, 1);
+
+    SafeRational seen;
+    LambdaObserverWithoutNotifyDelay watcher([&](Observable*) { seen = clip->maxRationalMediaEnd(); });
+    project->attachEditRateObserver(&watcher);
+    project->setEditRate(boost::rational<unsigned long>(60));
+    project->detachEditRateObserver(&watcher);
+    EXPECT_EQ(seen, SafeRational(300));
+    EXPECT_EQ(loose->maxRationalMediaEnd(), SafeRational(300));
+    EXPECT_EQ(blip->mediaForTrackNumber(0)->duration(), 1); // shorter than a tick: one, played slower
+}
+
+TEST_F(SourceCommandTest, AnUndoneEditFindsTheStreamAtThePresentRate) {
+    const SourcePtr a = project->loadSource("a.mov");
+    const auto clip = VMFile::create(a, 0, 0);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, clip, 0)));
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, clip, 30)));
+    project->setEditRate(boost::rational<unsigned long>(60));
+    project->undo();
+    EXPECT_EQ(clip->duration(), 150); // the clip's own timing comes back exactly
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(300));
+    project->undo();
+    project->redo();
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(300));
+}
+
+TEST_F(SourceCommandTest, NoObserverRunsUnderTheWriteLock) {
+    const SourcePtr a = project->loadSource("a.mov"), b = project->loadSource("b.mov");
+    loader->set("longer.mov",
+                {stream(TrackType::Video, 0, 6000, 600), stream(TrackType::Audio, 0, 48000, 48000, 2)});
+    const ReadWriteMutex& lock = project->token().lock()->mutex();
+    int calls = 0, underLock = 0;
+    LambdaObserverWithoutNotifyDelay watcher([&](Observable*) {
+        ++calls;
+        underLock += lock.hasWriter();
+    });
+    for (const SourcePtr& source : {a, b}) {
+        source->mediaForTrackNumber(0)->attachWithoutNotifyDelay(&watcher);
+        source->stats()->attachWithoutNotifyDelay(&watcher);
+    }
+    project->sourceBin()->attachWithoutNotifyDelay(&watcher);
+    project->setEditRate(boost::rational<unsigned long>(60));
+    project->changeSourcesFile(a, "longer.mov");
+    project->renameSourcesFile(a, "moved.mov");
+    ASSERT_TRUE(project->execute(UnloadSourceCmd::create(b)));
+    project->setEditRate(boost::rational<unsigned long>(30));
+    project->undo(); // b comes back and takes the rate
+    for (const SourcePtr& source : {a, b}) {
+        source->mediaForTrackNumber(0)->detach(&watcher);
+        source->stats()->detach(&watcher);
+    }
+    project->sourceBin()->detach(&watcher);
+    EXPECT_GE(calls, 8);
+    EXPECT_EQ(underLock, 0);
+}
+
+TEST_F(SourceCommandTest, ClipsRefuseSourcesOfAnotherProjectAndSwapsCheckEveryClipFirst) {
+    loader->set("mute.mov", {stream(TrackType::Video, 0, 3000, 600)});
+    const SourcePtr a = project->loadSource("a.mov"), mute = project->loadSource("mute.mov");
+    const auto picture = VMFile::create(a, 0, 0);
+    const auto sound = AMFile::create(a, 1, 0);
+    track->addMedia(picture, 0);
+    track->addMedia(sound, 500);
+    EXPECT_THROW(project->timeline()->swapSourceForTimelineMedias(a, mute), IndexException);
+    EXPECT_EQ(picture->source(), a); // the picture could have played it, but the sound cannot
+    const ProjectPtr other = Project::create(30, 1);
+    EXPECT_THROW(picture->setSource(other->loadSource("a.mov")), AddRemoveException);
+    EXPECT_THROW(project->sourceBin()->insertSource(other->loadSource("b.mov"), -1), AddRemoveException);
+    EXPECT_EQ(picture->source(), a);
+}
+
 TEST_F(SourceCommandTest, RateChangesReachSourcesInTheBinInTheHistoryAndOnTheTimeline) {
     const SourcePtr a = project->loadSource("a.mov"), b = project->loadSource("b.mov");
     const auto clip = VMFile::create(a, 0, 0);
@@ -203,6 +287,8 @@ TEST_F(SourceCommandTest, RateChangesReachSourcesInTheBinInTheHistoryAndOnTheTim
     EXPECT_EQ(b->mediaForTrackNumber(0)->duration(), 300);
 
     EXPECT_THROW(project->setEditRate(boost::rational<unsigned long>(0)), VelaMediaLibException);
+    EXPECT_THROW(Project::create(30, 1)->setEditRate(boost::rational<unsigned long>(0)),
+                 VelaMediaLibException);
     EXPECT_EQ(project->editRate(), boost::rational<unsigned long>(60));
     EXPECT_EQ(a->editRate(), boost::rational<unsigned long>(60));
     EXPECT_EQ(b->mediaForTrackNumber(0)->duration(), 300);

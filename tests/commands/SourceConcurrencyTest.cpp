@@ -59,7 +59,14 @@ TEST(SourceConcurrencyTest, ReadersSeeWholeSourcesWhileTheBinAndLoadersChange) {
             MediaFileStats::removeStatsLoader(unhelpful);
         }
     };
-    std::thread readers[] = {std::thread(read, 0), std::thread(read, 1), std::thread(churn)};
+    auto importer = [&] { // loads meet the rate changes of the editing thread
+        for (int i = 0; !done.load(); ++i) {
+            table->set("imported" + std::to_string(i) + ".mov", {stream(TrackType::Video, 0, 600, 600)});
+            project->loadSource("imported" + std::to_string(i) + ".mov");
+        }
+    };
+    std::thread readers[] = {std::thread(read, 0), std::thread(read, 1), std::thread(churn),
+                             std::thread(importer)};
     for (int round = 0; round < 40; ++round) {
         for (int i = 2; i < kFiles; ++i) project->execute(LoadSourceCmd::create(pathOf(i)));
         project->timeline()->swapSourceForTimelineMedias(round % 2 ? second : first,
@@ -71,5 +78,6 @@ TEST(SourceConcurrencyTest, ReadersSeeWholeSourcesWhileTheBinAndLoadersChange) {
     done = true;
     for (std::thread& reader : readers) reader.join();
     EXPECT_EQ(wrong.load(), 0);
-    EXPECT_EQ(project->sourceBin()->numSources(), 2u);
+    for (const SourcePtr& source : project->sourceBin()->sources())
+        EXPECT_EQ(source->editRate(), project->editRate()) << source->filename();
 }

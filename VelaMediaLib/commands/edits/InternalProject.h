@@ -46,9 +46,10 @@ public:
     void detachEditRateObserver(Observer* observer) const override {
         editRate_.detachEditRateObserver(observer);
     }
-    /// Every source of the bin takes the rate first, and the timeline's clips
-    /// their streams' new limits; refused whole (VelaMediaLibException) when a
-    /// source's stream would have no length at the rate.
+    /// Every source of the bin takes the rate first (under one write lock, so
+    /// no source comes or goes meanwhile), then the timeline's clips their
+    /// streams' new limits, and the rate's observers are told last. Throws
+    /// VelaMediaLibException "an edit rate must be greater than 0" for 0.
     void setEditRate(const boost::rational<unsigned long>& rate) override;
 
     // Observation

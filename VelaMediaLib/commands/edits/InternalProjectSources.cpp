@@ -4,27 +4,37 @@
 #include <VelaMediaLib/model/source/FileSystem.h>
 #include <VelaMediaLib/model/source/MediaFileStats.h>
 #include <VelaMediaLib/model/source/Source.h>
+#include <VelaMediaLib/time/sync/NotifyDelay.h>
 
 namespace VelaMediaLib {
 
 void InternalProject::setEditRate(const boost::rational<unsigned long>& rate) {
-    const SourceBin::Sources sources = sourceBin_->sources();
+    if (rate.numerator() == 0) throw VelaMediaLibException("an edit rate must be greater than 0");
+    SourceBin::Sources sources;
+    std::vector<SourceRefit> refits;
     {
-        // Every source must be able to take the rate before any does.
+        // Every source must be able to take the rate before any does, and no
+        // source comes or goes meanwhile.
         ScopedWriteLock lock(token());
-        std::vector<Source::Refit> refits;
+        sources = sourceBin_->sources();
         for (const SourcePtr& source : sources) refits.push_back(source->refitFor(source->stats(), rate));
-        for (size_t i = 0; i < sources.size(); ++i) sources[i]->take(refits[i]);
+        for (size_t i = 0; i < sources.size(); ++i) sources[i]->swapIn(refits[i]);
+        editRate_.storeEditRate(rate);
     }
-    editRate_.setEditRate(rate); // then the project, telling its observers outside the lock
-    for (const SourcePtr& source : sources) refitInstancesOf(source);
+    for (size_t i = 0; i < sources.size(); ++i) {
+        sources[i]->settle(refits[i]);
+        refitInstancesOf(sources[i]);
+    }
+    editRate_.notifyEditRateObservers(); // once everything has the rate
 }
 
 int InternalProject::unloadSource(const boost::shared_ptr<Source>& source) {
-    ScopedWriteLock lock(token()); // no clip may be placed between the check and the removal
-    if (timeline_->hasInstanceOf(source))
-        throw VelaMediaLibException("unable to remove a source that still has instances on the timeline.");
-    return sourceBin_->removeSource(source);
+    // Checked under the bin's write lock: no clip is placed between the check and the removal.
+    return sourceBin_->removeSource(source, [&] {
+        if (timeline_->hasInstanceOf(source))
+            throw VelaMediaLibException(
+                "unable to remove a source that still has instances on the timeline.");
+    });
 }
 
 void InternalProject::refitInstancesOf(const boost::shared_ptr<Source>& source) const {
@@ -34,10 +44,10 @@ void InternalProject::refitInstancesOf(const boost::shared_ptr<Source>& source) 
 bool InternalProject::bringSourceOnline(const boost::shared_ptr<Source>& source) {
     if (!sourceBin_->containsSource(source)) throw AddRemoveException("source is not in the source bin");
     if (source->isOnline()) return true;
-    const std::string path = source->filename();
     if (source->offlineStatus() != OfflineStatus::Reconnectable) return false;
+    const NotifyDelay delay(token().lock()); // the bin's sentries hear once everything is back
     try {
-        source->setStats(MediaFileStats::create(path, token())); // whole or not at all
+        sourceBin_->changeSourcesFile(source, source->filename()); // whole or not at all
     } catch (const std::exception&) {
         return false; // the file changed again since it was asked about, or no longer matches
     }
@@ -54,6 +64,7 @@ void InternalProject::dropSourceOffline(const boost::shared_ptr<Source>& source)
 }
 
 void InternalProject::changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
+    const NotifyDelay delay(token().lock()); // the bin's sentries hear once the clips have the new limits
     sourceBin_->changeSourcesFile(source, path);
     refitInstancesOf(source);
 }

@@ -35,6 +35,13 @@ public:
     void dispatch(ConstMediaDispatcher& dispatcher) const override;
     void mediaSourceChanged() override { takeStreamLimits(*this); }
 
+protected:
+    /// An undone edit finds the stream as it is now (the project's rate may
+    /// have changed since).
+    MediaState restoredLimits(const MediaState& restored) const override {
+        return withOwnStreamLimits(restored);
+    }
+
 private:
     AMFile(const SourceLink& link, const MediaState& initial);
 };

@@ -7,6 +7,7 @@
 #include <VelaMediaLib/time/rational/RationalUtil.h>
 
 #include <algorithm>
+#include <cstdlib>
 
 namespace VelaMediaLib {
 
@@ -25,7 +26,7 @@ SourceLink SourceLink::ownedBy(const boost::shared_ptr<const Source>& source, in
 }
 
 FileMedia::FileMedia(const SourceLink& link, StreamFilter plays)
-    : strong_(link.strong), weak_(link.weak), stream_(link.stream), plays_(plays) {
+    : strong_(link.strong), weak_(link.weak), stream_(link.stream), plays_(plays), token_(tokenOf(link)) {
     if (link.source()) checkStream(link, plays);
 }
 
@@ -35,7 +36,11 @@ boost::shared_ptr<const Source> FileMedia::source() const {
 }
 
 void FileMedia::checkSource(const boost::shared_ptr<const Source>& source) const {
-    if (source) checkStream(SourceLink::holding(source, stream_), plays_);
+    if (!source) return;
+    const boost::weak_ptr<const ThreadSafe> theirs = source->projectMutex();
+    if (token_.owner_before(theirs) || theirs.owner_before(token_))
+        throw AddRemoveException("the source belongs to another project");
+    checkStream(SourceLink::holding(source, stream_), plays_);
 }
 
 void FileMedia::setSource(const boost::shared_ptr<const Source>& source) {
@@ -120,12 +125,20 @@ MediaState FileMedia::withStreamLimits(MediaState state, const Source& source, i
     return state;
 }
 
-void FileMedia::takeStreamLimits(Media& clip) const {
+MediaState FileMedia::withOwnStreamLimits(const MediaState& state) const {
     const boost::shared_ptr<const Source> playing = source();
-    if (!playing) return;
+    return playing ? withStreamLimits(state, *playing, stream_) : state;
+}
+
+void FileMedia::takeStreamLimits(Media& clip) const {
     const MediaState now = clip.state();
-    const MediaState next = withStreamLimits(now, *playing, stream_);
-    if (next != now) clip.restoreState(next, 0);
+    const MediaState next = withOwnStreamLimits(now);
+    if (next == now) return;
+    // Only the limits change, widened around the slice: the restore checks
+    // pass, allowing the clip the rounding it already has.
+    const VelaTime rounding = std::abs(
+        RationalUtil::toVelaTime(RationalUtil::Round(now.mediaDuration * now.scalar)) - now.duration);
+    clip.restoreState(next, rounding);
 }
 
 } // namespace VelaMediaLib

@@ -41,8 +41,9 @@ public:
     /// clip (mediaSourceChanged) so that it takes the new stream's limits.
     /// Refuses, as checkSource does, a source the clip cannot play.
     void setSource(const boost::shared_ptr<const Source>& source) override;
-    /// Throws unless the source has the clip's stream, of a kind the clip
-    /// plays (the exceptions of checkStream); null passes.
+    /// Throws unless the source is of the clip's project (AddRemoveException)
+    /// and has the clip's stream, of a kind the clip plays (the exceptions of
+    /// checkStream); null passes.
     void checkSource(const boost::shared_ptr<const Source>& source) const override;
     /// Whether the clip is one of its source's own.
     bool isSourcesOwnMedia() const { return !weak_.expired() && !boost::atomic_load(&strong_); }
@@ -92,8 +93,11 @@ protected:
         return Kind::create(link,
                             stateFor(link, Kind::playsStream, start, mediaStart, mediaDuration, scalar));
     }
-    /// Gives the clip the limits of its source's stream (after a change of source).
+    /// Gives the clip the limits of its source's stream (after a change of
+    /// source, file or rate); the clip's slice, speed and place stay.
     void takeStreamLimits(Media& clip) const;
+    /// The state with the limits of the source's stream as it is now.
+    MediaState withOwnStreamLimits(const MediaState& state) const;
     /// Checks the link (checkStream) when it leads to a source.
     FileMedia(const SourceLink& link, StreamFilter plays);
     /// A link like this clip's, holding the source strongly (for clones).
@@ -104,6 +108,7 @@ private:
     const boost::weak_ptr<const Source> weak_;
     const int stream_;
     const StreamFilter plays_;
+    const boost::weak_ptr<const ThreadSafe> token_; // the clip's project
 };
 
 } // namespace VelaMediaLib

@@ -132,7 +132,7 @@ MediaState MediaImpl::lockedStateAfter(const TimingEdit& edit) const {
     case TimingEdit::Stretch:
         return editor_->stretch(state_, edit.factor);
     case TimingEdit::Restore:
-        return editor_->restoreState(*edit.saved, edit.amount);
+        return restoredLimits(editor_->restoreState(*edit.saved, edit.amount));
     }
     return state_;
 }

@@ -112,6 +112,9 @@ public:
 
 protected:
     MediaState stateAfter(const TimingEdit& edit) const override;
+    /// The limits a restored state takes: the saved ones here; a kind whose
+    /// limits follow its source gives the source's present ones.
+    virtual MediaState restoredLimits(const MediaState& restored) const { return restored; }
     bool takeStateUnnotified(const MediaState& next) override;
     /// Carries a timing edit out: through the clip's track when it has one,
     /// on the clip alone otherwise; notifies when something changed.

@@ -32,6 +32,11 @@ public:
     void mediaSourceChanged() override;
 
 protected:
+    /// An undone edit finds the stream as it is now (the project's rate may
+    /// have changed since).
+    MediaState restoredLimits(const MediaState& restored) const override {
+        return withOwnStreamLimits(restored);
+    }
     VMFile(const SourceLink& link, const MediaState& initial, StreamFilter plays = playsStream);
 };
 

@@ -100,20 +100,30 @@ boost::shared_ptr<Source> SourceBin::loadFileAtIndex(const std::string& path, in
     // Reading the file may take long: no lock is held meanwhile.
     const boost::shared_ptr<Source> source = Source::create(rate_, projectMutex(), path, fileSystem);
     const std::string key = keyOf(path);
+    std::vector<SourceRefit> settle;
     {
         ScopedWriteLock lock(projectMutex());
         // Another thread may have loaded the file meanwhile; its source wins.
         if (const boost::shared_ptr<Source> loaded = lockedSourceForKey(key)) return loaded;
         if (index > static_cast<int>(sources_.size())) throw IndexException("source index out of range");
-        lockedInsert(source, key, index);
+        lockedInsert(source, key, index, settle);
     }
+    for (const SourceRefit& refit : settle) source->settle(refit);
     if (added) *added = true;
     notify();
     return source;
 }
 
-void SourceBin::lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index) {
+void SourceBin::lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index,
+                             std::vector<SourceRefit>& settle) {
     if (sources_.size() >= sources_.max_size()) throw VelaMediaLibException("list too long");
+    // The project's rate may have changed since the source was made, or while
+    // an undo step kept it: it comes in at the present one.
+    const boost::shared_ptr<ProjectEditRate> rate = rate_.lock();
+    if (rate && source->editRate() != rate->editRate()) {
+        settle.push_back(source->refitFor(source->stats(), rate->editRate()));
+        source->swapIn(settle.back());
+    }
     const auto at =
         index < 0 || index > static_cast<int>(sources_.size()) ? sources_.end() : sources_.begin() + index;
     sources_.insert(at, source);
@@ -127,25 +137,26 @@ void SourceBin::insertSource(const boost::shared_ptr<Source>& source, int index)
         projectMutex().owner_before(source->projectMutex()))
         throw AddRemoveException("the source belongs to another project");
     if (index < -1) throw IndexException("source index out of range");
-    const boost::shared_ptr<ProjectEditRate> rate = rate_.lock();
+    std::vector<SourceRefit> settle;
     {
         ScopedWriteLock lock(projectMutex());
         const std::string key = keyOf(source->filename());
         if (keys_.count(source.get()) || byPath_.count(key))
             throw AddRemoveException("the source bin already holds a source of this file");
-        // A source kept by an undo step comes back at the project's present rate.
-        if (rate && source->editRate() != rate->editRate()) source->setEditRate(rate->editRate());
-        lockedInsert(source, key, index);
+        lockedInsert(source, key, index, settle);
     }
+    for (const SourceRefit& refit : settle) source->settle(refit);
     notify();
 }
 
-int SourceBin::removeSource(const boost::shared_ptr<const Source>& source) {
+int SourceBin::removeSource(const boost::shared_ptr<const Source>& source,
+                            const boost::function<void()>& check) {
     int index = -1;
     {
         ScopedWriteLock lock(projectMutex());
         const auto key = keys_.find(source.get());
         if (key == keys_.end()) throw AddRemoveException("source is not in the source bin");
+        if (check) check();
         const auto found = std::find(sources_.begin(), sources_.end(), source);
         index = static_cast<int>(found - sources_.begin());
         byPath_.erase(key->second);
@@ -156,30 +167,36 @@ int SourceBin::removeSource(const boost::shared_ptr<const Source>& source) {
     return index;
 }
 
-template <typename Change>
-void SourceBin::refile(const boost::shared_ptr<Source>& source, const std::string& path, Change change) {
-    const std::string key = keyOf(path);
-    {
-        ScopedWriteLock lock(projectMutex());
-        const auto held = keys_.find(source.get());
-        if (held == keys_.end()) throw AddRemoveException("source is not in the source bin");
-        const boost::shared_ptr<Source> holder = lockedSourceForKey(key);
-        if (holder && holder != source) throw AddRemoveException("another source has the file: " + path);
-        change();
-        byPath_.erase(held->second);
-        byPath_[key] = source;
-        held->second = key;
-    }
-    notify();
+void SourceBin::lockedRefile(const boost::shared_ptr<Source>& source, const std::string& key) {
+    const auto held = keys_.find(source.get());
+    if (held == keys_.end()) throw AddRemoveException("source is not in the source bin");
+    const boost::shared_ptr<Source> holder = lockedSourceForKey(key);
+    if (holder && holder != source) throw AddRemoveException("another source has the file: " + key);
+    byPath_.erase(held->second);
+    byPath_[key] = source;
+    held->second = key;
 }
 
 void SourceBin::changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
     const boost::shared_ptr<MediaFileStats> stats = MediaFileStats::create(path, projectMutex());
-    refile(source, path, [&] { source->setStats(stats); });
+    SourceRefit refit;
+    {
+        ScopedWriteLock lock(projectMutex());
+        refit = source->refitFor(stats, source->editRate()); // may refuse: nothing changed yet
+        lockedRefile(source, keyOf(path));
+        source->swapIn(refit);
+    }
+    source->settle(refit);
+    notify();
 }
 
 void SourceBin::renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
-    refile(source, path, [&] { source->setFilename(path); });
+    {
+        ScopedWriteLock lock(projectMutex());
+        lockedRefile(source, keyOf(path));
+    }
+    source->setFilename(path); // the record tells its observers, outside the lock
+    notify();
 }
 
 void SourceBin::setFileSystem(const boost::shared_ptr<FileSystem>& fileSystem) {

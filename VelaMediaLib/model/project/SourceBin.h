@@ -6,6 +6,7 @@
 #include <VelaMediaLib/time/sync/Subject.h>
 
 #include <boost/enable_shared_from_this.hpp>
+#include <boost/function.hpp>
 #include <boost/shared_ptr.hpp>
 #include <string>
 #include <unordered_map>
@@ -16,6 +17,7 @@ namespace VelaMediaLib {
 class FileSystem;
 class ProjectEditRate;
 class Source;
+struct SourceRefit;
 
 /// The project's imported sources, in the order they came, with an index by
 /// file path. Paths are compared as text after removing empty and "."
@@ -63,8 +65,10 @@ public:
     /// "list too long" when full.
     void insertSource(const boost::shared_ptr<Source>& source, int index);
     /// Takes the source out; returns where it was. Throws AddRemoveException
-    /// "source is not in the source bin".
-    int removeSource(const boost::shared_ptr<const Source>& source);
+    /// "source is not in the source bin", and what `check` throws: it runs
+    /// under the write lock, just before the removal.
+    int removeSource(const boost::shared_ptr<const Source>& source,
+                     const boost::function<void()>& check = boost::function<void()>());
     /// Gives the source another file whose streams match its own (see
     /// MediaFileStats::areCompatibleForChange); its own clips take the new
     /// streams' ranges. Throws, changing nothing, VelaMediaLibException "file
@@ -85,12 +89,14 @@ private:
     static bool isNormal(const std::string& path);
     static std::string keyOf(const std::string& path);
     boost::shared_ptr<Source> lockedSourceForKey(const std::string& key) const;
-    /// Puts the source in the list and the index; the write lock is held.
-    void lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index);
-    /// Under one write lock: checks that the bin holds the source and no other
-    /// source has the path, lets `change` act, and files the source under the path.
-    template <typename Change>
-    void refile(const boost::shared_ptr<Source>& source, const std::string& path, Change change);
+    /// Puts the source in the list and the index, bringing it to the
+    /// project's present rate; the write lock is held. A source whose clips
+    /// must settle once the lock is released adds its refit to `settle`.
+    void lockedInsert(const boost::shared_ptr<Source>& source, const std::string& key, int index,
+                      std::vector<SourceRefit>& settle);
+    /// Checks that the bin holds the source and that no other source has the
+    /// key, and files the source under it; the write lock is held.
+    void lockedRefile(const boost::shared_ptr<Source>& source, const std::string& key);
 
     boost::weak_ptr<ProjectEditRate> rate_;
     boost::shared_ptr<FileSystem> fileSystem_;

@@ -57,6 +57,7 @@ Source::Source(const boost::weak_ptr<ProjectEditRate>& rate, const boost::weak_p
     const boost::shared_ptr<ProjectEditRate> project = rate.lock();
     if (!project) throw VelaMediaLibException("a source needs the edit rate of its project");
     editRate_ = project->editRate();
+    if (editRate_.numerator() == 0) throw VelaMediaLibException("a source needs an edit rate greater than 0");
 }
 
 Source::~Source() = default;
@@ -184,13 +185,13 @@ std::vector<boost::shared_ptr<ParameterInterface>> Source::parameterVector(int s
     return parameters;
 }
 
-Source::Refit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
-                               const boost::rational<unsigned long>& rate) const {
+SourceRefit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
+                             const boost::rational<unsigned long>& rate) const {
     if (!stats) throw VelaMediaLibException("a source needs the stats of its file");
     const MediaFileStats::Contents contents = stats->contents();
     if (stats != this->stats() && !stats->areCompatibleForChange(*this->stats()))
         throw VelaMediaLibException("file is not compatible with the source's file: " + contents.filename);
-    Refit refit{stats, rate, {}};
+    SourceRefit refit{stats, rate, {}};
     for (size_t stream = 0; stream < streamMedia_.size(); ++stream) {
         const MediaPtr& media = streamMedia_[stream];
         if (!media || boost::dynamic_pointer_cast<AbstractIMFile>(media)) {
@@ -206,13 +207,36 @@ Source::Refit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
     return refit;
 }
 
-void Source::take(const Refit& refit) {
-    ScopedWriteLock lock(projectMutex()); // readers see the stats and the clips change together
+void Source::swapIn(const SourceRefit& refit) {
+    ScopedWriteLock lock(projectMutex()); // the caller's, taken again
     stats_ = refit.stats;
     editRate_ = refit.rate;
+}
+
+void Source::settle(const SourceRefit& refit) {
     for (size_t stream = 0; stream < streamMedia_.size(); ++stream)
         if (streamMedia_[stream] && streamMedia_[stream]->state() != refit.states[stream])
-            streamMedia_[stream]->restoreState(refit.states[stream], 0); // alone on its track: cannot collide
+            streamMedia_[stream]->restoreState(refit.states[stream], 0);
+}
+
+void Source::setEditRate(const boost::rational<unsigned long>& rate) {
+    SourceRefit refit;
+    {
+        ScopedWriteLock lock(projectMutex());
+        refit = refitFor(stats(), rate);
+        swapIn(refit);
+    }
+    settle(refit);
+}
+
+void Source::setStats(const boost::shared_ptr<MediaFileStats>& stats) {
+    SourceRefit refit;
+    {
+        ScopedWriteLock lock(projectMutex());
+        refit = refitFor(stats, editRate());
+        swapIn(refit);
+    }
+    settle(refit);
 }
 
 void Source::setFilename(const std::string& path) { stats()->setFilename(path); }

@@ -28,6 +28,15 @@ class ProjectEditRate;
 class ThreadSafe;
 class Timeline;
 
+/// What a change of file or rate gives a source: the stats, the rate, and
+/// the states its own clips take (stills keep theirs). Made and taken by the
+/// source, its bin and its project.
+struct SourceRefit {
+    boost::shared_ptr<MediaFileStats> stats;
+    boost::rational<unsigned long> rate;
+    std::vector<MediaState> states;
+};
+
 /// One imported media file of a project. It knows the file through its stats
 /// record, and plays each stream through a clip of its own, kept on a
 /// timeline of its own (one track per stream); clips placed on the project's
@@ -120,14 +129,6 @@ private:
     friend class SourceBin;
     friend class InternalProject;
 
-    /// What a change of file or rate gives the source: the stats, the rate,
-    /// and the states its own clips take (stills keep theirs).
-    struct Refit {
-        boost::shared_ptr<MediaFileStats> stats;
-        boost::rational<unsigned long> rate;
-        std::vector<MediaState> states;
-    };
-
     Source(const boost::weak_ptr<ProjectEditRate>& rate, const boost::weak_ptr<const ThreadSafe>& token,
            const boost::shared_ptr<MediaFileStats>& stats, const boost::shared_ptr<FileSystem>& fileSystem);
     void buildStreamMedia();
@@ -137,18 +138,26 @@ private:
     }
     MediaPtr makeStreamMedia(int stream) const;
 
-    // Changes, made by the project and its source bin, whole or not at all
+    // Changes, made by the project and its source bin, whole or not at all.
+    // A change is computed (refitFor), swapped in under the project's write
+    // lock with the rest of the caller's change (swapIn), and then the
+    // source's own clips take their states once the lock is released
+    // (settle), so that their observers never run under the write lock.
+
     /// The refit for other stats and rate. Throws VelaMediaLibException "file
     /// is not compatible with the source's file: <path>" for stats whose
     /// streams do not match (MediaFileStats::areCompatibleForChange), and
     /// "stream <i> of <path> has no length at this edit rate" when a stream
     /// one of the source's clips plays would have none.
-    Refit refitFor(const boost::shared_ptr<MediaFileStats>& stats,
-                   const boost::rational<unsigned long>& rate) const;
-    /// Takes a refit under the project's write lock: cannot fail.
-    void take(const Refit& refit);
-    void setEditRate(const boost::rational<unsigned long>& rate) { take(refitFor(stats(), rate)); }
-    void setStats(const boost::shared_ptr<MediaFileStats>& stats) { take(refitFor(stats, editRate())); }
+    SourceRefit refitFor(const boost::shared_ptr<MediaFileStats>& stats,
+                         const boost::rational<unsigned long>& rate) const;
+    /// Takes the refit's stats and rate; the caller holds the write lock.
+    void swapIn(const SourceRefit& refit);
+    /// Gives the source's own clips their refitted states: alone on their
+    /// tracks and consistent, they cannot refuse.
+    void settle(const SourceRefit& refit);
+    void setEditRate(const boost::rational<unsigned long>& rate);
+    void setStats(const boost::shared_ptr<MediaFileStats>& stats);
     /// Renames the file: the stats record keeps its streams.
     void setFilename(const std::string& path);
 

@@ -15,11 +15,13 @@ boost::rational<unsigned long> SimpleProjectEditRate::editRate() const {
 }
 
 void SimpleProjectEditRate::setEditRate(const boost::rational<unsigned long>& rate) {
-    {
-        std::lock_guard<std::mutex> lock(rateMutex_);
-        rate_ = rate;
-    }
-    subject_.notify();
+    storeEditRate(rate);
+    notifyEditRateObservers();
+}
+
+void SimpleProjectEditRate::storeEditRate(const boost::rational<unsigned long>& rate) {
+    std::lock_guard<std::mutex> lock(rateMutex_);
+    rate_ = rate;
 }
 
 } // namespace VelaMediaLib

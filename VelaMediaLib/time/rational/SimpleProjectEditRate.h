@@ -30,6 +30,10 @@ public:
     void detachEditRateObserver(Observer* observer) const override { subject_.detach(observer); }
     /// Stores the rate, then notifies every attached observer.
     void setEditRate(const boost::rational<unsigned long>& rate) override;
+    /// The two steps apart, for an owner that changes more with the rate
+    /// and tells the observers once all of it is done.
+    void storeEditRate(const boost::rational<unsigned long>& rate);
+    void notifyEditRateObservers() { subject_.notify(); }
     /// The project whose lock and delays its observers are told under, like
     /// every other subject of that project. Set before the rate is shared.
     void setProjectMutex(const boost::weak_ptr<const ThreadSafe>& token) { subject_.setProjectMutex(token); }
