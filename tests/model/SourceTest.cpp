@@ -43,9 +43,15 @@ TEST_F(SourceTest, LoadingAFileTwiceGivesItsOneSource) {
     EXPECT_FALSE(bin->isFileLoaded("other.mov"));
     EXPECT_EQ(loader->asked, 1); // the second loads never read the file
 
-    const SourcePtr voice = bin->loadFileAtIndex("voice.wav", 0);
-    EXPECT_EQ(bin->sources(), (SourceBin::Sources{voice, movie}));
+    bool added = true;
+    EXPECT_EQ(bin->loadFileAtIndex("movie.mov", 0, &added), movie);
+    EXPECT_FALSE(added);
+    const SourcePtr voice = bin->loadFileAtIndex("voice.wav", 0, &added);
+    EXPECT_TRUE(added);
+    const SourcePtr still = bin->loadFileAtIndex("still.png", 2); // the end is a place too
+    EXPECT_EQ(bin->sources(), (SourceBin::Sources{voice, movie, still}));
     EXPECT_EQ(bin->indexOfSource(movie), 1);
+    EXPECT_NE(movie->stats()->contents(), voice->stats()->contents());
 }
 
 TEST_F(SourceTest, BadFilesAndIndexesLeaveTheBinAsItWas) {
@@ -83,6 +89,9 @@ TEST_F(SourceTest, StreamsAreMeasuredInTheProjectsTicksExactly) {
     EXPECT_EQ(movie->rationalTimeRangeForTrack(0), Range<SafeRational>(SafeRational(15), SafeRational(300)));
     EXPECT_EQ(movie->timeRangeForTrack(1), Range<VelaTime>(0, 60));
     EXPECT_EQ(movie->timeRange(), Range<VelaTime>(0, 315));
+    loader->set("late.mov",
+                {stream(TrackType::Video, 1200, 600, 600), stream(TrackType::Audio, 96000, 48000, 48000)});
+    EXPECT_EQ(load("late.mov")->timeRange(), Range<VelaTime>(60, 30)); // both from 2 s to 3 s
     loader->set("odd.wav", {stream(TrackType::Audio, 1, 1000, 48000, 1)});
     const SourcePtr odd = load("odd.wav"); // 1000 samples: 0.625 ticks from 1/1600
     EXPECT_EQ(odd->rationalTimeRangeForTrack(0),
