@@ -61,6 +61,7 @@ TEST_F(EditUndo, AddsRemovesAndEditsOfAClipElsewhere) {
     expectRefused(TrimEndCmd::create(outside, loose, 5));
     expectExactUndo(RemoveMediaCmd::create(track, loose));
     EXPECT_FALSE(track->hasMedia(loose));
+    expectRefused(RemoveMediaCmd::create(track, MediaPtr())); // no clip to take off
 }
 
 TEST_F(EditUndo, ClosingGapsMovesInAnOrderWithoutCollisions) {

@@ -91,6 +91,34 @@ TEST_F(SourceCommandTest, ASourceOnTheTimelineCannotBeUnloaded) {
     EXPECT_EQ(boost::dynamic_pointer_cast<VMFile>(clip)->source(), a); // the clip still plays it
 }
 
+/// Loads the file itself while the command reads it, as another thread might.
+class RacingLoader : public StatsLoader {
+public:
+    explicit RacingLoader(const ProjectPtr& project) : project_(project) {}
+    bool loadStats(const std::string& path, MediaFileStats& stats) override {
+        if (path != "race.mov") return false;
+        if (!racing_) {
+            racing_ = true;
+            project_->loadSource(path);
+        }
+        stats.addTrackStats(stream(TrackType::Video, 0, 600, 600));
+        return true;
+    }
+
+private:
+    ProjectPtr project_;
+    bool racing_ = false;
+};
+
+TEST_F(SourceCommandTest, ALoadThatLosesARaceTakesNoEffect) {
+    const auto racing = boost::make_shared<RacingLoader>(project);
+    MediaFileStats::addStatsLoader(racing, 1);
+    EXPECT_FALSE(project->execute(LoadSourceCmd::create("race.mov")));
+    MediaFileStats::removeStatsLoader(racing);
+    EXPECT_EQ(project->sourceBin()->numSources(), 1u);
+    EXPECT_TRUE(project->commandHistory()->undoStack().empty());
+}
+
 TEST_F(SourceCommandTest, CommandsNeedAProjectAndASource) {
     EXPECT_THROW(LoadSourceCmd::create("a.mov")->execute(nullptr), VelaMediaLibException);
     EXPECT_THROW(LoadSourceCmd::create(SourcePtr()), VelaMediaLibException);
