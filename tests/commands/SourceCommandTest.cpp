@@ -330,4 +330,68 @@ TEST_F(SourceCommandTest, RedoFindsItsPlaceAfterTheBinShrankOutsideTheHistory) {
     EXPECT_EQ(sources(), (SourceBin::Sources{b, c}));
 }
 
+TEST_F(SourceCommandTest, AChangeMadeWhileAnotherIsToldLeavesNoStaleClip) {
+    const SourcePtr a = project->loadSource("a.mov");
+    loader->set("longer.mov",
+                {stream(TrackType::Video, 0, 6000, 600), stream(TrackType::Audio, 0, 96000, 48000, 2)});
+    bool once = false;
+    LambdaObserverWithoutNotifyDelay watcher([&](Observable*) {
+        if (once) return;
+        once = true;
+        project->setEditRate(boost::rational<unsigned long>(60));
+    });
+    a->mediaForTrackNumber(0)->attachWithoutNotifyDelay(&watcher);
+    project->changeSourcesFile(a, "longer.mov");
+    a->mediaForTrackNumber(0)->detach(&watcher);
+    EXPECT_EQ(a->mediaForTrackNumber(0)->duration(), 600); // 10 s at 60
+    EXPECT_EQ(a->mediaForTrackNumber(1)->duration(), 120); // 2 s at 60
+}
+
+TEST_F(SourceCommandTest, ASentryMayChangeASourcesFileWhileTheProjectDelivers) {
+    const SourcePtr a = project->loadSource("a.mov");
+    loader->set("longer.mov",
+                {stream(TrackType::Video, 0, 6000, 600), stream(TrackType::Audio, 0, 96000, 48000, 2)});
+    bool once = false;
+    LambdaObserverWithoutNotifyDelay changer([&](Observable*) {
+        if (once) return;
+        once = true;
+        project->changeSourcesFile(a, "longer.mov");
+    });
+    project->addSourceBinSentry(&changer); // held back: told while the history delivers
+    ASSERT_TRUE(project->execute(LoadSourceCmd::create("b.mov")));
+    project->sourceBin()->detach(&changer);
+    EXPECT_EQ(a->filename(), "longer.mov");
+}
+
+TEST_F(SourceCommandTest, UndoIsExactForAClipThatOutlivedItsLongerFile) {
+    loader->set("short.mov",
+                {stream(TrackType::Video, 0, 1500, 600), stream(TrackType::Audio, 0, 48000, 48000, 2)});
+    const SourcePtr a = project->loadSource("a.mov");
+    const auto clip = VMFile::create(a, 0, 0);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, clip, 0)));
+    project->changeSourcesFile(a, "short.mov"); // 75 ticks: the clip keeps its 150
+    const MediaState whole = clip->state();
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, clip, 100)));
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(75)); // no room left beyond the file
+    const MediaState trimmed = clip->state();
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, clip, 10)));
+    project->undo();
+    EXPECT_EQ(clip->state(), trimmed);
+    project->undo();
+    EXPECT_EQ(clip->state(), whole);
+}
+
+TEST_F(SourceCommandTest, AClipPutBackByAnUndoCannotReachPastItsFile) {
+    project->setEditRate(boost::rational<unsigned long>(60));
+    const SourcePtr a = project->loadSource("a.mov");
+    const auto clip = VMFile::create(a, 0, 0);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, clip, 0)));
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, clip, 200)));
+    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(track, clip)));
+    project->setEditRate(boost::rational<unsigned long>(30));
+    project->undo();
+    EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(150));
+    EXPECT_THROW(clip->trimEnd(-150), InvalidTrimRangeException);
+}
+
 } // namespace

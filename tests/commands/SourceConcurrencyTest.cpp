@@ -9,6 +9,7 @@
 #include <VelaMediaLib/model/project/Project.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
+#include <VelaMediaLib/time/rational/RationalUtil.h>
 
 #include <atomic>
 #include <gtest/gtest.h>
@@ -78,6 +79,11 @@ TEST(SourceConcurrencyTest, ReadersSeeWholeSourcesWhileTheBinAndLoadersChange) {
     done = true;
     for (std::thread& reader : readers) reader.join();
     EXPECT_EQ(wrong.load(), 0);
-    for (const SourcePtr& source : project->sourceBin()->sources())
+    for (const SourcePtr& source : project->sourceBin()->sources()) {
         EXPECT_EQ(source->editRate(), project->editRate()) << source->filename();
+        const SafeRational length = source->rationalTimeRangeForTrack(0).second();
+        EXPECT_EQ(source->mediaForTrackNumber(0)->duration(),
+                  RationalUtil::toVelaTime(RationalUtil::Round(length)))
+            << source->filename(); // its own clip is no older than its stats
+    }
 }

@@ -13,6 +13,8 @@
 
 namespace VelaMediaLib {
 
+class NotifyDelay;
+
 /// The one implementation of Project. It is its own command handler for
 /// commands that need no more than its tracks.
 class VELAMEDIALIB_API InternalProject : public VelaObject,
@@ -127,6 +129,8 @@ private:
     void init();
     /// The timeline's clips of the source take its streams' new ranges.
     void refitInstancesOf(const boost::shared_ptr<Source>& source) const;
+    /// A notify delay on the project, unless it is delivering one.
+    std::unique_ptr<NotifyDelay> delayed() const;
 
     SimpleProjectEditRate editRate_;
     PartSubject subject_{*this}; // notifies under the project's own token

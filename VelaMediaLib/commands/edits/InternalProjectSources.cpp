@@ -8,6 +8,14 @@
 
 namespace VelaMediaLib {
 
+std::unique_ptr<NotifyDelay> InternalProject::delayed() const {
+    // While the project delivers held-back notifications no delay may open:
+    // an observer acting here is told at once.
+    const boost::shared_ptr<const ThreadSafe> project = token().lock();
+    if (!project || NotifyDelay::isNotifying(project)) return nullptr;
+    return std::unique_ptr<NotifyDelay>(new NotifyDelay(project));
+}
+
 void InternalProject::setEditRate(const boost::rational<unsigned long>& rate) {
     if (rate.numerator() == 0) throw VelaMediaLibException("an edit rate must be greater than 0");
     SourceBin::Sources sources;
@@ -45,7 +53,7 @@ bool InternalProject::bringSourceOnline(const boost::shared_ptr<Source>& source)
     if (!sourceBin_->containsSource(source)) throw AddRemoveException("source is not in the source bin");
     if (source->isOnline()) return true;
     if (source->offlineStatus() != OfflineStatus::Reconnectable) return false;
-    const NotifyDelay delay(token().lock()); // the bin's sentries hear once everything is back
+    const std::unique_ptr<NotifyDelay> delay = delayed(); // the bin's sentries hear once all is back
     try {
         sourceBin_->changeSourcesFile(source, source->filename()); // whole or not at all
     } catch (const std::exception&) {
@@ -64,7 +72,7 @@ void InternalProject::dropSourceOffline(const boost::shared_ptr<Source>& source)
 }
 
 void InternalProject::changeSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
-    const NotifyDelay delay(token().lock()); // the bin's sentries hear once the clips have the new limits
+    const std::unique_ptr<NotifyDelay> delay = delayed(); // sentries hear once the clips have their limits
     sourceBin_->changeSourcesFile(source, path);
     refitInstancesOf(source);
 }

@@ -36,11 +36,10 @@ public:
     void mediaSourceChanged() override { takeStreamLimits(*this); }
 
 protected:
-    /// An undone edit finds the stream as it is now (the project's rate may
-    /// have changed since).
-    MediaState restoredLimits(const MediaState& restored) const override {
-        return withOwnStreamLimits(restored);
-    }
+    /// After every edit the limits are the stream's as it is now, widened to
+    /// the slice played: an undone edit finds the stream at the project's
+    /// present rate, and undoing gives back the limits the clip had.
+    MediaState editedLimits(const MediaState& edited) const override { return withOwnStreamLimits(edited); }
 
 private:
     AMFile(const SourceLink& link, const MediaState& initial);

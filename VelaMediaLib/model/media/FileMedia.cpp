@@ -37,6 +37,7 @@ boost::shared_ptr<const Source> FileMedia::source() const {
 
 void FileMedia::checkSource(const boost::shared_ptr<const Source>& source) const {
     if (!source) return;
+    if (token_.empty()) throw AddRemoveException("a file clip made without a source cannot take one");
     const boost::weak_ptr<const ThreadSafe> theirs = source->projectMutex();
     if (token_.owner_before(theirs) || theirs.owner_before(token_))
         throw AddRemoveException("the source belongs to another project");

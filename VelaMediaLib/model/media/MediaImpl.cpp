@@ -122,17 +122,17 @@ MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
 MediaState MediaImpl::lockedStateAfter(const TimingEdit& edit) const {
     switch (edit.kind) {
     case TimingEdit::Move:
-        return editor_->move(state_, edit.amount);
+        return editedLimits(editor_->move(state_, edit.amount));
     case TimingEdit::SetStart:
-        return editor_->move(state_, edit.amount - state_.start);
+        return editedLimits(editor_->move(state_, edit.amount - state_.start));
     case TimingEdit::TrimStart:
-        return editor_->trimStart(state_, edit.amount);
+        return editedLimits(editor_->trimStart(state_, edit.amount));
     case TimingEdit::TrimEnd:
-        return editor_->trimEnd(state_, edit.amount);
+        return editedLimits(editor_->trimEnd(state_, edit.amount));
     case TimingEdit::Stretch:
-        return editor_->stretch(state_, edit.factor);
+        return editedLimits(editor_->stretch(state_, edit.factor));
     case TimingEdit::Restore:
-        return restoredLimits(editor_->restoreState(*edit.saved, edit.amount));
+        return editedLimits(editor_->restoreState(*edit.saved, edit.amount));
     }
     return state_;
 }
@@ -153,20 +153,32 @@ MediaState MediaImpl::applyTimingEdit(const TimingEdit& edit) {
     bool changed = false;
     {
         ScopedWriteLock lock(projectMutex()); // the clip stays on (or off) its track meanwhile
-        const boost::shared_ptr<SubTimeline> container = parent_.lock();
-        if (const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(container)) {
-            track->editLocked(shared_from_this(), edit, changed, &next);
-        } else {
-            next = lockedStateAfter(edit);
-            changed = lockedTakeState(next);
-        }
+        changed = applyTimingEditLocked(edit, next);
     }
     if (changed) notify();
     return next;
 }
 
+bool MediaImpl::applyTimingEditLocked(const TimingEdit& edit, MediaState& next) {
+    ScopedWriteLock lock(projectMutex()); // the caller's, taken again
+    bool changed = false;
+    const boost::shared_ptr<SubTimeline> container = parent_.lock();
+    if (const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(container)) {
+        track->editLocked(shared_from_this(), edit, changed, &next);
+    } else {
+        next = lockedStateAfter(edit);
+        changed = lockedTakeState(next);
+    }
+    return changed;
+}
+
 void MediaImpl::restoreState(const MediaState& saved, VelaTime tolerance) {
     applyTimingEdit(TimingEdit::restore(saved, tolerance));
+}
+
+bool MediaImpl::restoreStateUnnotified(const MediaState& saved, VelaTime tolerance) {
+    MediaState next;
+    return applyTimingEditLocked(TimingEdit::restore(saved, tolerance), next);
 }
 
 void MediaImpl::move(VelaTime offset) { applyTimingEdit(TimingEdit::of(TimingEdit::Move, offset)); }

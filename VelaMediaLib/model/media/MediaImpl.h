@@ -55,6 +55,9 @@ public:
     MediaState state() const override;
     MediaState defaultState() const override;
     void restoreState(const MediaState& saved, VelaTime tolerance) override;
+    /// The same under the write lock the caller holds, telling no one:
+    /// returns whether the clip changed, and the caller then notifies it.
+    bool restoreStateUnnotified(const MediaState& saved, VelaTime tolerance);
     void move(VelaTime offset) override;
     void trimStart(VelaTime offset) override;
     void trimEnd(VelaTime offset) override;
@@ -112,13 +115,15 @@ public:
 
 protected:
     MediaState stateAfter(const TimingEdit& edit) const override;
-    /// The limits a restored state takes: the saved ones here; a kind whose
-    /// limits follow its source gives the source's present ones.
-    virtual MediaState restoredLimits(const MediaState& restored) const { return restored; }
+    /// The limits a clip takes after an edit: the edited state's own here; a
+    /// kind whose limits follow its source gives the source's present ones.
+    virtual MediaState editedLimits(const MediaState& edited) const { return edited; }
     bool takeStateUnnotified(const MediaState& next) override;
     /// Carries a timing edit out: through the clip's track when it has one,
     /// on the clip alone otherwise; notifies when something changed.
     MediaState applyTimingEdit(const TimingEdit& edit);
+    /// The same under the write lock the caller holds, without notifying.
+    bool applyTimingEditLocked(const TimingEdit& edit, MediaState& next);
 
     /// Gives a clone of this clip everything but its placement on a track:
     /// name, parameters, attributes, metadata, effects and edge modifications.

@@ -191,11 +191,13 @@ void SourceBin::changeSourcesFile(const boost::shared_ptr<Source>& source, const
 }
 
 void SourceBin::renameSourcesFile(const boost::shared_ptr<Source>& source, const std::string& path) {
+    bool renamed = false;
     {
         ScopedWriteLock lock(projectMutex());
         lockedRefile(source, keyOf(path));
+        renamed = source->stats()->setFilenameUnnotified(path);
     }
-    source->setFilename(path); // the record tells its observers, outside the lock
+    if (renamed) source->stats()->notify(); // the record's observers, outside the lock
     notify();
 }
 

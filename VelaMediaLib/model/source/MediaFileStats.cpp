@@ -216,11 +216,14 @@ void MediaFileStats::setContents(const Contents& contents) {
 }
 
 void MediaFileStats::setFilename(const std::string& filename) {
-    edit([&] {
-        if (contents_.filename == filename) return false;
-        contents_.filename = filename;
-        return true;
-    });
+    if (setFilenameUnnotified(filename)) notify();
+}
+
+bool MediaFileStats::setFilenameUnnotified(const std::string& filename) {
+    ScopedWriteLock lock(projectMutex());
+    if (contents_.filename == filename) return false;
+    contents_.filename = filename;
+    return true;
 }
 
 void MediaFileStats::addTrackStats(const TrackStats& stats) {

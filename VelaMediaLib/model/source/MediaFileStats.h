@@ -114,6 +114,9 @@ public:
 
     void setContents(const Contents& contents);
     void setFilename(const std::string& filename);
+    /// The same for an owner that renames under its write lock and notifies
+    /// after it; returns whether the name changed.
+    bool setFilenameUnnotified(const std::string& filename);
     void addTrackStats(const TrackStats& stats);
     /// Throws IndexException for a bad index, changing nothing.
     void setTrackStats(int index, const TrackStats& stats);

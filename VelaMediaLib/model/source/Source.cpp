@@ -191,7 +191,7 @@ SourceRefit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
     const MediaFileStats::Contents contents = stats->contents();
     if (stats != this->stats() && !stats->areCompatibleForChange(*this->stats()))
         throw VelaMediaLibException("file is not compatible with the source's file: " + contents.filename);
-    SourceRefit refit{stats, rate, {}};
+    SourceRefit refit{stats, rate, {}, {}};
     for (size_t stream = 0; stream < streamMedia_.size(); ++stream) {
         const MediaPtr& media = streamMedia_[stream];
         if (!media || boost::dynamic_pointer_cast<AbstractIMFile>(media)) {
@@ -207,16 +207,19 @@ SourceRefit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
     return refit;
 }
 
-void Source::swapIn(const SourceRefit& refit) {
+void Source::swapIn(SourceRefit& refit) {
     ScopedWriteLock lock(projectMutex()); // the caller's, taken again
     stats_ = refit.stats;
     editRate_ = refit.rate;
+    refit.changed.assign(streamMedia_.size(), false);
+    for (size_t stream = 0; stream < streamMedia_.size(); ++stream)
+        if (const auto clip = boost::dynamic_pointer_cast<MediaImpl>(streamMedia_[stream]))
+            refit.changed[stream] = clip->restoreStateUnnotified(refit.states[stream], 0);
 }
 
 void Source::settle(const SourceRefit& refit) {
-    for (size_t stream = 0; stream < streamMedia_.size(); ++stream)
-        if (streamMedia_[stream] && streamMedia_[stream]->state() != refit.states[stream])
-            streamMedia_[stream]->restoreState(refit.states[stream], 0);
+    for (size_t stream = 0; stream < refit.changed.size(); ++stream)
+        if (refit.changed[stream]) streamMedia_[stream]->notify();
 }
 
 void Source::setEditRate(const boost::rational<unsigned long>& rate) {

@@ -35,6 +35,7 @@ struct SourceRefit {
     boost::shared_ptr<MediaFileStats> stats;
     boost::rational<unsigned long> rate;
     std::vector<MediaState> states;
+    std::vector<bool> changed; // which clips took a new state, to be told
 };
 
 /// One imported media file of a project. It knows the file through its stats
@@ -139,10 +140,11 @@ private:
     MediaPtr makeStreamMedia(int stream) const;
 
     // Changes, made by the project and its source bin, whole or not at all.
-    // A change is computed (refitFor), swapped in under the project's write
-    // lock with the rest of the caller's change (swapIn), and then the
-    // source's own clips take their states once the lock is released
-    // (settle), so that their observers never run under the write lock.
+    // A change is computed (refitFor) and swapped in (swapIn) under one
+    // write lock with the rest of the caller's change, so that readers see
+    // the stats, the rate and the source's own clips change together; the
+    // clips that changed are told once the lock is released (settle), so
+    // that no observer runs under the write lock.
 
     /// The refit for other stats and rate. Throws VelaMediaLibException "file
     /// is not compatible with the source's file: <path>" for stats whose
@@ -151,10 +153,11 @@ private:
     /// one of the source's clips plays would have none.
     SourceRefit refitFor(const boost::shared_ptr<MediaFileStats>& stats,
                          const boost::rational<unsigned long>& rate) const;
-    /// Takes the refit's stats and rate; the caller holds the write lock.
-    void swapIn(const SourceRefit& refit);
-    /// Gives the source's own clips their refitted states: alone on their
-    /// tracks and consistent, they cannot refuse.
+    /// Takes the refit's stats, rate and clip states (alone on their tracks
+    /// and consistent, the clips cannot refuse); the caller holds the write
+    /// lock it computed the refit under.
+    void swapIn(SourceRefit& refit);
+    /// Tells the clips that changed.
     void settle(const SourceRefit& refit);
     void setEditRate(const boost::rational<unsigned long>& rate);
     void setStats(const boost::shared_ptr<MediaFileStats>& stats);
