@@ -47,8 +47,10 @@
 #include <VelaMediaLib/effects/Effectable.h>
 #include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/AbstractIMFile.h>
+#include <VelaMediaLib/model/media/AbstractUnifiedMedia.h>
 #include <VelaMediaLib/model/media/AudioMedia.h>
 #include <VelaMediaLib/model/media/AudioMediaImpl.h>
+#include <VelaMediaLib/model/media/AudioSide.h>
 #include <VelaMediaLib/model/media/Callout.h>
 #include <VelaMediaLib/model/media/Caption.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>

@@ -31,7 +31,7 @@ class Timeline;
 /// What a change of file or rate gives a source: the stats, the rate, and
 /// the states its own clips take (stills keep theirs). Made and taken by the
 /// source, its bin and its project.
-struct SourceRefit {
+struct VELAMEDIALIB_API SourceRefit {
     boost::shared_ptr<MediaFileStats> stats;
     boost::rational<unsigned long> rate;
     std::vector<MediaState> states;
