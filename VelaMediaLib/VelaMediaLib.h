@@ -57,6 +57,9 @@
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
 #include <VelaMediaLib/model/media/EdgeModification.h>
 #include <VelaMediaLib/model/media/FileMedia.h>
+#include <VelaMediaLib/model/media/Group.h>
+#include <VelaMediaLib/model/media/GroupChildrensTimeConverter.h>
+#include <VelaMediaLib/model/media/GroupMediaState.h>
 #include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/media/Media.h>

@@ -4,6 +4,7 @@
 #include <VelaMediaLib/model/media/Callout.h>
 #include <VelaMediaLib/model/media/Caption.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
+#include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
@@ -33,6 +34,8 @@ void MediaDispatcher::dispatchCallout(Callout& media) { dispatchAnyMedia(media);
 void MediaDispatcher::dispatchCaption(Caption& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchCallout(const Callout& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchCaption(const Caption& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchGroup(Group& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchGroup(const Group& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

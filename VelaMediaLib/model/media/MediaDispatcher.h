@@ -8,6 +8,7 @@ class AMFile;
 class Callout;
 class Caption;
 class ColorMedia;
+class Group;
 class IMFile;
 class Media;
 class PlaceholderMedia;
@@ -30,6 +31,7 @@ public:
     virtual void dispatchScreenIMFile(ScreenIMFile& media);
     virtual void dispatchCallout(Callout& media);
     virtual void dispatchCaption(Caption& media);
+    virtual void dispatchGroup(Group& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -48,6 +50,7 @@ public:
     virtual void dispatchScreenIMFile(const ScreenIMFile& media);
     virtual void dispatchCallout(const Callout& media);
     virtual void dispatchCaption(const Caption& media);
+    virtual void dispatchGroup(const Group& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

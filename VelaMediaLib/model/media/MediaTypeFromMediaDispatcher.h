@@ -19,6 +19,7 @@ public:
     void dispatchScreenIMFile(const ScreenIMFile&) override { type_ = "ScreenIMFile"; }
     void dispatchCallout(const Callout&) override { type_ = "Callout"; }
     void dispatchCaption(const Caption&) override { type_ = "Caption"; }
+    void dispatchGroup(const Group&) override { type_ = "Group"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);

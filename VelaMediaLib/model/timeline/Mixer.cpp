@@ -1,6 +1,7 @@
 #include <VelaMediaLib/model/timeline/Mixer.h>
 
 #include <VelaMediaLib/model/media/AudioMedia.h>
+#include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
@@ -97,10 +98,12 @@ std::vector<boost::shared_ptr<const Source>> Mixer::allSources() const {
 
 namespace {
 
+// A group is seen and heard through its children, which the list holds too.
 template <typename Kind>
 bool anyOf(const std::vector<MediaPtr>& clips) {
-    return std::any_of(clips.begin(), clips.end(),
-                       [](const MediaPtr& m) { return bool(boost::dynamic_pointer_cast<Kind>(m)); });
+    return std::any_of(clips.begin(), clips.end(), [](const MediaPtr& m) {
+        return !boost::dynamic_pointer_cast<Group>(m) && boost::dynamic_pointer_cast<Kind>(m);
+    });
 }
 
 } // namespace
@@ -161,9 +164,13 @@ boost::shared_ptr<Timeline> Mixer::enclosingTimeline() const {
     return group ? group->parentTimeline().lock() : boost::shared_ptr<Timeline>();
 }
 
+// A group's children count their time in the group's media, which its
+// children's converter maps from the group's own parametric time.
 TimeConverterPtr Mixer::parentTimeConverter() const {
     ScopedReadLock lock(projectLock());
-    if (const MediaPtr group = group_.lock()) return group;
+    const MediaPtr owner = group_.lock();
+    if (const auto group = boost::dynamic_pointer_cast<Group>(owner)) return group->childrensTimeConverter();
+    if (owner) return owner;
     return timeline_.lock();
 }
 

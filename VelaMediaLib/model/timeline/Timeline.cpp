@@ -1,5 +1,7 @@
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
+#include <VelaMediaLib/model/media/Group.h>
+
 #include <VelaMediaLib/model/project/Sourceable.h>
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 #include <VelaMediaLib/time/parameters/LeftParameter.h>
@@ -161,6 +163,19 @@ std::vector<MediaPtr> Timeline::allMedias() const {
     return clips;
 }
 
+namespace {
+
+// What a group found at the tick plays there, after the group itself.
+void addInside(const MediaPtr& media, VelaTime time, std::vector<MediaPtr>& clips) {
+    const Group* group = dynamic_cast<const Group*>(media.get());
+    if (!group) return;
+    std::vector<Track::MediaAtTime> inside;
+    group->collectMediasAtParametricTime(SafeRational(time - media->lockedTrackRange().start()), inside);
+    for (const Track::MediaAtTime& found : inside) clips.push_back(found.media);
+}
+
+} // namespace
+
 std::vector<MediaPtr> Timeline::allMediasAtTime(VelaTime time) const {
     ScopedReadLock lock(projectLock());
     std::vector<MediaPtr> clips;
@@ -168,9 +183,20 @@ std::vector<MediaPtr> Timeline::allMediasAtTime(VelaTime time) const {
         for (auto track = entry.second->trackBegin(); track != entry.second->trackEnd(); ++track) {
             const Track::Pair pair = (*track)->mediaAtTime(time);
             if (pair.first) clips.push_back(pair.first);
+            if (pair.first) addInside(pair.first, time, clips);
             if (pair.second) clips.push_back(pair.second);
+            if (pair.second) addInside(pair.second, time, clips);
         }
     return clips;
+}
+
+std::vector<Track::MediaAtTime> Timeline::allMediasAndTimesAtTime(VelaTime time) const {
+    ScopedReadLock lock(projectLock());
+    std::vector<Track::MediaAtTime> found;
+    for (const auto& entry : mixers_)
+        for (auto track = entry.second->trackBegin(); track != entry.second->trackEnd(); ++track)
+            (*track)->recursivelyCollectMediasAtTime(SafeRational(time), found);
+    return found;
 }
 
 std::vector<boost::shared_ptr<const Source>> Timeline::allSources() const {

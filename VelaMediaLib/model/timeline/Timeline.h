@@ -65,8 +65,11 @@ public:
 
     // Clips
     std::vector<MediaPtr> allMedias() const;
-    /// Every clip at the tick, track by track (both of two touching clips).
+    /// Every clip at the tick, track by track (both of two touching clips);
+    /// a group is followed by the clips it plays there, at any depth.
     std::vector<MediaPtr> allMediasAtTime(VelaTime time) const;
+    /// The same clips, each with the tick as its own parametric time (exact).
+    std::vector<Track::MediaAtTime> allMediasAndTimesAtTime(VelaTime time) const;
     template <typename Kind>
     std::vector<boost::shared_ptr<Kind>> instancesOf() const {
         std::vector<boost::shared_ptr<Kind>> found;

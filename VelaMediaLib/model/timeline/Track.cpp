@@ -1,6 +1,7 @@
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/model/timeline/Track.h>
 
+#include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 #include <VelaMediaLib/time/rational/RationalUtil.h>
@@ -72,6 +73,18 @@ void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media)
     if (!mediasIntersectingRange(range, media).empty()) throw CollisionException(range, media, range.start());
 }
 
+// Outward through the groups holding this track: a group placed inside
+// itself would own itself.
+void Track::refuseEnclosingGroup(const MediaPtr& media) const {
+    for (boost::shared_ptr<const Track> track = shared_from_this(); track;) {
+        const boost::shared_ptr<Mixer> mixer = track->parentMixer_.lock();
+        const MediaPtr group = mixer ? mixer->parentGroup() : MediaPtr();
+        if (!group) return;
+        if (group == media) throw AddRemoveException("a group cannot be placed inside itself");
+        track = boost::dynamic_pointer_cast<const Track>(group->parent());
+    }
+}
+
 // A clip lies on one track at most: one with a live parent elsewhere is refused.
 void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
     if (!media) throw AddRemoveException("no clip to add");
@@ -81,6 +94,7 @@ void Track::addMediaSansTypeCheck(const MediaPtr& media, VelaTime start) {
         const boost::shared_ptr<SubTimeline> parent = media->parent();
         if (parent.get() == this) throw AddRemoveException("the clip is already on this track");
         if (parent) throw AddRemoveException("the clip is already on another track or in a group");
+        refuseEnclosingGroup(media);
         const MediaState placed =
             media->stateAfter(Media::TimingEdit::of(Media::TimingEdit::SetStart, start));
         refuseCollision(placed.trackRange(), media);
@@ -370,8 +384,25 @@ bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit
     for (const MediaPtr& media : medias()) {
         visitor(media, stop);
         if (stop) return true;
+        const Group* group = dynamic_cast<const Group*>(media.get());
+        if (group && group->recursivelyVisitAllMedia(visitor)) return true;
     }
     return false;
+}
+
+void Track::recursivelyCollectMediasAtTime(const SafeRational& time, std::vector<MediaAtTime>& out) const {
+    ScopedReadLock lock(projectLock());
+    const SafeRational tick = RationalUtil::Floor(time);
+    const Pair found = mediaAtTime(RationalUtil::toVelaTime(tick));
+    for (const MediaPtr& media : {found.first, found.second}) {
+        if (!media) continue;
+        const Range<VelaTime> range = media->lockedTrackRange();
+        if (time != tick && !(time >= range.start() && time < range.end())) continue;
+        const SafeRational local = time - SafeRational(range.start());
+        out.push_back(MediaAtTime{media, local});
+        if (const Group* group = dynamic_cast<const Group*>(media.get()))
+            group->collectMediasAtParametricTime(local, out);
+    }
 }
 
 bool Track::isLocked() const { return metaDataValue(isLockedMetaDataKey()) == "true"; }

@@ -50,6 +50,11 @@ public:
         MediaPtr media;
         Range<VelaTime> range;
     };
+    /// A clip found at a time, and that time as the clip's parametric time.
+    struct MediaAtTime {
+        MediaPtr media;
+        SafeRational parametricTime;
+    };
 
     explicit Track(const boost::weak_ptr<const ThreadSafe>& token);
     ~Track() override;
@@ -121,9 +126,15 @@ public:
     /// Clones of the given clips of this track, counted from the earliest one's start.
     boost::shared_ptr<Track> copyPortion(const std::vector<MediaPtr>& clips,
                                          std::map<MediaPtr, MediaPtr>* copied = nullptr) const;
+    /// Each clip, and after a group the clips inside it, at any depth.
     void recursivelyVisitAllMedia(const MediaVisitor& visitor) const;
     /// Returns true when the visitor stopped the walk.
     bool recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit& visitor) const;
+    /// The clips at a time of the track (exact: inside a group it may fall
+    /// between ticks), as mediaAtTime finds them (both touching clips at a
+    /// whole tick; between ticks only the clip holding the time), each
+    /// followed by what it plays there when it is a group, at any depth.
+    void recursivelyCollectMediasAtTime(const SafeRational& time, std::vector<MediaAtTime>& out) const;
 
     // Flags
     boost::shared_ptr<Attribute<bool>> audioMutedAttribute() const { return flag("audioMuted"); }
@@ -179,6 +190,8 @@ private:
     friend class MediaImpl;
     boost::shared_ptr<Attribute<bool>> flag(const char* key) const { return attribute<bool>(key); }
     void refuseCollision(const Range<VelaTime>& range, const MediaPtr& media) const;
+    /// AddRemoveException when the clip is a group holding this track.
+    void refuseEnclosingGroup(const MediaPtr& media) const;
     /// The clip's entry: it is on this track when the track is its parent,
     /// keyed under its start (every timing edit of a placed clip re-keys it).
     MediaMap::const_iterator findMedia(const MediaPtr& media) const;
