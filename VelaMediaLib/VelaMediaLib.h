@@ -21,13 +21,17 @@
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
+#include <VelaMediaLib/commands/edits/CreateGroupCmd.h>
+#include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/UnGroupCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
 #include <VelaMediaLib/commands/framework/Command.h>
