@@ -31,7 +31,7 @@ bool hasClips(const Mixer& mixer) {
 template <typename Test>
 bool anyLeaf(const Group& group, Test test) {
     return group.recursivelyVisitAllMedia([&](const MediaPtr& media, bool& stop) {
-        if (!boost::dynamic_pointer_cast<Group>(media) && test(media)) stop = true;
+        if (!Group::asGroup(media.get()) && test(media)) stop = true;
     });
 }
 

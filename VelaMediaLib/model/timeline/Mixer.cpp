@@ -102,7 +102,7 @@ namespace {
 template <typename Kind>
 bool anyOf(const std::vector<MediaPtr>& clips) {
     return std::any_of(clips.begin(), clips.end(), [](const MediaPtr& m) {
-        return !boost::dynamic_pointer_cast<Group>(m) && boost::dynamic_pointer_cast<Kind>(m);
+        return !Group::asGroup(m.get()) && boost::dynamic_pointer_cast<Kind>(m);
     });
 }
 

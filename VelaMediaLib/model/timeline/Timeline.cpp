@@ -167,7 +167,7 @@ namespace {
 
 // What a group found at the tick plays there, after the group itself.
 void addInside(const MediaPtr& media, VelaTime time, std::vector<MediaPtr>& clips) {
-    const Group* group = dynamic_cast<const Group*>(media.get());
+    const Group* group = Group::asGroup(media.get());
     if (!group) return;
     std::vector<Track::MediaAtTime> inside;
     group->collectMediasAtParametricTime(SafeRational(time - media->lockedTrackRange().start()), inside);

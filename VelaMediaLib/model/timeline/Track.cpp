@@ -384,7 +384,7 @@ bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit
     for (const MediaPtr& media : medias()) {
         visitor(media, stop);
         if (stop) return true;
-        const Group* group = dynamic_cast<const Group*>(media.get());
+        const Group* group = Group::asGroup(media.get());
         if (group && group->recursivelyVisitAllMedia(visitor)) return true;
     }
     return false;
@@ -400,7 +400,7 @@ void Track::recursivelyCollectMediasAtTime(const SafeRational& time, std::vector
         if (time != tick && !(time >= range.start() && time < range.end())) continue;
         const SafeRational local = time - SafeRational(range.start());
         out.push_back(MediaAtTime{media, local});
-        if (const Group* group = dynamic_cast<const Group*>(media.get()))
+        if (const Group* group = Group::asGroup(media.get()))
             group->collectMediasAtParametricTime(local, out);
     }
 }
