@@ -77,6 +77,7 @@
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>
