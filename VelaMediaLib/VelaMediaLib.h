@@ -24,6 +24,8 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
+#include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
