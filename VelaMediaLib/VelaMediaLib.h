@@ -26,7 +26,9 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
+#include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
@@ -84,6 +86,7 @@
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
 #include <VelaMediaLib/model/media/VisualMediaImpl.h>

@@ -10,6 +10,7 @@
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/media/ScreenIMFile.h>
 #include <VelaMediaLib/model/media/ScreenVMFile.h>
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 
 namespace VelaMediaLib {
@@ -36,6 +37,8 @@ void ConstMediaDispatcher::dispatchCallout(const Callout& media) { dispatchAnyMe
 void ConstMediaDispatcher::dispatchCaption(const Caption& media) { dispatchAnyMedia(media); }
 void MediaDispatcher::dispatchGroup(Group& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchGroup(const Group& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchUnifiedMedia(UnifiedMedia& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchUnifiedMedia(const UnifiedMedia& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

@@ -14,6 +14,7 @@ class Media;
 class PlaceholderMedia;
 class ScreenIMFile;
 class ScreenVMFile;
+class UnifiedMedia;
 class VMFile;
 
 /// A visitor over the concrete clip kinds; each kind's dispatch calls the
@@ -32,6 +33,7 @@ public:
     virtual void dispatchCallout(Callout& media);
     virtual void dispatchCaption(Caption& media);
     virtual void dispatchGroup(Group& media);
+    virtual void dispatchUnifiedMedia(UnifiedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -51,6 +53,7 @@ public:
     virtual void dispatchCallout(const Callout& media);
     virtual void dispatchCaption(const Caption& media);
     virtual void dispatchGroup(const Group& media);
+    virtual void dispatchUnifiedMedia(const UnifiedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

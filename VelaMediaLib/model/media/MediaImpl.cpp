@@ -165,9 +165,9 @@ bool MediaImpl::applyTimingEditLocked(const TimingEdit& edit, MediaState& next) 
     const boost::shared_ptr<SubTimeline> container = parent_.lock();
     if (const boost::shared_ptr<Track> track = boost::dynamic_pointer_cast<Track>(container)) {
         track->editLocked(shared_from_this(), edit, changed, &next);
-    } else {
-        next = lockedStateAfter(edit);
-        changed = lockedTakeState(next);
+    } else { // through the kind's own steps, as a track would take them
+        next = stateAfter(edit);
+        changed = takeStateUnnotified(next);
     }
     return changed;
 }

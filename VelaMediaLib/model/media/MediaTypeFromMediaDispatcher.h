@@ -20,6 +20,7 @@ public:
     void dispatchCallout(const Callout&) override { type_ = "Callout"; }
     void dispatchCaption(const Caption&) override { type_ = "Caption"; }
     void dispatchGroup(const Group&) override { type_ = "Group"; }
+    void dispatchUnifiedMedia(const UnifiedMedia&) override { type_ = "UnifiedMedia"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);
