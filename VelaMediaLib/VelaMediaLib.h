@@ -74,6 +74,9 @@
 #include <VelaMediaLib/model/media/ScreenMetaDataProvider.h>
 #include <VelaMediaLib/model/media/ScreenRecordingData.h>
 #include <VelaMediaLib/model/media/ScreenVMFile.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/model/media/StitchedMediaChildrensTimeConverter.h>
+#include <VelaMediaLib/model/media/StitchedParameter.h>
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>

@@ -9,6 +9,7 @@
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/media/ScreenIMFile.h>
 #include <VelaMediaLib/model/media/ScreenVMFile.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 
 namespace VelaMediaLib {
@@ -33,6 +34,8 @@ void MediaDispatcher::dispatchCallout(Callout& media) { dispatchAnyMedia(media);
 void MediaDispatcher::dispatchCaption(Caption& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchCallout(const Callout& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchCaption(const Caption& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchStitchedMedia(StitchedMedia& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchStitchedMedia(const StitchedMedia& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

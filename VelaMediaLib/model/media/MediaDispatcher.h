@@ -13,6 +13,7 @@ class Media;
 class PlaceholderMedia;
 class ScreenIMFile;
 class ScreenVMFile;
+class StitchedMedia;
 class VMFile;
 
 /// A visitor over the concrete clip kinds; each kind's dispatch calls the
@@ -30,6 +31,7 @@ public:
     virtual void dispatchScreenIMFile(ScreenIMFile& media);
     virtual void dispatchCallout(Callout& media);
     virtual void dispatchCaption(Caption& media);
+    virtual void dispatchStitchedMedia(StitchedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -48,6 +50,7 @@ public:
     virtual void dispatchScreenIMFile(const ScreenIMFile& media);
     virtual void dispatchCallout(const Callout& media);
     virtual void dispatchCaption(const Caption& media);
+    virtual void dispatchStitchedMedia(const StitchedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

@@ -19,6 +19,7 @@ public:
     void dispatchScreenIMFile(const ScreenIMFile&) override { type_ = "ScreenIMFile"; }
     void dispatchCallout(const Callout&) override { type_ = "Callout"; }
     void dispatchCaption(const Caption&) override { type_ = "Caption"; }
+    void dispatchStitchedMedia(const StitchedMedia&) override { type_ = "StitchedMedia"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);
