@@ -80,7 +80,8 @@ private:
             const Range<VelaTime> range = part->trackRange();
             const RationalTime start(range.start()), length(range.duration());
             curve.push_back({start, this->newKeyFrame(start, parameter->valueAtTime(RationalTime(0)), 0)});
-            for (const RationalTime& time : *parameter->keyframeTimes()) {
+            const auto times = parameter->keyframeTimes();
+            for (const RationalTime& time : *times) {
                 if (time <= RationalTime(0) || time >= length) continue;
                 const auto keyframe = parameter->keyframeAtTime(time);
                 curve.push_back(
