@@ -24,11 +24,14 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
+#include <VelaMediaLib/commands/edits/UnstitchAllCmd.h>
+#include <VelaMediaLib/commands/edits/UnstitchMediaCmd.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
