@@ -29,12 +29,15 @@
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
+#include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnGroupCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
+#include <VelaMediaLib/commands/edits/UnstitchAllCmd.h>
+#include <VelaMediaLib/commands/edits/UnstitchMediaCmd.h>
 #include <VelaMediaLib/commands/framework/BatchCmd.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/commands/framework/CommandExecutor.h>
@@ -83,6 +86,9 @@
 #include <VelaMediaLib/model/media/ScreenMetaDataProvider.h>
 #include <VelaMediaLib/model/media/ScreenRecordingData.h>
 #include <VelaMediaLib/model/media/ScreenVMFile.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/model/media/StitchedMediaChildrensTimeConverter.h>
+#include <VelaMediaLib/model/media/StitchedParameter.h>
 #include <VelaMediaLib/model/media/Temporal.h>
 #include <VelaMediaLib/model/media/Transformer.h>
 #include <VelaMediaLib/model/media/Transition.h>

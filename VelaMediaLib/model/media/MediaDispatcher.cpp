@@ -11,6 +11,7 @@
 #include <VelaMediaLib/model/media/ScreenIMFile.h>
 #include <VelaMediaLib/model/media/ScreenVMFile.h>
 #include <VelaMediaLib/model/media/UnifiedMedia.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 
 namespace VelaMediaLib {
@@ -39,6 +40,8 @@ void MediaDispatcher::dispatchGroup(Group& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchGroup(const Group& media) { dispatchAnyMedia(media); }
 void MediaDispatcher::dispatchUnifiedMedia(UnifiedMedia& media) { dispatchAnyMedia(media); }
 void ConstMediaDispatcher::dispatchUnifiedMedia(const UnifiedMedia& media) { dispatchAnyMedia(media); }
+void MediaDispatcher::dispatchStitchedMedia(StitchedMedia& media) { dispatchAnyMedia(media); }
+void ConstMediaDispatcher::dispatchStitchedMedia(const StitchedMedia& media) { dispatchAnyMedia(media); }
 
 std::string MediaTypeFromMediaDispatcher::typeOf(const Media& media) {
     MediaTypeFromMediaDispatcher namer;

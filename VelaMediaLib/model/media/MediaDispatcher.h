@@ -15,6 +15,7 @@ class PlaceholderMedia;
 class ScreenIMFile;
 class ScreenVMFile;
 class UnifiedMedia;
+class StitchedMedia;
 class VMFile;
 
 /// A visitor over the concrete clip kinds; each kind's dispatch calls the
@@ -34,6 +35,7 @@ public:
     virtual void dispatchCaption(Caption& media);
     virtual void dispatchGroup(Group& media);
     virtual void dispatchUnifiedMedia(UnifiedMedia& media);
+    virtual void dispatchStitchedMedia(StitchedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(Media&) {}
@@ -54,6 +56,7 @@ public:
     virtual void dispatchCaption(const Caption& media);
     virtual void dispatchGroup(const Group& media);
     virtual void dispatchUnifiedMedia(const UnifiedMedia& media);
+    virtual void dispatchStitchedMedia(const StitchedMedia& media);
 
 protected:
     virtual void dispatchAnyMedia(const Media&) {}

@@ -21,6 +21,7 @@ public:
     void dispatchCaption(const Caption&) override { type_ = "Caption"; }
     void dispatchGroup(const Group&) override { type_ = "Group"; }
     void dispatchUnifiedMedia(const UnifiedMedia&) override { type_ = "UnifiedMedia"; }
+    void dispatchStitchedMedia(const StitchedMedia&) override { type_ = "StitchedMedia"; }
     const std::string& type() const { return type_; }
 
     static std::string typeOf(const Media& media);

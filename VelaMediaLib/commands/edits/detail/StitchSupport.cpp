@@ -1,0 +1,119 @@
+#include <VelaMediaLib/commands/edits/detail/StitchSupport.h>
+
+#include <VelaMediaLib/model/media/RationalMediaEditor.h>
+
+#include <cstdlib>
+
+namespace VelaMediaLib {
+namespace detail {
+
+void restoreExactly(const MediaPtr& media, const MediaState& state) {
+    media->restoreState(state, std::abs(RationalMediaEditor::durationFor(state.mediaDuration, state.scalar) -
+                                        state.duration));
+}
+
+void SlotRecord::take(const std::vector<MediaPtr>& clips) {
+    *this = SlotRecord();
+    for (const MediaPtr& clip : clips) {
+        clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
+        addLinks(clips_.back().left);
+        addLinks(clips_.back().right);
+    }
+}
+
+void SlotRecord::addLinks(const TransitionPtr& transition) {
+    if (!transition) return;
+    for (const Links& links : links_)
+        if (links.transition == transition) return;
+    links_.push_back(Links{transition, transition->leftMedia(), transition->rightMedia()});
+}
+
+void SlotRecord::restore() const {
+    for (const Slots& slots : clips_) {
+        if (slots.media->leftTransition() != slots.left) slots.media->setLeftTransition(slots.left);
+        if (slots.media->rightTransition() != slots.right) slots.media->setRightTransition(slots.right);
+    }
+    if (clips_.empty()) return;
+    ScopedWriteLock lock(clips_.front().media->projectMutex());
+    for (const Links& links : links_) {
+        links.transition->setLeftMedia(links.left);
+        links.transition->setRightMedia(links.right);
+    }
+}
+
+} // namespace detail
+} // namespace VelaMediaLib
+
+namespace VelaMediaLib {
+namespace detail {
+
+bool StitchPartsCmd::execute(CommandHandler*) {
+    partStates_.clear();
+    for (const MediaPtr& part : parts_) partStates_.push_back(part->state());
+    stitchedState_ = stitched_->state();
+    std::vector<MediaPtr> touched = parts_;
+    touched.push_back(stitched_);
+    slots_.take(touched);
+    const TransitionPtr left = parts_.front()->leftTransition(), right = parts_.back()->rightTransition();
+    try {
+        parts_.front()->setLeftTransition(TransitionPtr());
+        parts_.back()->setRightTransition(TransitionPtr());
+        stitched_->addMedias(parts_);
+        stitched_->setLeftTransition(left);
+        stitched_->setRightTransition(right);
+    } catch (...) {
+        slots_.restore();
+        throw;
+    }
+    return true;
+}
+
+bool StitchPartsCmd::unexecute(CommandHandler*) {
+    stitched_->removeAllMedias();
+    for (size_t i = 0; i < parts_.size(); ++i) restoreExactly(parts_[i], partStates_[i]);
+    restoreExactly(stitched_, stitchedState_);
+    slots_.restore();
+    return true;
+}
+
+bool UnstitchPartsCmd::execute(CommandHandler*) {
+    placements_ = stitched_->placementsWherePlayed();
+    if (placements_.empty())
+        throw VelaMediaLibException("a stitched media that plays no part cannot be unstitched");
+    parts_ = stitched_->medias();
+    partStates_.clear();
+    for (const MediaPtr& part : parts_) partStates_.push_back(part->state());
+    std::vector<MediaPtr> touched = parts_;
+    touched.push_back(stitched_);
+    slots_.take(touched);
+    const TransitionPtr left = stitched_->leftTransition(), right = stitched_->rightTransition();
+    stitched_->removeAllMedias();
+    try {
+        for (const StitchedMedia::Placement& placement : placements_)
+            restoreExactly(placement.media, placement.state);
+        stitched_->setLeftTransition(TransitionPtr());
+        stitched_->setRightTransition(TransitionPtr());
+        placements_.front().media->setLeftTransition(left);
+        placements_.back().media->setRightTransition(right);
+    } catch (...) {
+        putBack();
+        throw;
+    }
+    return true;
+}
+
+void UnstitchPartsCmd::putBack() {
+    for (size_t i = 0; i < parts_.size(); ++i) {
+        restoreExactly(parts_[i], partStates_[i]);
+        stitched_->addMediaWhileParsing(parts_[i]);
+    }
+    slots_.restore();
+}
+
+bool UnstitchPartsCmd::unexecute(CommandHandler*) {
+    putBack();
+    return true;
+}
+
+} // namespace detail
+} // namespace VelaMediaLib

@@ -1,0 +1,81 @@
+#pragma once
+// The steps inside the stitch commands that move clips into and out of a
+// stitched media: they act on the stitched media directly (its internal track
+// is no track of the project) and undo by giving back exact states.
+
+#include <VelaMediaLib/commands/framework/Command.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+
+#include <vector>
+
+namespace VelaMediaLib {
+namespace detail {
+
+/// The transition slots of some clips and the links of their transitions, as
+/// they were: setting a slot moves links, so links go back last.
+class SlotRecord {
+public:
+    void take(const std::vector<MediaPtr>& clips);
+    void restore() const;
+
+private:
+    struct Slots {
+        MediaPtr media;
+        TransitionPtr left, right;
+    };
+    struct Links {
+        TransitionPtr transition;
+        MediaPtr left, right;
+    };
+    void addLinks(const TransitionPtr& transition);
+
+    std::vector<Slots> clips_;
+    std::vector<Links> links_;
+};
+
+/// Gives clips taken off their track to the stitched media as its parts; the
+/// first part's left and the last part's right transition go to the
+/// stitched media's edges. Undone, the clips have their states and slots back
+/// and the stitched media is empty as before.
+class StitchPartsCmd : public Command {
+public:
+    StitchPartsCmd(const boost::shared_ptr<StitchedMedia>& stitched, const std::vector<MediaPtr>& parts)
+        : stitched_(stitched), parts_(parts) {}
+    bool execute(CommandHandler* handler) override;
+    bool unexecute(CommandHandler* handler) override;
+
+private:
+    boost::shared_ptr<StitchedMedia> stitched_;
+    std::vector<MediaPtr> parts_;
+    std::vector<MediaState> partStates_;
+    MediaState stitchedState_;
+    SlotRecord slots_;
+};
+
+/// Takes the parts out of a stitched media taken off its track, each part it
+/// plays given the state that plays on that track what the stitched media
+/// played of it (the stitched media's edge transitions go to the first and
+/// last of them). Undone, the parts are back inside as they were.
+class UnstitchPartsCmd : public Command {
+public:
+    explicit UnstitchPartsCmd(const boost::shared_ptr<StitchedMedia>& stitched) : stitched_(stitched) {}
+    bool execute(CommandHandler* handler) override;
+    bool unexecute(CommandHandler* handler) override;
+    /// The parts played, where they play, from the last execute.
+    const std::vector<StitchedMedia::Placement>& placements() const { return placements_; }
+
+private:
+    void putBack();
+
+    boost::shared_ptr<StitchedMedia> stitched_;
+    std::vector<MediaPtr> parts_;
+    std::vector<MediaState> partStates_;
+    std::vector<StitchedMedia::Placement> placements_;
+    SlotRecord slots_;
+};
+
+/// A restore that allows the rounding the state already has.
+void restoreExactly(const MediaPtr& media, const MediaState& state);
+
+} // namespace detail
+} // namespace VelaMediaLib
