@@ -7,6 +7,8 @@
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/model/media/AMFile.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/time/sync/LambdaObserverWithoutNotifyDelay.h>
@@ -392,6 +394,26 @@ TEST_F(SourceCommandTest, AClipPutBackByAnUndoCannotReachPastItsFile) {
     project->undo();
     EXPECT_EQ(clip->maxRationalMediaEnd(), SafeRational(150));
     EXPECT_THROW(clip->trimEnd(-150), InvalidTrimRangeException);
+}
+
+TEST_F(SourceCommandTest, ClipsInsideCompositesCountAsInstancesOfTheirSource) {
+    const SourcePtr a = project->loadSource("a.mov"), b = project->loadSource("b.mov");
+    const auto unified = UnifiedMedia::create(VMFile::create(a, 0, 0), AMFile::create(a, 1, 0));
+    track->addMedia(unified, 0);
+    const auto stitched = StitchedMedia::create({VMFile::create(b, 0, 0, SafeRational(0), SafeRational(30)),
+                                                 VMFile::create(b, 0, 0, SafeRational(60), SafeRational(30))},
+                                                0);
+    track->addMedia(stitched, 1000);
+    EXPECT_EQ(project->timeline()->instancesOf(a).size(), 2u);
+    EXPECT_EQ(project->timeline()->allSources().size(), 2u);
+    EXPECT_THROW(project->unloadSource(a), VelaMediaLibException);
+    EXPECT_THROW(project->unloadSource(b), VelaMediaLibException);
+
+    // At a tick inside the second part, the stitched clip answers that part and the time inside it.
+    bool found = false;
+    for (const Track::MediaAtTime& at : project->timeline()->allMediasAndTimesAtTime(1040))
+        if (at.media == stitched->medias().back()) found = at.parametricTime == SafeRational(10);
+    EXPECT_TRUE(found);
 }
 
 } // namespace

@@ -2,12 +2,15 @@
 #include <VelaMediaLib/model/timeline/Track.h>
 
 #include <VelaMediaLib/model/media/Group.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>
 #include <VelaMediaLib/time/parameters/InterpolatingParam.h>
 #include <VelaMediaLib/time/rational/RationalUtil.h>
 
 #include <algorithm>
 #include <cassert>
+#include <typeinfo>
 
 namespace VelaMediaLib {
 namespace {
@@ -379,6 +382,24 @@ void Track::recursivelyVisitAllMedia(const MediaVisitor& visitor) const {
     recursivelyVisitAllMediaWithEarlyExitFlag([&](const MediaPtr& media, bool&) { visitor(media); });
 }
 
+namespace {
+
+/// The clips a stitched or unified clip is made of (a group walks its own).
+std::vector<MediaPtr> partsOf(const Media& media) {
+    const std::type_info& kind = typeid(media); // the cast only for the kinds that have parts
+    if (kind == typeid(StitchedMedia)) return dynamic_cast<const StitchedMedia&>(media).medias();
+    if (kind == typeid(UnifiedMedia)) {
+        const auto& unified = dynamic_cast<const UnifiedMedia&>(media);
+        std::vector<MediaPtr> parts;
+        if (const MediaPtr visual = unified.internalVisualMedia()) parts.push_back(visual);
+        if (const MediaPtr audio = unified.internalAudioMedia()) parts.push_back(audio);
+        return parts;
+    }
+    return std::vector<MediaPtr>();
+}
+
+} // namespace
+
 bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit& visitor) const {
     bool stop = false;
     for (const MediaPtr& media : medias()) {
@@ -386,6 +407,10 @@ bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit
         if (stop) return true;
         const Group* group = Group::asGroup(media.get());
         if (group && group->recursivelyVisitAllMedia(visitor)) return true;
+        for (const MediaPtr& part : partsOf(*media)) {
+            visitor(part, stop);
+            if (stop) return true;
+        }
     }
     return false;
 }
@@ -400,8 +425,16 @@ void Track::recursivelyCollectMediasAtTime(const SafeRational& time, std::vector
         if (time != tick && !(time >= range.start() && time < range.end())) continue;
         const SafeRational local = time - SafeRational(range.start());
         out.push_back(MediaAtTime{media, local});
-        if (const Group* group = Group::asGroup(media.get()))
+        if (const Group* group = Group::asGroup(media.get())) {
             group->collectMediasAtParametricTime(local, out);
+        } else if (typeid(*media) == typeid(StitchedMedia)) {
+            const auto part =
+                dynamic_cast<const StitchedMedia&>(*media).mediaAndSubTimeForParametricTime(local);
+            if (part.first) out.push_back(MediaAtTime{part.first, part.second});
+        } else if (typeid(*media) == typeid(UnifiedMedia)) {
+            for (const MediaPtr& part : partsOf(*media))
+                out.push_back(MediaAtTime{part, local}); // its own time
+        }
     }
 }
 
