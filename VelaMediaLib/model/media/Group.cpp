@@ -102,8 +102,8 @@ boost::shared_ptr<Group> Group::adopt(const boost::shared_ptr<Group>& group) {
     if (mixer->parentGroup()) throw AddRemoveException("the mixer already belongs to a group");
     mixer->setParentGroup(group);
     mixer->attachAddObserver(group.get());
-    group->addAttribute<int>("width", 0);
-    group->addAttribute<int>("height", 0);
+    group->addAttribute<int>("widthAttr", 0);
+    group->addAttribute<int>("heightAttr", 0);
     group->addAttribute<std::string>("quickPropertyList", std::string());
     return group;
 }
@@ -115,8 +115,8 @@ TimeConverterPtr Group::childrensTimeConverter() const {
 void Group::setGroupWidthAndHeight(int width, int height) {
     for (const int side : {width, height})
         if (side < 0) throw ValueException<int>("a group's size must not be negative", side);
-    addAttribute<int>("width", width);
-    addAttribute<int>("height", height);
+    addAttribute<int>("widthAttr", width);
+    addAttribute<int>("heightAttr", height);
 }
 
 bool Group::updateGroupWidthAndHeightIfNotSet() {

@@ -21,7 +21,7 @@ namespace VelaMediaLib {
 /// (c - media start) * scalar. Trimming a group moves its window over its
 /// children, which stay where they are in its inner time.
 ///
-/// Its canvas is the int attributes "width" and "height" (0: not set). Its
+/// Its canvas is the int attributes "widthAttr" and "heightAttr" (0: not set). Its
 /// quick properties are names kept one per line in the string attribute
 /// "quickPropertyList"; its animation tracks are double parameters named
 /// "animationTrack:" + name, so that they clone and write with its other
@@ -66,16 +66,16 @@ public:
     TimeConverterPtr childrensTimeConverter() const;
 
     // Canvas
-    boost::shared_ptr<Attribute<int>> widthAttr() const { return attribute<int>("width"); }
-    boost::shared_ptr<Attribute<int>> heightAttr() const { return attribute<int>("height"); }
-    int width() const { return attributeValue<int>("width", 0); }
-    int height() const { return attributeValue<int>("height", 0); }
+    boost::shared_ptr<Attribute<int>> widthAttr() const { return attribute<int>("widthAttr"); }
+    boost::shared_ptr<Attribute<int>> heightAttr() const { return attribute<int>("heightAttr"); }
+    int width() const { return attributeValue<int>("widthAttr", 0); }
+    int height() const { return attributeValue<int>("heightAttr", 0); }
     /// Throws ValueException<int> "a group's size must not be negative", changing nothing.
     void setGroupWidthAndHeight(int width, int height);
     /// Fills a side that is not set (0) from the children: the largest by
-    /// area of the children on the group's tracks that declare a size (int
-    /// attributes "width" and "height": placeholders, groups, whose unset
-    /// size is derived the same way); without one, the canvas of the
+    /// area of the children on the group's tracks that declare a size
+    /// (placeholders by their "width" and "height", groups by their canvas,
+    /// derived the same way when unset); without one, the canvas of the
     /// timeline the group lies on. Returns whether it set anything.
     bool updateGroupWidthAndHeightIfNotSet();
 
