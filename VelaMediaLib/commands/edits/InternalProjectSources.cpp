@@ -1,10 +1,13 @@
 // The project's operations on its sources.
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 
+#include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/source/FileSystem.h>
 #include <VelaMediaLib/model/source/MediaFileStats.h>
 #include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/time/sync/NotifyDelay.h>
+
+#include <algorithm>
 
 namespace VelaMediaLib {
 
@@ -46,7 +49,18 @@ int InternalProject::unloadSource(const boost::shared_ptr<Source>& source) {
 }
 
 void InternalProject::refitInstancesOf(const boost::shared_ptr<Source>& source) const {
-    for (const MediaPtr& media : timeline_->instancesOf(source)) media->mediaSourceChanged();
+    // A clip inside a stitched or unified clip is refitted by that clip, which
+    // then fits its own limits to its parts'.
+    std::vector<MediaPtr> refitted;
+    for (const MediaPtr& media : timeline_->instancesOf(source)) {
+        MediaPtr target = media;
+        for (MediaPtr outer = Track::enclosingClipOf(*media); outer && !Group::asGroup(outer.get());
+             outer = Track::enclosingClipOf(*outer))
+            target = outer;
+        if (std::find(refitted.begin(), refitted.end(), target) != refitted.end()) continue;
+        target->mediaSourceChanged();
+        refitted.push_back(target);
+    }
 }
 
 bool InternalProject::bringSourceOnline(const boost::shared_ptr<Source>& source) {

@@ -4,9 +4,16 @@
 
 namespace VelaMediaLib {
 
+// A clip inside clips answers with the track of the outermost of them.
 TrackPtr LockData::trackOf(const Media& media) {
+    const Media* outermost = &media;
+    MediaPtr held;
+    while (const MediaPtr outer = Track::enclosingClipOf(*outermost)) {
+        held = outer;
+        outermost = held.get();
+    }
     TrackPtr track;
-    media.parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
+    outermost->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
         track = boost::dynamic_pointer_cast<Track>(parent);
     });
     return track;

@@ -7,14 +7,6 @@
 #include <algorithm>
 
 namespace VelaMediaLib {
-namespace {
-
-boost::shared_ptr<const Source> sourceOf(const MediaPtr& media) {
-    const auto sourceable = boost::dynamic_pointer_cast<Sourceable>(media);
-    return sourceable ? sourceable->source() : boost::shared_ptr<const Source>();
-}
-
-} // namespace
 
 StitchMediaCmd::StitchMediaCmd(const TrackPtr& track, const std::vector<MediaPtr>& clips)
     : track_(track), clips_(clips) {
@@ -44,7 +36,7 @@ std::vector<MediaPtr> StitchMediaCmd::checkedClips() const {
     for (size_t i = 1; i < ordered.size(); ++i) {
         if (ordered[i - 1]->endTime() != ordered[i]->startTime())
             throw VelaMediaLibException("only touching clips can be stitched");
-        if (sourceOf(ordered[i]) != sourceOf(ordered.front()))
+        if (StitchedMedia::sourceOf(ordered[i]) != StitchedMedia::sourceOf(ordered.front()))
             throw VelaMediaLibException("cannot stitch clips of different sources");
     }
     return ordered;

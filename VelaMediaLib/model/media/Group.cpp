@@ -26,12 +26,12 @@ bool hasClips(const Mixer& mixer) {
     return false;
 }
 
-// Clips, not the groups that hold them: a group is seen and heard only
-// through its children.
+// Clips, not the clips made of them: those are seen and heard only through
+// their parts.
 template <typename Test>
 bool anyLeaf(const Group& group, Test test) {
     return group.recursivelyVisitAllMedia([&](const MediaPtr& media, bool& stop) {
-        if (!Group::asGroup(media.get()) && test(media)) stop = true;
+        if (!Track::isMadeOfClips(*media) && test(media)) stop = true;
     });
 }
 

@@ -1,5 +1,7 @@
 #include <VelaMediaLib/model/media/StitchedMedia.h>
 
+#include <VelaMediaLib/model/media/UnifiedMedia.h>
+
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/effects/Effect.h>
@@ -74,11 +76,6 @@ SafeRational internalAt(const MediaState& part, const SafeRational& source) {
     return SafeRational(part.start) + (source - part.mediaStart) * part.scalar;
 }
 
-boost::shared_ptr<const Source> sourceOf(const MediaPtr& media) {
-    const auto sourceable = boost::dynamic_pointer_cast<Sourceable>(media);
-    return sourceable ? sourceable->source() : boost::shared_ptr<const Source>();
-}
-
 VelaTime ceilTicks(const SafeRational& x) { return RationalUtil::toVelaTime(RationalUtil::Ceil(x)); }
 VelaTime floorTicks(const SafeRational& x) { return RationalUtil::toVelaTime(RationalUtil::Floor(x)); }
 
@@ -151,8 +148,7 @@ void StitchedMedia::checkParts(const std::vector<MediaPtr>& parts) const {
     for (size_t i = 0; i < parts.size(); ++i) {
         const MediaPtr& part = parts[i];
         if (!part) throw AddRemoveException("no clip to stitch");
-        if (part.get() == static_cast<const Media*>(this))
-            throw AddRemoveException("a stitched media cannot hold itself");
+        if (Track::isWithin(this, *part)) throw AddRemoveException("a stitched media cannot hold itself");
         if (part->parent()) throw AddRemoveException("the clip is already on a track or in a group");
         if (std::find(parts.begin(), parts.begin() + std::ptrdiff_t(i), part) !=
             parts.begin() + std::ptrdiff_t(i))
@@ -197,7 +193,8 @@ void StitchedMedia::appendParts(const std::vector<MediaPtr>& parts, bool growWin
     std::vector<MediaState> loose;
     for (const MediaPtr& part : parts) loose.push_back(part->state());
     const bool hadParts = !before.empty();
-    const bool playedToEnd = hadParts && state().mediaEnd() >= SafeRational(endOf(before));
+    const MediaState own = state();
+    const bool playedToEnd = hadParts && own.mediaEnd() >= SafeRational(endOf(before));
     size_t placed = 0;
     try {
         if (growWindow && playedToEnd) extendLastPart();
@@ -221,6 +218,7 @@ void StitchedMedia::appendParts(const std::vector<MediaPtr>& parts, bool growWin
         }
         for (const Part& part : before)
             track_->restoreMediaState(part.media, part.state, roundingOf(part.state));
+        if (state() != own) takeState(own); // its limits may have grown with the last part
         throw;
     }
 }
@@ -494,6 +492,15 @@ void StitchedMedia::setSourceEffect(const boost::shared_ptr<Effect>& effect) {
         sourceEffect_ = effect;
     }
     notify();
+}
+
+boost::shared_ptr<const Source> StitchedMedia::sourceOf(const MediaPtr& media) {
+    if (const auto unified = boost::dynamic_pointer_cast<const UnifiedMedia>(media)) {
+        const boost::shared_ptr<const Source> seen = sourceOf(unified->internalVisualMedia());
+        return seen ? seen : sourceOf(unified->internalAudioMedia());
+    }
+    const auto sourceable = boost::dynamic_pointer_cast<Sourceable>(media);
+    return sourceable ? sourceable->source() : boost::shared_ptr<const Source>();
 }
 
 void StitchedMedia::mediaSourceChanged() {

@@ -199,6 +199,9 @@ public:
     void dispatch(ConstMediaDispatcher& dispatcher) const override;
     /// Tells the parts, then refits the limits to them.
     void mediaSourceChanged() override;
+    /// The source a clip plays: a file clip's, a unified clip's parts' (the
+    /// visual part's first), or null; clips that can be stitched share it.
+    static boost::shared_ptr<const Source> sourceOf(const MediaPtr& media);
     /// Writes "medias", the parts.
     void toJSONSpecificProperties(XMLOptions& options, int indent) const override;
 

@@ -98,11 +98,11 @@ std::vector<boost::shared_ptr<const Source>> Mixer::allSources() const {
 
 namespace {
 
-// A group is seen and heard through its children, which the list holds too.
+// A clip made of clips is seen and heard through its parts, which the list holds too.
 template <typename Kind>
 bool anyOf(const std::vector<MediaPtr>& clips) {
     return std::any_of(clips.begin(), clips.end(), [](const MediaPtr& m) {
-        return !Group::asGroup(m.get()) && boost::dynamic_pointer_cast<Kind>(m);
+        return !Track::isMadeOfClips(*m) && boost::dynamic_pointer_cast<Kind>(m);
     });
 }
 

@@ -165,12 +165,10 @@ std::vector<MediaPtr> Timeline::allMedias() const {
 
 namespace {
 
-// What a group found at the tick plays there, after the group itself.
+// What a clip made of clips plays at the tick, after the clip itself.
 void addInside(const MediaPtr& media, VelaTime time, std::vector<MediaPtr>& clips) {
-    const Group* group = Group::asGroup(media.get());
-    if (!group) return;
     std::vector<Track::MediaAtTime> inside;
-    group->collectMediasAtParametricTime(SafeRational(time - media->lockedTrackRange().start()), inside);
+    Track::collectInside(*media, SafeRational(time - media->lockedTrackRange().start()), inside);
     for (const Track::MediaAtTime& found : inside) clips.push_back(found.media);
 }
 

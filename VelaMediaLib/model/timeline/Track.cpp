@@ -78,14 +78,36 @@ void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media)
 
 // Outward through the groups holding this track: a group placed inside
 // itself would own itself.
-void Track::refuseEnclosingGroup(const MediaPtr& media) const {
-    for (boost::shared_ptr<const Track> track = shared_from_this(); track;) {
-        const boost::shared_ptr<Mixer> mixer = track->parentMixer_.lock();
-        const MediaPtr group = mixer ? mixer->parentGroup() : MediaPtr();
-        if (!group) return;
-        if (group == media) throw AddRemoveException("a group cannot be placed inside itself");
-        track = boost::dynamic_pointer_cast<const Track>(group->parent());
+bool Track::isMadeOfClips(const Media& media) {
+    const std::type_info& kind = typeid(media);
+    return kind == typeid(Group) || kind == typeid(StitchedMedia) || kind == typeid(UnifiedMedia);
+}
+
+MediaPtr Track::enclosingClip() const {
+    ScopedReadLock lock(projectLock());
+    if (const MediaPtr stitched = parentStitched_.lock()) return stitched;
+    const boost::shared_ptr<Mixer> mixer = parentMixer_.lock();
+    return mixer ? mixer->parentGroup() : MediaPtr();
+}
+
+MediaPtr Track::enclosingClipOf(const Media& media) {
+    const boost::shared_ptr<SubTimeline> parent = media.parent();
+    if (const auto track = boost::dynamic_pointer_cast<const Track>(parent)) return track->enclosingClip();
+    return boost::dynamic_pointer_cast<Media>(parent); // a unified clip's part
+}
+
+bool Track::isWithin(const Media* container, const Media& clip) {
+    for (MediaPtr outer; container; container = outer.get()) {
+        if (container == &clip) return true;
+        outer = enclosingClipOf(*container);
     }
+    return false;
+}
+
+void Track::refuseEnclosingGroup(const MediaPtr& media) const {
+    const MediaPtr container = enclosingClip();
+    if (container && isWithin(container.get(), *media))
+        throw AddRemoveException("a group cannot be placed inside itself");
 }
 
 // A clip lies on one track at most: one with a live parent elsewhere is refused.
@@ -400,19 +422,34 @@ std::vector<MediaPtr> partsOf(const Media& media) {
 
 } // namespace
 
-bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit& visitor) const {
+bool Track::visitWithin(const MediaPtr& media, const MediaVisitorWithExit& visitor) {
     bool stop = false;
-    for (const MediaPtr& media : medias()) {
-        visitor(media, stop);
-        if (stop) return true;
-        const Group* group = Group::asGroup(media.get());
-        if (group && group->recursivelyVisitAllMedia(visitor)) return true;
-        for (const MediaPtr& part : partsOf(*media)) {
-            visitor(part, stop);
-            if (stop) return true;
-        }
-    }
+    visitor(media, stop);
+    if (stop) return true;
+    if (const Group* group = Group::asGroup(media.get())) return group->recursivelyVisitAllMedia(visitor);
+    for (const MediaPtr& part : partsOf(*media))
+        if (visitWithin(part, visitor)) return true;
     return false;
+}
+
+bool Track::recursivelyVisitAllMediaWithEarlyExitFlag(const MediaVisitorWithExit& visitor) const {
+    for (const MediaPtr& media : medias())
+        if (visitWithin(media, visitor)) return true;
+    return false;
+}
+
+void Track::collectInside(const Media& media, const SafeRational& time, std::vector<MediaAtTime>& out) {
+    if (const Group* group = Group::asGroup(&media)) return group->collectMediasAtParametricTime(time, out);
+    if (typeid(media) == typeid(StitchedMedia)) {
+        const auto part = dynamic_cast<const StitchedMedia&>(media).mediaAndSubTimeForParametricTime(time);
+        if (!part.first) return;
+        out.push_back(MediaAtTime{part.first, part.second});
+        return collectInside(*part.first, part.second, out);
+    }
+    for (const MediaPtr& part : partsOf(media)) { // a unified clip's parts share its time
+        out.push_back(MediaAtTime{part, time});
+        collectInside(*part, time, out);
+    }
 }
 
 void Track::recursivelyCollectMediasAtTime(const SafeRational& time, std::vector<MediaAtTime>& out) const {
@@ -425,16 +462,7 @@ void Track::recursivelyCollectMediasAtTime(const SafeRational& time, std::vector
         if (time != tick && !(time >= range.start() && time < range.end())) continue;
         const SafeRational local = time - SafeRational(range.start());
         out.push_back(MediaAtTime{media, local});
-        if (const Group* group = Group::asGroup(media.get())) {
-            group->collectMediasAtParametricTime(local, out);
-        } else if (typeid(*media) == typeid(StitchedMedia)) {
-            const auto part =
-                dynamic_cast<const StitchedMedia&>(*media).mediaAndSubTimeForParametricTime(local);
-            if (part.first) out.push_back(MediaAtTime{part.first, part.second});
-        } else if (typeid(*media) == typeid(UnifiedMedia)) {
-            for (const MediaPtr& part : partsOf(*media))
-                out.push_back(MediaAtTime{part, local}); // its own time
-        }
+        collectInside(*media, local, out);
     }
 }
 

@@ -134,6 +134,22 @@ public:
     /// between ticks), as mediaAtTime finds them (both touching clips at a
     /// whole tick; between ticks only the clip holding the time), each
     /// followed by what it plays there when it is a group, at any depth.
+    /// Whether the clip is made of clips (a group, a stitched or unified clip):
+    /// it is seen and heard through them.
+    static bool isMadeOfClips(const Media& media);
+    /// The clip this track lies in (a group's or a stitched clip's), or null.
+    MediaPtr enclosingClip() const;
+    /// The clip the clip lies in (through its track, or a unified clip), or null.
+    static MediaPtr enclosingClipOf(const Media& media);
+    /// Whether `container` is the clip or lies inside it at any depth: then
+    /// the clip may not be put into it.
+    static bool isWithin(const Media* container, const Media& clip);
+    /// Visits the clip and every clip inside it, at any depth (groups,
+    /// stitched and unified clips); true when the visitor stopped.
+    static bool visitWithin(const MediaPtr& media, const MediaVisitorWithExit& visitor);
+    /// What a clip made of clips plays at its parametric time, at any depth,
+    /// each with the time inside it; nothing for a plain clip.
+    static void collectInside(const Media& media, const SafeRational& time, std::vector<MediaAtTime>& out);
     void recursivelyCollectMediasAtTime(const SafeRational& time, std::vector<MediaAtTime>& out) const;
 
     // Flags
