@@ -62,6 +62,7 @@
 #include <VelaMediaLib/model/media/AudioSide.h>
 #include <VelaMediaLib/model/media/Callout.h>
 #include <VelaMediaLib/model/media/Caption.h>
+#include <VelaMediaLib/model/media/ChildrensTimeConverter.h>
 #include <VelaMediaLib/model/media/ColorMedia.h>
 #include <VelaMediaLib/model/media/EdgeModifiable.h>
 #include <VelaMediaLib/model/media/EdgeModification.h>

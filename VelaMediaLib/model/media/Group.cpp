@@ -81,14 +81,7 @@ boost::shared_ptr<Group> Group::createFromMediaRange(const boost::weak_ptr<const
     if (!mixer) throw AddRemoveException("no mixer for the group");
     if (!sameProject(token, mixer->projectMutex()))
         throw AddRemoveException("the mixer belongs to another project");
-    MediaState state;
-    state.start = start;
-    state.duration = RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar));
-    state.mediaStart = mediaStart;
-    state.mediaDuration = mediaDuration;
-    state.scalar = scalar;
-    state.minMediaStart = mediaStart;
-    state.maxMediaEnd = mediaStart + mediaDuration;
+    MediaState state = MediaState::ofSlice(start, mediaStart, mediaDuration, scalar);
     if (hasClips(*mixer)) {
         state.minMediaStart = std::min(state.minMediaStart, SafeRational(mixer->startTime()));
         state.maxMediaEnd = std::max(state.maxMediaEnd, SafeRational(mixer->endTime()));

@@ -36,6 +36,12 @@ struct VELAMEDIALIB_API MediaState {
         return state;
     }
 
+    /// The state of a clip playing the slice at the scalar from start, its
+    /// limits the slice's ends; the duration is the slice's length times the
+    /// scalar, rounded to the nearest tick.
+    static MediaState ofSlice(VelaTime start, const SafeRational& mediaStart,
+                              const SafeRational& mediaDuration, const SafeRational& scalar);
+
     static SafeRational unboundedStart() { return SafeRational(std::numeric_limits<long long>::min()); }
     static SafeRational unboundedEnd() { return SafeRational(std::numeric_limits<long long>::max()); }
 

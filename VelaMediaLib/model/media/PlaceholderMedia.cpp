@@ -21,14 +21,7 @@ PlaceholderMedia::createFromMediaRange(const boost::weak_ptr<const ThreadSafe>& 
                                        const boost::weak_ptr<ProjectEditRate>& rate, VelaTime start,
                                        const SafeRational& mediaStart, const SafeRational& mediaDuration,
                                        const SafeRational& scalar) {
-    MediaState state;
-    state.start = start;
-    state.duration = RationalUtil::toVelaTime(RationalUtil::Round(mediaDuration * scalar));
-    state.mediaStart = mediaStart;
-    state.mediaDuration = mediaDuration;
-    state.scalar = scalar;
-    state.minMediaStart = mediaStart;
-    state.maxMediaEnd = mediaStart + mediaDuration;
+    MediaState state = MediaState::ofSlice(start, mediaStart, mediaDuration, scalar);
     return boost::shared_ptr<PlaceholderMedia>(new PlaceholderMedia(token, rate, state));
 }
 

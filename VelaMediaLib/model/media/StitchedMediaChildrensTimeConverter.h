@@ -1,38 +1,24 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
-#include <VelaMediaLib/time/rational/TimeConverter.h>
-
-#include <boost/weak_ptr.hpp>
+#include <VelaMediaLib/model/media/ChildrensTimeConverter.h>
 
 namespace VelaMediaLib {
 
 class StitchedMedia;
-class SubTimeline;
 
-/// What a stitched media's internal track names as its converter parent: it
-/// maps the stitched media's parametric time (ticks from its start on its own
-/// track) to the time of its internal track, where its parts lie end to end,
-/// and back. Internal time = media start + parametric time / scalar, exactly,
-/// so a part's time follows every trim and stretch of the stitched media.
-/// Its own parent is the stitched media, held weakly: once that has gone the
-/// converter passes times through unchanged and names no parent.
-class VELAMEDIALIB_API StitchedMediaChildrensTimeConverter : public TimeConverter {
+/// What a stitched media's internal track names as its parent converter:
+/// the stitched media's parametric time to the time of its internal track,
+/// where its parts lie end to end (see ChildrensTimeConverter), so a part's
+/// time follows every trim and stretch of the stitched media. It holds the
+/// stitched media weakly.
+class VELAMEDIALIB_API StitchedMediaChildrensTimeConverter : public ChildrensTimeConverter {
 public:
     explicit StitchedMediaChildrensTimeConverter(const boost::weak_ptr<const StitchedMedia>& stitched)
         : stitched_(stitched) {}
 
-    /// Stitched parametric time to internal track time.
-    SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override;
-    /// The same after clipping the time to the stitched media's duration.
-    SafeRational clippingParentParametricTimeToThisParametricTime(const SafeRational& time) const override;
-    /// Internal track time to stitched parametric time.
-    SafeRational thisParametricTimeToParentParametricTime(const SafeRational& time) const override;
-    TimeConverterPtr parentTimeConverter() const override;
-
-    /// The converter belongs to its stitched media for good: throws
-    /// std::runtime_error "ChildrensTimeConverter::setTimeConverterParent not supported".
-    void setTimeConverterParent(const boost::weak_ptr<SubTimeline>& parent);
+protected:
+    boost::shared_ptr<const Media> container() const override;
 
 private:
     boost::weak_ptr<const StitchedMedia> stitched_;
