@@ -175,5 +175,8 @@ TEST_F(CompositeEditTest, AClipInsideAGroupOnALockedTrackIsLocked) {
     EXPECT_TRUE(LockData::IsMediaLocked(*command->createdGroup()));
     EXPECT_TRUE(LockData::IsMediaLocked(*stitch->stitchedMedia())) << "child of a group on a locked track";
     EXPECT_TRUE(LockData::IsMediaLocked(*a)) << "part of a stitched clip on a locked track";
+    const MediaPtr loose = clip(10); // on no track: editable and shown
+    EXPECT_FALSE(LockData::IsMediaLocked(*loose) || LockData::IsMediaHidden(*loose) ||
+                 LockData::IsMediaInvisible(*loose));
 }
 } // namespace

@@ -244,7 +244,10 @@ TEST_F(StitchedMediaTest, RefusedPartsLeaveEverythingAsItWas) {
     EXPECT_THROW(stitched->addMedia(
                      boost::make_shared<TestClip>(otherProject, rate, loose->state(), MediaImpl::Temporal)),
                  AddRemoveException);
-    EXPECT_THROW(stitched->addMedia(loose), CollisionException); // growing onto the neighbour
+    const MediaPtr foreign =
+        boost::make_shared<TestClip>(otherProject, rate, loose->state(), MediaImpl::Temporal);
+    EXPECT_THROW(stitched->addMedias({loose, foreign}), AddRemoveException); // every part is checked
+    EXPECT_THROW(stitched->addMedia(loose), CollisionException);             // growing onto the neighbour
     EXPECT_EQ(states({a, b, c, stitched}), before);
     EXPECT_EQ(states({loose}), looseBefore);
     EXPECT_EQ(stitched->medias().size(), 3u);
