@@ -66,7 +66,7 @@ long long MediaImpl::editingUnit() const {
 }
 
 Range<VelaTime> MediaImpl::trackRangeWithMove(VelaTime offset) const {
-    return stateAfter(TimingEdit::of(TimingEdit::Move, offset)).trackRange();
+    return previewRange(TimingEdit::of(TimingEdit::Move, offset));
 }
 
 Range<VelaTime> MediaImpl::trackRangeWithTrimStart(VelaTime offset) const {
@@ -85,7 +85,7 @@ Range<VelaTime> MediaImpl::trackRangeWithStretch(double factor) const {
 
 // Through the editor, so the preview refuses what the stretch refuses.
 Range<VelaTime> MediaImpl::trackRangeWithRationalStretch(const SafeRational& factor) const {
-    return stateAfter(TimingEdit::stretch(factor)).trackRange();
+    return previewRange(TimingEdit::stretch(factor));
 }
 
 Range<double> MediaImpl::mediaRange() const { return RationalUtil::toDoubleRange(rationalMediaRange()); }
@@ -120,21 +120,31 @@ MediaState MediaImpl::stateAfter(const TimingEdit& edit) const {
 }
 
 MediaState MediaImpl::lockedStateAfter(const TimingEdit& edit) const {
+    return editedLimits(editorStateAfter(edit));
+}
+
+MediaState MediaImpl::editorStateAfter(const TimingEdit& edit) const {
     switch (edit.kind) {
     case TimingEdit::Move:
-        return editedLimits(editor_->move(state_, edit.amount));
+        return editor_->move(state_, edit.amount);
     case TimingEdit::SetStart:
-        return editedLimits(editor_->move(state_, edit.amount - state_.start));
+        return editor_->move(state_, edit.amount - state_.start);
     case TimingEdit::TrimStart:
-        return editedLimits(editor_->trimStart(state_, edit.amount));
+        return editor_->trimStart(state_, edit.amount);
     case TimingEdit::TrimEnd:
-        return editedLimits(editor_->trimEnd(state_, edit.amount));
+        return editor_->trimEnd(state_, edit.amount);
     case TimingEdit::Stretch:
-        return editedLimits(editor_->stretch(state_, edit.factor));
+        return editor_->stretch(state_, edit.factor);
     case TimingEdit::Restore:
-        return editedLimits(editor_->restoreState(*edit.saved, edit.amount));
+        return editor_->restoreState(*edit.saved, edit.amount);
     }
     return state_;
+}
+
+// Previews answer the track range alone, which the limits do not change.
+Range<VelaTime> MediaImpl::previewRange(const TimingEdit& edit) const {
+    ScopedReadLock lock(projectLock());
+    return editorStateAfter(edit).trackRange();
 }
 
 bool MediaImpl::lockedTakeState(const MediaState& next) {

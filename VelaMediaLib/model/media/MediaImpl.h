@@ -136,6 +136,9 @@ protected:
 private:
     /// stateAfter and takeStateUnnotified under the lock the caller holds.
     MediaState lockedStateAfter(const TimingEdit& edit) const;
+    /// What the editor makes of the edit, before the kind's limits.
+    MediaState editorStateAfter(const TimingEdit& edit) const;
+    Range<VelaTime> previewRange(const TimingEdit& edit) const;
     bool lockedTakeState(const MediaState& next);
 
     PartSubject transitionSubject_; // notifies under the clip's token

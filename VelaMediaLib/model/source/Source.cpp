@@ -41,10 +41,10 @@ SafeRational convertTicks(long long ticks, const boost::rational<unsigned long>&
            SafeRational(static_cast<long long>(to.numerator()), static_cast<long long>(to.denominator()));
 }
 
-/// A stream's range in ticks of the rate, exactly.
-Range<SafeRational> streamRange(const TrackStats& track, const boost::rational<unsigned long>& rate) {
-    return Range<SafeRational>(convertTicks(track.range.first(), track.rangeEditRate, rate),
-                               convertTicks(track.range.second(), track.rangeEditRate, rate));
+/// A stream's range (ticks of its own rate) in ticks of the rate, exactly.
+Range<SafeRational> streamRange(const Range<long long>& range, const boost::rational<unsigned long>& from,
+                                const boost::rational<unsigned long>& to) {
+    return Range<SafeRational>(convertTicks(range.first(), from, to), convertTicks(range.second(), from, to));
 }
 
 } // namespace
@@ -144,7 +144,9 @@ boost::rational<unsigned long> Source::editRate() const {
 
 Range<SafeRational> Source::rationalTimeRangeForTrack(int stream) const {
     ScopedReadLock lock(projectLock());
-    return streamRange(stats_->trackStats(stream), editRate_);
+    // Only the range and its rate: every file clip edit asks this, and the
+    // whole record of a stream carries its metadata strings.
+    return streamRange(stats_->trackRange(stream), stats_->rangeEditRate(stream), editRate_);
 }
 
 Range<VelaTime> Source::timeRangeForTrack(int stream) const {
@@ -198,7 +200,8 @@ SourceRefit Source::refitFor(const boost::shared_ptr<MediaFileStats>& stats,
             refit.states.push_back(media ? media->state() : MediaState()); // stills have no extent
             continue;
         }
-        const Range<SafeRational> range = streamRange(contents.tracks[stream], rate);
+        const Range<SafeRational> range =
+            streamRange(contents.tracks[stream].range, contents.tracks[stream].rangeEditRate, rate);
         if (range.second() <= SafeRational(0))
             throw VelaMediaLibException("stream " + std::to_string(stream) + " of " + contents.filename +
                                         " has no length at this edit rate");

@@ -181,9 +181,9 @@ std::vector<MediaPtr> Timeline::allMediasAtTime(VelaTime time) const {
         for (auto track = entry.second->trackBegin(); track != entry.second->trackEnd(); ++track) {
             const Track::Pair pair = (*track)->mediaAtTime(time);
             if (pair.first) clips.push_back(pair.first);
-            if (pair.first) addInside(pair.first, time, clips);
+            if (pair.first && Track::isMadeOfClips(*pair.first)) addInside(pair.first, time, clips);
             if (pair.second) clips.push_back(pair.second);
-            if (pair.second) addInside(pair.second, time, clips);
+            if (pair.second && Track::isMadeOfClips(*pair.second)) addInside(pair.second, time, clips);
         }
     return clips;
 }

@@ -76,8 +76,6 @@ void Track::refuseCollision(const Range<VelaTime>& range, const MediaPtr& media)
     if (!mediasIntersectingRange(range, media).empty()) throw CollisionException(range, media, range.start());
 }
 
-// Outward through the groups holding this track: a group placed inside
-// itself would own itself.
 bool Track::isMadeOfClips(const Media& media) {
     const std::type_info& kind = typeid(media);
     return kind == typeid(Group) || kind == typeid(StitchedMedia) || kind == typeid(UnifiedMedia);
@@ -96,6 +94,8 @@ MediaPtr Track::enclosingClipOf(const Media& media) {
     return boost::dynamic_pointer_cast<Media>(parent); // a unified clip's part
 }
 
+// Outward through the clips holding the container: a clip put inside itself
+// would own itself.
 bool Track::isWithin(const Media* container, const Media& clip) {
     for (MediaPtr outer; container; container = outer.get()) {
         if (container == &clip) return true;
