@@ -1,8 +1,13 @@
 // Composites and sources: refits reach clips inside composites, taking
 // composites apart undoes exactly, and a clip answers with its outermost track.
 #include "../model/SourceTestSupport.h"
+#include "EditTestSupport.h"
 
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/GroupCmd.h>
+#include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
+#include <VelaMediaLib/commands/edits/UnGroupCmd.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
@@ -102,43 +107,7 @@ TEST_F(CompositeSourceTest, AUnifiedClipCannotBeTrimmedPastAShorterFile) {
     EXPECT_LE(unified->internalVisualMedia()->state().mediaEnd(), SafeRational(120));
 }
 
-} // namespace
-
-#include "EditTestSupport.h"
-#include <VelaMediaLib/commands/edits/GroupCmd.h>
-#include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
-#include <VelaMediaLib/commands/edits/UnGroupCmd.h>
-#include <VelaMediaLib/model/media/StitchedMedia.h>
-
-namespace {
-
 class CompositeEditTest : public EditTest {};
-
-// A transition between a grouped clip and one left outside.
-TEST_F(CompositeEditTest, UngroupKeepsTheGroupsLook) {
-    const MediaPtr a = place(0, 20);
-    const auto command = GroupCmd::create({a});
-    ASSERT_TRUE(project->execute(command));
-    const GroupPtr group = command->createdGroup();
-    group->opacity()->setValueAtTime(0.5, RationalTime(0));
-    ASSERT_TRUE(project->execute(UnGroupCmd::create(group)));
-    std::cout << "a opacity after ungroup " << opacityOf(a)->valueAtTime(RationalTime(0)) << std::endl;
-}
-
-// A stitched clip takes the look of the clips it replaces.
-TEST_F(CompositeEditTest, StitchedClipLooksAsItsClipsDid) {
-    const MediaPtr a = place(0, 20), b = place(20, 20);
-    opacityOf(a)->setValueAtTime(0.5, RationalTime(0));
-    opacityOf(b)->setValueAtTime(0.5, RationalTime(0));
-    const auto command = StitchMediaCmd::create(track, {a, b});
-    ASSERT_TRUE(project->execute(command));
-    std::cout << "stitched opacity " << command->stitchedMedia()->opacity()->valueAtTime(RationalTime(0))
-              << std::endl;
-}
-
-} // namespace
-
-namespace {
 
 // Unified clips stitched together: their files still count, and clips of two
 // recordings do not stitch.

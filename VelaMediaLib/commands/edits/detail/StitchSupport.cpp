@@ -55,23 +55,31 @@ bool StitchPartsCmd::execute(CommandHandler*) {
     touched.push_back(stitched_);
     slots_.take(touched);
     const TransitionPtr left = parts_.front()->leftTransition(), right = parts_.back()->rightTransition();
+    bool stitched = false;
     try {
         parts_.front()->setLeftTransition(TransitionPtr());
         parts_.back()->setRightTransition(TransitionPtr());
         stitched_->addMedias(parts_);
+        stitched = true;
         stitched_->setLeftTransition(left);
         stitched_->setRightTransition(right);
     } catch (...) {
+        // An observer may refuse after the parts went in: take them out again.
+        if (stitched) takePartsOut();
         slots_.restore();
         throw;
     }
     return true;
 }
 
-bool StitchPartsCmd::unexecute(CommandHandler*) {
+void StitchPartsCmd::takePartsOut() {
     stitched_->removeAllMedias();
     for (size_t i = 0; i < parts_.size(); ++i) restoreExactly(parts_[i], partStates_[i]);
     restoreExactly(stitched_, stitchedState_);
+}
+
+bool StitchPartsCmd::unexecute(CommandHandler*) {
+    takePartsOut();
     slots_.restore();
     return true;
 }

@@ -45,6 +45,7 @@ public:
     bool unexecute(CommandHandler* handler) override;
 
 private:
+    void takePartsOut();
     boost::shared_ptr<StitchedMedia> stitched_;
     std::vector<MediaPtr> parts_;
     std::vector<MediaState> partStates_;
