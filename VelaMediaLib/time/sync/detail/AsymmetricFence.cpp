@@ -52,7 +52,7 @@ bool protectionChangeFence() {
     if (page == MAP_FAILED) return false;
     const size_t size = size_t(sysconf(_SC_PAGESIZE));
     std::lock_guard<std::mutex> lock(serial);
-    (void)mlock(page, size);
+    if (mlock(page, size) != 0) return false; // a page that may be swapped out proves nothing
     if (mprotect(page, size, PROT_READ | PROT_WRITE) != 0) return false;
     *static_cast<volatile char*>(page) = 1; // the page must be mapped for the change to reach others
     return mprotect(page, size, PROT_READ) == 0;
@@ -69,14 +69,14 @@ bool asymmetricFenceAvailable() {
 }
 
 // The expedited barrier fails only if the registration got lost (registering
-// again mends that) or a sandbox installed since refuses the call: then a
-// protection change does the same on x86, and the slow global barrier is the
-// last resort. Readers rely on the fence: with none left, going on could let
-// a writer run beside them.
+// again mends that) or a sandbox installed since refuses the call: then the
+// slow global barrier comes next, and a protection change, which fences on
+// x86 only, is the last resort. Readers rely on the fence: with none left,
+// going on could let a writer run beside them.
 void heavyFence() {
     if (membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
     if (registerExpedited() && membarrier(MEMBARRIER_CMD_PRIVATE_EXPEDITED) == 0) return;
-    if (protectionChangeFence() || membarrier(MEMBARRIER_CMD_GLOBAL) == 0) return;
+    if (membarrier(MEMBARRIER_CMD_GLOBAL) == 0 || protectionChangeFence()) return;
     std::fputs("VelaMediaLib: no process-wide memory barrier is left (membarrier refused); "
                "build with VELA_ASYMMETRIC_FENCE=OFF for sandboxes that refuse it\n",
                stderr);
