@@ -299,6 +299,11 @@ TEST_F(StitchedMediaTest, TheParameterOfThePartsStepsAtEachStitch) {
     opacity->refresh();
     EXPECT_EQ(opacity->numKeyFrames(), 5u);
     EXPECT_TRUE(opacity->hasKeyFrameAtTime(RationalTime(14)));
+
+    stitched->removeAllMedias(); // nothing left to read: the parts' curve goes
+    opacity->refresh();
+    EXPECT_EQ(opacity->numKeyFrames(), 1u);
+    EXPECT_EQ(opacity->valueAtTime(RationalTime(100)), 1.0);
 }
 
 TEST_F(StitchedMediaTest, ClonesAreDeepAndLookTheSame) {

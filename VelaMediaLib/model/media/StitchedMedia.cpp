@@ -360,10 +360,11 @@ StitchedMedia::mediaAndSubTimeForParametricTime(const SafeRational& parametricTi
 StitchedMedia::MediaAndSubTime
 StitchedMedia::mediaAndSubTimeForParameterTime(const SafeRational& parameterTime) const {
     ScopedReadLock lock(projectLock());
-    const std::vector<Part> parts = partsOn(*track_);
-    if (parts.empty()) return MediaAndSubTime(MediaPtr(), parameterTime);
-    const Part& part = parts[indexAt(parts, parameterTime)];
-    return MediaAndSubTime(part.media, parameterTime - SafeRational(part.state.start));
+    if (track_->mediaBegin() == track_->mediaEnd()) return MediaAndSubTime(MediaPtr(), parameterTime);
+    // As indexAt, by the track's own index: this runs for every time query.
+    auto part = track_->upper_bound(floorTicks(parameterTime));
+    if (part != track_->mediaBegin()) --part;
+    return MediaAndSubTime(part->second, parameterTime - SafeRational(part->first));
 }
 
 SafeRational StitchedMedia::toSubMediaSourceTime(const SafeRational& parametricTime) const {

@@ -34,10 +34,17 @@ public:
     }
 
     /// Reads the parts' keyframes again (they may have been edited since).
+    /// With no part left to read, the curve the parts no longer give goes:
+    /// one keyframe keeps the value it held at the start.
     void refresh() {
         KeyFrameMap curve = readParts();
-        if (curve.empty()) return;
-        this->edit([&] { this->keyframes_.swap(curve); });
+        this->edit([&] {
+            if (curve.empty() && !this->keyframes_.empty())
+                curve.push_back(
+                    {RationalTime(0),
+                     this->newKeyFrame(RationalTime(0), this->keyframes_.front().keyframe->value(), 0)});
+            if (!curve.empty()) this->keyframes_.swap(curve);
+        });
     }
 
     T valueAtTime(const RationalTime& time) const override {
