@@ -72,6 +72,28 @@ TEST_F(GroupCommand, GroupThenUngroupGivesBackAnEqualTimeline) {
     EXPECT_EQ(steps(), originalSteps);
 }
 
+// A transition shared with a clip left outside moves to the group's edge;
+// the grouped clip keeps none that reaches out of the group. Undo is exact.
+TEST_F(GroupCommand, ATransitionToAClipLeftOutsideGoesToTheGroupsEdge) {
+    const MediaPtr before = place(0, 20), a = place(20, 20), b = place(40, 20);
+    const TransitionPtr shared = transition(), inside = transition();
+    before->setRightTransition(shared);
+    Transition::mergeMediaPairTransitions({before, a});
+    a->setRightTransition(inside);
+    Transition::mergeMediaPairTransitions({a, b});
+    ASSERT_EQ(shared->rightMedia(), a);
+
+    const auto command = GroupCmd::create({a, b});
+    expectExactUndo(command);
+    const GroupPtr made = command->createdGroup();
+    EXPECT_FALSE(a->leftTransition());
+    EXPECT_EQ(made->leftTransition(), shared);
+    EXPECT_EQ(shared->leftMedia(), before);
+    EXPECT_EQ(shared->rightMedia(), made);
+    EXPECT_EQ(a->rightTransition(), inside); // between two grouped clips: it stays
+    EXPECT_EQ(b->leftTransition(), inside);
+}
+
 // A group of a group keeps the innermost clip's time, and ungrouping the
 // outer one gives the inner group back its place.
 TEST_F(GroupCommand, NestedGroupsKeepTimesAndUngroupOneLevel) {

@@ -53,6 +53,41 @@ std::vector<Origin> originsOf(const std::vector<MediaPtr>& clips) {
     return origins;
 }
 
+bool selected(const std::vector<MediaPtr>& clips, const MediaPtr& media) {
+    return std::find(clips.begin(), clips.end(), media) != clips.end();
+}
+
+// Parts the grouped clips from the transitions they share with clips left
+// outside: such a transition belongs at the group's edge, where placing the
+// group joins it, not inside with a clip that no longer touches the other
+// side. Undone, every slot and link is back as it was.
+class DetachOutsideTransitionsCmd : public Command {
+public:
+    explicit DetachOutsideTransitionsCmd(const std::vector<MediaPtr>& clips) : clips_(clips) {}
+
+    bool execute(CommandHandler*) override {
+        taken_.assign(clips_.size(), TransitionSlots());
+        for (size_t i = 0; i < clips_.size(); ++i)
+            taken_[i].takeAround(*trackOf(clips_[i]), clips_[i], clips_[i]->trackRange());
+        for (const MediaPtr& media : clips_) {
+            const TransitionPtr left = media->leftTransition(), right = media->rightTransition();
+            if (left && left->leftMedia() && !selected(clips_, left->leftMedia()))
+                media->setLeftTransition(TransitionPtr());
+            if (right && right->rightMedia() && !selected(clips_, right->rightMedia()))
+                media->setRightTransition(TransitionPtr());
+        }
+        return true;
+    }
+    bool unexecute(CommandHandler*) override {
+        for (auto slots = taken_.rbegin(); slots != taken_.rend(); ++slots) slots->restore();
+        return true;
+    }
+
+private:
+    std::vector<MediaPtr> clips_;
+    std::vector<TransitionSlots> taken_;
+};
+
 } // namespace
 
 boost::shared_ptr<CreateGroupCmd> CreateGroupCmd::create(const std::vector<MediaPtr>& clips) {
@@ -83,6 +118,7 @@ void CreateGroupCmd::executeCommands(const CommandHandler*) {
         inner.push_back(boost::dynamic_pointer_cast<GenericTrack>(origin.track->cloneEmpty()));
         mixer->addTrack(inner.back());
     }
+    if (!executeRequired(CommandPtr(new DetachOutsideTransitionsCmd(clips_)))) return;
     for (const Origin& origin : origins)
         for (const MediaPtr& media : origin.clips)
             if (!executeRequired(RemoveMediaCmd::create(origin.track, media))) return;
