@@ -14,6 +14,7 @@ std::string readInterp(const Json::Value& animation) {
     const Json::Value* interp = optionalMember(animation, "interp");
     if (!interp) return std::string();
     const std::string code = jsonValueAsString(*interp);
+    if (code.empty()) return code;
     InterpolaterFactory<double>::byName(code); // refuses a code no interpolater has
     return code;
 }

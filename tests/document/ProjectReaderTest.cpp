@@ -17,7 +17,7 @@ std::string deepGroups(int levels) {
         clip = "{\"_type\": \"Group\", \"start\": 0, \"duration\": 10, \"mediaStart\": 0, \"mediaDuration\": 10, "
                "\"tracks\": [{\"medias\": [" +
                clip + "]}]}";
-    return "[" + clip + "]";
+    return "[{\"medias\": [" + clip + "]}]";
 }
 
 } // namespace
