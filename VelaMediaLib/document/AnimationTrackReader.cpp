@@ -19,9 +19,9 @@ std::string readInterp(const Json::Value& animation) {
     return code;
 }
 
-Animation readAnimation(const Json::Value& value) {
+AnimationTrack::Animation readAnimation(const Json::Value& value) {
     documentObject(value, "an animation object");
-    Animation animation;
+    AnimationTrack::Animation animation;
     if (const Json::Value* range = optionalMember(value, "range"))
         animation.range = jsonValueAsTickRange(*range);
     if (const Json::Value* end = optionalMember(value, "endTime"))
@@ -34,7 +34,7 @@ Animation readAnimation(const Json::Value& value) {
     if (const Json::Value* keyframes = optionalMember(value, "keyframes"))
         for (const Json::Value& entry : documentArray(*keyframes, "an array of animation keyframes")) {
             documentObject(entry, "an animation keyframe");
-            AnimationKeyFrame keyframe;
+            AnimationTrack::KeyFrame keyframe;
             if (const Json::Value* name = optionalMember(entry, "parameterName"))
                 keyframe.parameterName = jsonValueAsString(*name);
             if (const Json::Value* keyValue = optionalMember(entry, "value"))
@@ -51,7 +51,7 @@ AnimationTrackReader::AnimationTrackReader(const boost::shared_ptr<ReadContext>&
     : JSONReader(context), media_(media) {}
 
 AnimationTrack AnimationTrackReader::readTrack(const std::string& name, const Json::Value& animations) {
-    std::vector<Animation> read;
+    std::vector<AnimationTrack::Animation> read;
     for (const Json::Value& entry : documentArray(animations, "an array of animations"))
         read.push_back(readAnimation(entry));
     return AnimationTrack(name, read);

@@ -160,7 +160,7 @@ inline boost::shared_ptr<Project> richProject(const boost::shared_ptr<FileSystem
     hotspot.markerTime = 7;
     callout->setHotspot(hotspot);
     callout->addMetaData("color", "red");
-    AnimationTrack bounce("opacity", {Animation()});
+    AnimationTrack bounce("opacity", {AnimationTrack::Animation()});
     callout->setAnimationTrack(bounce);
     second->addMedia(callout, 3100);
     const auto caption = Caption::create(token, rate, 3200, 40);
