@@ -126,8 +126,9 @@ TEST(ScreenDataReading, CursorClicksAndKeystrokesAreRead) {
         "\"range\": [0, 90], \"editRate\": 30}]}], \"timeline\": {\"sceneTrack\": {\"scenes\": [{\"velaml\": "
         "{\"tracks\": [{\"medias\": [{\"_type\": \"ScreenVMFile\", \"src\": 1, \"trackNumber\": 0, "
         "\"start\": 0, "
-        "\"duration\": 30, \"mediaDuration\": 30, \"screenData\": {\"rect\": [0, 0, 800, 600], \"cursor\": "
-        "[[\"5/2\", 10, 20]], \"clicks\": [[3, 1, 2, 1]], \"keystrokes\": [[4, \"K\", 1]]}}]}]}}]}}}";
+        "\"duration\": 30, \"mediaDuration\": 30, \"screenData\": {\"recordingRect\": [0, 0, 800, 600], "
+        "\"cursor\": [[\"5/2\", 10, 20]], \"clicks\": [[3, 1, 2, 1]], \"keystrokes\": [[4, {\"key\": "
+        "\"K\", \"modifiers\": 1}]]}}]}]}}]}}}";
     const auto screens = parseText(text)->timeline()->instancesOf<ScreenVMFile>();
     ASSERT_EQ(screens.size(), 1u);
     const auto data = screens.front()->screenData();
@@ -137,6 +138,9 @@ TEST(ScreenDataReading, CursorClicksAndKeystrokesAreRead) {
     EXPECT_EQ(data->clicks().front().button, ScreenClick::Right);
     EXPECT_EQ(data->cursorSamples().front().time, RationalTime(SafeRational(5, 2)));
     EXPECT_EQ(data->keystrokes().front().keystroke, KeystrokeData("K", KeystrokeData::Shift));
+    const std::string written = projectToJSONString(*parseText(text));
+    EXPECT_EQ(projectToJSONString(*parseText(written)), written); // what the writer gives back reads back
+    EXPECT_NE(written.find("\"keystrokes\""), std::string::npos);
     EXPECT_EQ(parseFailure(text.replace(text.find("[3, 1, 2, 1]"), 12, "[3, 7]")),
               "Invalid project json - expected a click button (0, 1 or 2): 7");
 }

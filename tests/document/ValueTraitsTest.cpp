@@ -57,8 +57,8 @@ Texts samples(Point3d*) { return {"[1e-20, -2.0, 3.5]", "[1e-300, 2.0, 3.0]", "[
 Texts samples(SafeRational*) { return {"\"-7/3\"", "\"1/3\"", "-5"}; }
 Texts samples(TextAttributeList*) {
     return {
-        R"({"text" : "bold words", "runs" : [{"start" : 0, "length" : 4, "name" : "fontWeight", "value" : "bold"}]})",
-        R"({"text" : "plain", "runs" : []})"};
+        R"({"textAttributeList" : {"text" : "bold words", "runs" : [{"start" : 0, "length" : 4, "name" : "fontWeight", "value" : "bold"}]}})",
+        R"({"textAttributeList" : {"text" : "plain", "runs" : []}})"};
 }
 Texts samples(TransformMatrix*) {
     return {
@@ -152,8 +152,8 @@ TEST(ValueTraits, WrongShapesAreRefusedWithTheValue) {
     EXPECT_THROW(ValueTraits<Point3d>::read(parseJson("[1, 2]")), ParserException);
     EXPECT_THROW(ValueTraits<TemplatedColor<int>>::read(parseJson("[1, 2, 3, 4.5]")), ParserException);
     EXPECT_THROW(ValueTraits<int>::read(parseJson("\"3\"")), ParserException);
-    EXPECT_THROW(ValueTraits<TextAttributeList>::read(
-                     parseJson(R"({"text": "ab", "runs": [{"start": 1, "length": 5}]})")),
+    EXPECT_THROW(ValueTraits<TextAttributeList>::read(parseJson(
+                     R"({"textAttributeList": {"text": "ab", "runs": [{"start": 1, "length": 5}]}})")),
                  ParserException);
 }
 

@@ -102,7 +102,7 @@ TEST_F(VisualContent, DocumentsCarryTheKindsAndTheirSettings) {
     EXPECT_EQ(calloutDoc["_type"].asString(), "Callout");
     EXPECT_FALSE(calloutDoc["attributes"]["autoRotateText"].asBool());
     EXPECT_TRUE(calloutDoc["attributes"].isMember("autoRotateText"));
-    EXPECT_EQ(calloutDoc["parameters"]["text"]["text"].asString(), "Hello");
+    EXPECT_EQ(calloutDoc["parameters"]["text"]["textAttributeList"]["text"].asString(), "Hello");
 }
 
 TEST_F(VisualContent, EachKindDispatchesToItsOwnOperation) {

@@ -2,6 +2,7 @@
 #include <VelaMediaLib/document/detail/ScreenDataReading.h>
 #include <VelaMediaLib/model/media/ScreenDataProvider.h>
 #include <VelaMediaLib/model/media/ScreenRecordingData.h>
+#include <VelaMediaLib/time/parameters/ValueTraits.h>
 
 #include <boost/make_shared.hpp>
 
@@ -21,7 +22,7 @@ void readScreenData(const Json::Value& media, ScreenDataHolder& holder) {
     if (!screen) return;
     documentObject(*screen, "a screenData object");
     const auto data = boost::make_shared<ScreenRecordingData>();
-    if (const Json::Value* rect = optionalMember(*screen, "rect")) {
+    if (const Json::Value* rect = optionalMember(*screen, "recordingRect")) {
         jsonArrayOf(*rect, 4, "a rectangle [x, y, width, height]");
         data->setRecordingRect(Rect<int>(jsonValueAsInt((*rect)[0]), jsonValueAsInt((*rect)[1]),
                                          jsonValueAsInt((*rect)[2]), jsonValueAsInt((*rect)[3])));
@@ -43,10 +44,8 @@ void readScreenData(const Json::Value& media, ScreenDataHolder& holder) {
         }
     if (const Json::Value* keys = optionalMember(*screen, "keystrokes"))
         for (const Json::Value& entry : documentArray(*keys, "an array of keystrokes")) {
-            entryOf(entry, 2, "a keystroke [time, key, modifiers]");
-            const int modifiers = entry.size() > 2 ? jsonValueAsInt(entry[2]) : 0;
-            data->addKeystroke(jsonValueAsRationalTime(entry[0]),
-                               KeystrokeData(jsonValueAsString(entry[1]), modifiers));
+            entryOf(entry, 2, "a keystroke [time, {\"key\", \"modifiers\"}]");
+            data->addKeystroke(jsonValueAsRationalTime(entry[0]), ValueTraits<KeystrokeData>::read(entry[1]));
         }
     holder.setScreenData(data);
 }

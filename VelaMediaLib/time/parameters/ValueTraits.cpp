@@ -101,8 +101,8 @@ KeystrokeData ValueTraits<KeystrokeData>::read(const Json::Value& json) {
 
 void ValueTraits<TextAttributeList>::write(XMLOptions& options, int, const TextAttributeList& list) {
     std::ostream& out = options.stream();
-    out << "{" << options.inlineKey("text") << quotedJSONString(list.text()) << options.inlineSeparator()
-        << options.inlineKey("runs") << "[";
+    out << "{" << options.inlineKey("textAttributeList") << "{" << options.inlineKey("text")
+        << quotedJSONString(list.text()) << options.inlineSeparator() << options.inlineKey("runs") << "[";
     bool first = true;
     for (const TextAttributeList::Run& run : list.runs()) {
         out << (first ? "" : options.inlineSeparator()) << "{" << options.inlineKey("start") << run.start
@@ -111,10 +111,12 @@ void ValueTraits<TextAttributeList>::write(XMLOptions& options, int, const TextA
             << options.inlineSeparator() << options.inlineKey("value") << quotedJSONString(run.value) << "}";
         first = false;
     }
-    out << "]}";
+    out << "]}}";
 }
-TextAttributeList ValueTraits<TextAttributeList>::read(const Json::Value& json) {
-    const char* what = "attributed text {\"text\", \"runs\"}";
+// A callout's text parameter carries its text in "textAttributeList".
+TextAttributeList ValueTraits<TextAttributeList>::read(const Json::Value& wrapped) {
+    const char* what = "attributed text {\"textAttributeList\": {\"text\", \"runs\"}}";
+    const Json::Value& json = jsonMemberOf(wrapped, "textAttributeList", what);
     TextAttributeList list(jsonValueAsString(jsonMemberOf(json, "text", what)));
     for (const Json::Value& run : jsonMemberOf(json, "runs", what)) {
         if (!run.isObject() || !run["start"].isUInt64() || !run["length"].isUInt64())
