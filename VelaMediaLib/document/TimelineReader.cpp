@@ -73,7 +73,7 @@ bool TimelineReader::read(const Json::Value& value) {
     }
     if (const Json::Value* attributes = optionalMember(value, "trackAttributes")) {
         documentArray(*attributes, "an array of track attributes");
-        if (mixers.empty() || attributes->size() > mixers.front()->numTracks())
+        if (attributes->size() > (mixers.empty() ? 0u : mixers.front()->numTracks()))
             refuseDocument("more trackAttributes than tracks");
         for (Json::ArrayIndex i = 0; i < attributes->size(); ++i)
             TrackReader::readTrackAttributes((*attributes)[i], *mixers.front()->trackAtIndex(i));

@@ -167,9 +167,10 @@ void ParameterImpl<T>::readInto(const Json::Value& json) {
 template <typename T>
 void ParameterImpl<T>::readKeyFrames(const Json::Value& json) {
     const Json::Value& array = json["keyframes"];
-    if (array.isNull()) return;
-    if (!array.isArray()) throw ParserException("Invalid project json - \"keyframes\" is not an array");
+    if (!array.isNull() && !array.isArray())
+        throw ParserException("Invalid project json - \"keyframes\" is not an array");
     for (const Json::Value& keyframe : array) readKeyFrame(keyframe);
+    // Read from nothing, a parameter object without keyframes would hold no value.
     if (keyframes_.empty())
         throw ParserException("Invalid project json - parameter " + identifier_ + " has no keyframe");
 }
