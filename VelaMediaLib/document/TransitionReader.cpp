@@ -1,0 +1,34 @@
+#include <VelaMediaLib/document/TransitionReader.h>
+#include <VelaMediaLib/document/detail/ReadSupport.h>
+#include <VelaMediaLib/document/format/detail/JSONTreeAccess.h>
+#include <VelaMediaLib/model/media/Media.h>
+#include <VelaMediaLib/model/media/Transition.h>
+
+namespace VelaMediaLib {
+
+boost::shared_ptr<Media> TransitionReader::mediaOf(const Json::Value& value, const char* key) const {
+    const Json::Value* id = optionalMember(value, key);
+    if (!id) return {};
+    const long long named = jsonValueAsInt64(*id);
+    const auto found = context().medias.find(named);
+    if (found == context().medias.end()) refuseDocument("unknown media id: " + std::to_string(named));
+    return found->second;
+}
+
+bool TransitionReader::read(const Json::Value& value) {
+    setValue(value);
+    documentObject(value, "a transition object");
+    const std::string name = jsonValueAsString(requiredMember(value, "name", "a transition"));
+    const long long duration = jsonValueAsVelaTime(requiredMember(value, "duration", "a transition"));
+    if (duration < 0) refuseDocument("transition " + name + ": negative duration " + std::to_string(duration));
+    const MediaPtr left = mediaOf(value, "leftMedia");
+    const MediaPtr right = mediaOf(value, "rightMedia");
+    transition_ = boost::shared_ptr<Transition>(new Transition(name, duration));
+    if (const Json::Value* attributes = optionalMember(value, "attributes"))
+        transition_->setAttributes(jsonTreeFromValue(documentObject(*attributes, "an object of attributes")));
+    if (left) left->setRightTransition(transition_);
+    if (right) right->setLeftTransition(transition_);
+    return true;
+}
+
+} // namespace VelaMediaLib
