@@ -18,7 +18,8 @@ TEST(TextDifference, NamesLineColumnAndBothLines) {
     EXPECT_EQ(8u, difference.column());
     std::ostringstream out;
     difference.print(out, "document", "rewrite");
-    EXPECT_EQ("first difference at line 3, column 8:\n  document:   \"b\": 2\n  rewrite:   \"b\": 3\n", out.str());
+    EXPECT_EQ("first difference at line 3, column 8:\n  document:   \"b\": 2\n  rewrite:   \"b\": 3\n",
+              out.str());
 }
 
 TEST(TextDifference, OneTextEndingEarlierDiffersWhereItEnds) {

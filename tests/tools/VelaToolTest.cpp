@@ -14,7 +14,9 @@ namespace {
 
 const char* const kSubcommands[] = {"info", "validate", "at", "roundtrip", "fmt"};
 
-bool contains(const std::string& text, const std::string& part) { return text.find(part) != std::string::npos; }
+bool contains(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
 
 std::string scratchPath(const std::string& name) { return ::testing::TempDir() + "vela-tool-" + name; }
 
@@ -66,7 +68,8 @@ TEST(VelaToolInfo, JSONHoldsTheSameAsTheText) {
     for (const char* member : {"editRate", "width", "height", "duration", "tracks", "clips", "sources"})
         EXPECT_TRUE(info.isMember(member)) << member;
     EXPECT_TRUE(contains(text.out, "edit rate  " + info["editRate"].asString() + " ticks per second"));
-    EXPECT_TRUE(contains(text.out, "canvas     " + info["width"].asString() + " x " + info["height"].asString()));
+    EXPECT_TRUE(
+        contains(text.out, "canvas     " + info["width"].asString() + " x " + info["height"].asString()));
     EXPECT_TRUE(contains(text.out, "duration   " + info["duration"].asString() + " ticks"));
     EXPECT_TRUE(contains(text.out, "tracks     " + info["tracks"].asString() + "\n"));
     for (const std::string& kind : info["clips"].getMemberNames())
@@ -78,8 +81,8 @@ TEST(VelaToolInfo, CountsEveryKindAndTellsSourcesOffline) {
     const Run json = runVela({"info", samplePath("every-kind.json"), "--json"});
     ASSERT_EQ(0, json.status) << json.err;
     const Json::Value info = parseJson(json.out);
-    for (const char* kind : {"AMFile", "Callout", "Caption", "Group", "IMFile", "ScreenIMFile", "ScreenVMFile",
-                             "StitchedMedia", "UnifiedMedia", "VMFile", "PlaceholderMedia"})
+    for (const char* kind : {"AMFile", "Callout", "Caption", "Group", "IMFile", "ScreenIMFile",
+                             "ScreenVMFile", "StitchedMedia", "UnifiedMedia", "VMFile", "PlaceholderMedia"})
         EXPECT_LE(1, info["clips"][kind].asInt()) << kind;
     EXPECT_EQ("30/1", info["editRate"].asString());
     ASSERT_LE(1u, info["sources"].size());
