@@ -47,6 +47,7 @@
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/commands/framework/NullCmd.h>
 #include <VelaMediaLib/document/JSONReader.h>
+#include <VelaMediaLib/document/format/JSONTree.h>
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/document/format/VersionInfo.h>
@@ -54,9 +55,11 @@
 #include <VelaMediaLib/effects/Effect.h>
 #include <VelaMediaLib/effects/EffectList.h>
 #include <VelaMediaLib/effects/Effectable.h>
+#include <VelaMediaLib/effects/StoredEffect.h>
 #include <VelaMediaLib/model/media/AMFile.h>
 #include <VelaMediaLib/model/media/AbstractIMFile.h>
 #include <VelaMediaLib/model/media/AbstractUnifiedMedia.h>
+#include <VelaMediaLib/model/media/AnimationTrack.h>
 #include <VelaMediaLib/model/media/AudioMedia.h>
 #include <VelaMediaLib/model/media/AudioMediaImpl.h>
 #include <VelaMediaLib/model/media/AudioSide.h>
@@ -70,6 +73,7 @@
 #include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/media/GroupChildrensTimeConverter.h>
 #include <VelaMediaLib/model/media/GroupMediaState.h>
+#include <VelaMediaLib/model/media/HotspotInfo.h>
 #include <VelaMediaLib/model/media/IMFile.h>
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
 #include <VelaMediaLib/model/media/Media.h>

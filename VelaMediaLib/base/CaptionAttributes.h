@@ -7,6 +7,8 @@
 
 namespace VelaMediaLib {
 
+class XMLOptions;
+
 /// How the timeline's captions are shown.
 struct VELAMEDIALIB_API CaptionAttributes {
     bool enabled = false;
@@ -20,6 +22,14 @@ struct VELAMEDIALIB_API CaptionAttributes {
     double opacity = 1.0;
     bool backgroundEnabled = true;
     bool backgroundOnlyAroundText = false;
+
+    /// The object, closed at indent, members in the order above (written in
+    /// time/parameters/CaptionAttributesDocument.cpp).
+    void toJSON(XMLOptions& options, int indent) const;
+    /// The same for the given attributes.
+    static void toJSON(XMLOptions& options, int indent, const CaptionAttributes& attributes) {
+        attributes.toJSON(options, indent);
+    }
 };
 
 } // namespace VelaMediaLib

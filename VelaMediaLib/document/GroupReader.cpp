@@ -1,6 +1,7 @@
 #include <VelaMediaLib/document/GroupReader.h>
 #include <VelaMediaLib/document/MixerReader.h>
 #include <VelaMediaLib/document/detail/ReadSupport.h>
+#include <VelaMediaLib/document/format/detail/JSONTreeAccess.h>
 #include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/project/Project.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
@@ -26,8 +27,8 @@ void GroupReader::readOtherAttributes(const Json::Value& attributes, Media& medi
 
 void GroupReader::readSpecificProperties(const Json::Value& value, Media& media) {
     if (const Json::Value* properties = optionalMember(value, "assetProperties"))
-        documentArray(*properties, "an array of asset properties");
-    (void)media;
+        dynamic_cast<Group&>(media).setAssetProperties(
+            jsonTreeFromValue(documentArray(*properties, "an array of asset properties")));
 }
 
 } // namespace VelaMediaLib

@@ -114,6 +114,17 @@ public:
     void detachCommandObserver(Observer* observer) override { commandSubject_->detach(observer); }
     CommandHandler& edgeModCommandHandler() override { return *this; }
 
+    /// Root members: the project attributes it has ("title", "description",
+    /// "author", "targetLoudness", "shouldApplyLoudnessNormalization",
+    /// "videoFormatFrameRate", "audioFormatSampleRate", "allowSubFrameEditing"),
+    /// "width", "height", "version", "editRate", "authoringClientName",
+    /// "sourceBin", "timeline", "metadata".
+    void toJSON(XMLOptions& options) const override;
+    /// Defined with the readers (document/).
+    boost::shared_ptr<Project> clone() const override;
+    /// The "version" the writer puts into every document.
+    static const char* documentVersion() { return "1.0"; }
+
     bool parsingProject() const override { return parsing_; }
     void setParsingProject(bool parsing) override { parsing_ = parsing; }
 

@@ -35,10 +35,11 @@ void readScreenData(const Json::Value& media, ScreenDataHolder& holder) {
         }
     if (const Json::Value* clicks = optionalMember(*screen, "clicks"))
         for (const Json::Value& entry : documentArray(*clicks, "an array of clicks")) {
-            entryOf(entry, 2, "a click [time, button]");
-            const int button = jsonValueAsInt(entry[1]);
+            entryOf(entry, 2, "a click [time, button] or [time, x, y, button]");
+            const Json::Value& pressed = entry[entry.size() - 1];
+            const int button = jsonValueAsInt(pressed);
             if (button < ScreenClick::Left || button > ScreenClick::Middle)
-                refuseJSONValue("a click button (0, 1 or 2)", entry[1]);
+                refuseJSONValue("a click button (0, 1 or 2)", pressed);
             data->addClick(jsonValueAsRationalTime(entry[0]), ScreenClick::Button(button));
         }
     if (const Json::Value* keys = optionalMember(*screen, "keystrokes"))

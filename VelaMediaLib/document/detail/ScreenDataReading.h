@@ -1,6 +1,7 @@
 #pragma once
 // A screen recording's "screenData": "rect" [x, y, w, h], "cursor" [[time, x,
-// y], ...], "clicks" [[time, button], ...] and "keystrokes" [[time, key,
+// y], ...], "clicks" [[time, button], ...] (or [time,
+// x, y, button]) and "keystrokes" [[time, key,
 // modifiers], ...], times exact (integers or "n/d").
 
 #include <json/value.h>

@@ -8,7 +8,7 @@ namespace VelaMediaLib {
 XMLOptions::XMLOptions(std::ostream& stream, int indentWidth) : stream_(stream), indentWidth_(indentWidth) {}
 
 std::string XMLOptions::indentation(int level) const {
-    return std::string(size_t(level > 0 ? level * indentWidth_ : 0), ' ');
+    return std::string(size_t(level > 0 && !compact() ? level * indentWidth_ : 0), ' ');
 }
 
 void XMLOptions::separate(bool array) {
@@ -17,14 +17,18 @@ void XMLOptions::separate(bool array) {
     if (innermost.array != array)
         throw VelaMediaLibException(array ? "an array element written inside an object"
                                           : "an object member written inside an array");
-    if (!innermost.empty) stream_ << ",\n";
+    if (!innermost.empty) stream_ << (compact() ? "," : ",\n");
     innermost.empty = false;
     stream_ << indentation(innermost.level + 1);
 }
 
+std::string XMLOptions::inlineKey(const std::string& name) const {
+    return compact() ? quotedJSONString(name) + ":" : keyName(name);
+}
+
 std::ostream& XMLOptions::key(const std::string& name) {
     separate(false);
-    return stream_ << keyName(name);
+    return stream_ << inlineKey(name);
 }
 
 std::ostream& XMLOptions::element() {
@@ -33,7 +37,8 @@ std::ostream& XMLOptions::element() {
 }
 
 void XMLOptions::openContainer(int level, bool array) {
-    stream_ << (array ? "[\n" : "{\n");
+    stream_ << (array ? "[" : "{");
+    if (!compact()) stream_ << "\n";
     open_.push_back(Container{level, array, true});
 }
 
@@ -41,14 +46,14 @@ void XMLOptions::closeContainer() {
     if (open_.empty()) return;
     const Container closing = open_.back();
     open_.pop_back();
-    if (!closing.empty) stream_ << "\n";
+    if (!closing.empty && !compact()) stream_ << "\n";
     stream_ << indentation(closing.level) << (closing.array ? "]" : "}");
 }
 
 unsigned XMLOptions::assignNewIdent(const void* object) {
-    const unsigned ident = nextIdent_++;
-    idents_[object] = ident;
-    return ident;
+    const auto inserted = idents_.emplace(object, nextIdent_);
+    if (inserted.second) ++nextIdent_;
+    return inserted.first->second;
 }
 
 unsigned XMLOptions::findIdent(const void* object) const {

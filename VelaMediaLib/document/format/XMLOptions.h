@@ -6,6 +6,7 @@
 #include <map>
 #include <ostream>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -17,6 +18,9 @@ namespace VelaMediaLib {
 /// name ids of the same write), and the modifier applied to every file path
 /// written. One options object serves one document: its identifiers count
 /// on and its table is never cleared.
+///
+/// An indent width of 0 writes the compact form: no line breaks, no
+/// indentation, members separated by "," alone and keys written as "\"key\":".
 class VELAMEDIALIB_API XMLOptions {
 public:
     typedef boost::function<std::string(const std::string&)> PathModifier;
@@ -25,6 +29,8 @@ public:
 
     std::ostream& stream() { return stream_; }
     int indentWidth() const { return indentWidth_; }
+    /// Whether the compact form is written (indent width 0).
+    bool compact() const { return indentWidth_ <= 0; }
     /// The blanks that open a line at the given level.
     std::string indentation(int level) const;
 
@@ -37,11 +43,38 @@ public:
     /// inside an open object.
     std::ostream& element();
 
-    /// A fresh identifier for the object, remembered for findIdent. Identifiers
-    /// count from 1 within one write.
+    /// The key and the separator of values written on one line inside a
+    /// value (a caption's "text" and "lang"): "\"key\" : " and ", ", or
+    /// "\"key\":" and "," in the compact form.
+    std::string inlineKey(const std::string& name) const;
+    const char* inlineSeparator() const { return compact() ? "," : ", "; }
+
+    /// The object's identifier in this write: the one it already has, or else
+    /// a fresh one, remembered for findIdent. An object referred to before it
+    /// is written (a hotspot's marker target) takes its identifier there and
+    /// keeps it when written. Fresh identifiers count from 1 in the order
+    /// they are asked for, so one model always gives the same ids.
     unsigned assignNewIdent(const void* object);
     /// The identifier assigned to the object in this write, or 0 when none was.
     unsigned findIdent(const void* object) const;
+    /// The same for a typed object: a polymorphic object is known by its
+    /// whole object's address, so a clip has one identifier whether it is
+    /// reached as a Media, a MediaImpl or a Parametric.
+    template <typename T>
+    unsigned assignNewIdent(const T* object) {
+        return assignNewIdent(identityOf(object));
+    }
+    template <typename T>
+    unsigned findIdent(const T* object) const {
+        return findIdent(identityOf(object));
+    }
+    template <typename T>
+    static const void* identityOf(const T* object) {
+        if constexpr (std::is_polymorphic<T>::value)
+            return dynamic_cast<const void*>(object);
+        else
+            return object;
+    }
 
     void setPathModifier(const PathModifier& modifier) { pathModifier_ = modifier; }
     /// The path as it should be written; unchanged without a modifier.

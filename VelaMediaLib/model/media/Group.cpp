@@ -312,6 +312,7 @@ boost::shared_ptr<Media> Group::clone() const {
     const boost::shared_ptr<Group> group =
         adopt(boost::shared_ptr<Group>(new Group(projectMutex(), projectEditRate(), state(), mixer)));
     copyContentInto(*group);
+    group->assetProperties_ = assetProperties(); // the copy is not shared yet
     return group;
 }
 

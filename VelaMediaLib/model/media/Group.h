@@ -1,6 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/document/format/JSONTree.h>
 #include <VelaMediaLib/model/media/AbstractUnifiedMedia.h>
 #include <VelaMediaLib/model/media/GroupChildrensTimeConverter.h>
 #include <VelaMediaLib/model/media/GroupMediaState.h>
@@ -78,6 +79,17 @@ public:
     /// derived the same way when unset); without one, the canvas of the
     /// timeline the group lies on. Returns whether it set anything.
     bool updateGroupWidthAndHeightIfNotSet();
+
+    // Document (GroupDocument.cpp)
+    /// "tracks" (each inner track's object, flags included) then
+    /// "assetProperties" (when not empty).
+    void toJSONSpecificProperties(XMLOptions& options, int indent) const override;
+    /// The "tracks" member alone: the group's inner tracks, written at indent.
+    void toJSONVelaML(XMLOptions& options, int indent) const;
+    /// The group's asset properties (entries with "name", "type", "objects",
+    /// "themeMappings"), kept whole as the document gave them.
+    JSONTree assetProperties() const;
+    void setAssetProperties(const JSONTree& properties);
 
     // Quick properties: a choice among the properties the group offers
     std::vector<std::string> quickPropertyList() const;
@@ -164,6 +176,7 @@ private:
     const boost::shared_ptr<GenericMixer> mixer_;
     const GroupChildrensTimeConverter childrensTime_;
     AddObserverList<MixerAddObserver> addObservers_;
+    JSONTree assetProperties_; // guarded by the project's lock
 };
 
 typedef boost::shared_ptr<Group> GroupPtr;

@@ -350,11 +350,17 @@ void MediaImpl::copyContentInto(MediaImpl& clone) const {
     copyAttributesTo(clone);
     for (const auto& entry : metaDataCopy()) clone.addMetaData(entry.first, entry.second);
     clone.effectList().replaceAll(effectList().cloned());
-    ScopedReadLock lock(projectLock());
-    for (const EdgeModificationPtr& edge : leftEdges_)
-        clone.leftEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
-    for (const EdgeModificationPtr& edge : rightEdges_)
-        clone.rightEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
+    {
+        ScopedReadLock lock(projectLock());
+        for (const EdgeModificationPtr& edge : leftEdges_)
+            clone.leftEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
+        for (const EdgeModificationPtr& edge : rightEdges_)
+            clone.rightEdges_.push_back(EdgeModificationPtr(new EdgeModification(*edge)));
+        clone.animationTracks_ = animationTracks_;
+        if (sourceEffect_)
+            clone.sourceEffect_ = boost::static_pointer_cast<StoredEffect>(sourceEffect_->cloneEffect());
+    }
+    copyFamilyContentInto(clone);
 }
 
 void MediaImpl::setupSharedClone(const boost::shared_ptr<Media>& clone) const {
@@ -377,25 +383,6 @@ void MediaImpl::toJSONTemporalValues(XMLOptions& options, int indent) const {
     writeJSONValue(options, indent, s.mediaDuration);
     options.key("scalar");
     writeJSONValue(options, indent, s.scalar);
-}
-
-void MediaImpl::toJSON(XMLOptions& options, int indent) const {
-    JSONWriter object(options, indent);
-    const int members = object.memberLevel();
-    options.key("id") << options.assignNewIdent(this);
-    options.key("_type");
-    writeJSONValue(options, members, MediaTypeFromMediaDispatcher::typeOf(*this));
-    options.key("attributes");
-    {
-        JSONWriter attributes(options, members);
-        options.key("ident");
-        writeJSONValue(options, attributes.memberLevel(), identifier());
-        writeAttributes(options, attributes.memberLevel());
-    }
-    toJSONSpecificProperties(options, members);
-    toJSONTemporalValues(options, members);
-    toJSONParameterList(options, members);
-    MetaDatable::toJSON(options, members, *this);
 }
 
 } // namespace VelaMediaLib

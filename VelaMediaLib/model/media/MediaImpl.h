@@ -1,11 +1,14 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/effects/StoredEffect.h>
+#include <VelaMediaLib/model/media/AnimationTrack.h>
 #include <VelaMediaLib/model/media/Media.h>
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 #include <VelaMediaLib/model/timeline/SubTimelineParts.h>
 
 #include <atomic>
+#include <map>
 #include <memory>
 
 namespace VelaMediaLib {
@@ -111,7 +114,25 @@ public:
     boost::shared_ptr<ParameterInterface> paramWithFullyQualifiedName(const std::string& name) const override;
     void setupSharedClone(const boost::shared_ptr<Media>& clone) const override;
     void toJSONTemporalValues(XMLOptions& options, int indent) const override;
+    /// "id", "_type", the file kinds' "src" and "trackNumber", "attributes",
+    /// the kind's members, the temporal values, then "animationTracks",
+    /// "parameters", "effects", "hotspot", "leftEdgeMods", "rightEdgeMods",
+    /// "sourceEffect" (each only when there is something) and "metadata".
+    /// Each value is read under the project's read lock on its own.
     void toJSON(XMLOptions& options, int indent) const override;
+
+    // Parts the document keeps whole (read and written, cloned with the clip)
+    typedef std::map<std::string, AnimationTrack> AnimationTracks;
+    /// The clip's animation tracks by parameter name.
+    AnimationTracks animationTracks() const;
+    /// Sets the animations of the parameter (the track takes the name); a
+    /// track without animations removes the parameter's. Notifies when changed.
+    void setAnimationTrack(const std::string& name, const AnimationTrack& track);
+    void setAnimationTrack(const AnimationTrack& track) { setAnimationTrack(track.name(), track); }
+    /// The effect applied to the clip's source itself, or null.
+    StoredEffectPtr sourceEffect() const;
+    /// Null clears it. Notifies when changed.
+    void setSourceEffect(const StoredEffectPtr& effect);
 
 protected:
     MediaState stateAfter(const TimingEdit& edit) const override;
@@ -128,6 +149,10 @@ protected:
     /// Gives a clone of this clip everything but its placement on a track:
     /// name, parameters, attributes, metadata, effects and edge modifications.
     void copyContentInto(MediaImpl& clone) const;
+    /// What a clip family adds to copyContentInto (a visual clip's hotspot).
+    virtual void copyFamilyContentInto(MediaImpl&) const {}
+    /// The members a clip family writes after "effects" (a visual clip's "hotspot").
+    virtual void toJSONFamilyMembers(XMLOptions&, int) const {}
     void addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     bool removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     void setEdgeModificationLength(EdgeModifications& side, VelaTime length);
@@ -150,6 +175,8 @@ private:
     /// takes no lock (readers ask for it inside their snapshots).
     std::atomic<MediaEditor*> oldEditor_{nullptr};
     EdgeModifications leftEdges_, rightEdges_;
+    AnimationTracks animationTracks_; // guarded by the project's lock
+    StoredEffectPtr sourceEffect_;
     boost::weak_ptr<SubTimeline> parent_;
 };
 

@@ -3,6 +3,7 @@
 #include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
+#include <VelaMediaLib/document/format/JSONTree.h>
 #include <VelaMediaLib/time/rational/VelaTime.h>
 
 #include <boost/shared_ptr.hpp>
@@ -13,9 +14,11 @@
 namespace VelaMediaLib {
 
 class Media;
+class XMLOptions;
 
 /// A transition at a clip's edge, or between two touching clips: its kind by
-/// name, its length in ticks and the clips on either side.
+/// name, its length in ticks, the clips on either side and its attributes
+/// (the transition kind's parameters, kept whole as the document gave them).
 class VELAMEDIALIB_API Transition : public VelaObject, public virtual XMLIdentified {
 public:
     Transition(std::string name, VelaTime duration) : name_(std::move(name)), duration_(duration) {}
@@ -27,6 +30,13 @@ public:
     boost::shared_ptr<Media> rightMedia() const { return rightMedia_.lock(); }
     void setLeftMedia(const boost::weak_ptr<Media>& media) { leftMedia_ = media; }
     void setRightMedia(const boost::weak_ptr<Media>& media) { rightMedia_ = media; }
+    const JSONTree& attributes() const { return attributes_; }
+    void setAttributes(const JSONTree& attributes) { attributes_ = attributes; }
+
+    /// The transition's object, closed at indent: "name", "duration",
+    /// "leftMedia" and "rightMedia" (the ids the clips have in this write;
+    /// a side without a clip is left out), "attributes" (when not empty).
+    void toJSON(XMLOptions& options, int indent) const;
 
     /// Joins the transition that two touching clips share again: when the
     /// earlier clip has a right transition (or else the later one a left one),
@@ -35,7 +45,9 @@ public:
     mergeMediaPairTransitions(const std::pair<boost::shared_ptr<Media>, boost::shared_ptr<Media>>& pair);
 
     boost::shared_ptr<Transition> clone() const {
-        return boost::shared_ptr<Transition>(new Transition(name_, duration_));
+        const boost::shared_ptr<Transition> copy(new Transition(name_, duration_));
+        copy->attributes_ = attributes_;
+        return copy;
     }
 
 private:
@@ -43,8 +55,11 @@ private:
     VelaTime duration_;
     boost::weak_ptr<Media> leftMedia_;
     boost::weak_ptr<Media> rightMedia_;
+    JSONTree attributes_;
 };
 
 typedef boost::shared_ptr<Transition> TransitionPtr;
+/// The name the document's writers and readers know transitions by.
+typedef Transition GenericTransition;
 
 } // namespace VelaMediaLib

@@ -1,8 +1,11 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/model/media/HotspotInfo.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 #include <VelaMediaLib/model/media/VisualMedia.h>
+
+#include <boost/optional.hpp>
 
 namespace VelaMediaLib {
 
@@ -49,7 +52,14 @@ public:
     Rect<float> geometryCropRectAtTime(const RationalTime& time) const override;
     Rect<float> sourceCropRectAtTime(const RationalTime& time) const override;
 
+    /// What a click on the clip does, if anything (see HotspotInfo).
+    boost::optional<HotspotInfo> hotspot() const;
+    /// An empty optional removes it. Notifies when changed.
+    void setHotspot(const boost::optional<HotspotInfo>& hotspot);
+
 protected:
+    void copyFamilyContentInto(MediaImpl& clone) const override;
+    void toJSONFamilyMembers(XMLOptions& options, int indent) const override;
     boost::shared_ptr<ParameterInterface> createDefaultParameter(const std::string& name) const override;
     std::vector<std::string> defaultParameterNames() const override;
 
@@ -59,6 +69,8 @@ private:
     Point3d point(const char* name, const RationalTime& time, const Point3d& fallback) const {
         return parameterValueAtTime<Point3d>(name, time, fallback);
     }
+
+    boost::optional<HotspotInfo> hotspot_; // guarded by the project's lock
 };
 
 } // namespace VelaMediaLib

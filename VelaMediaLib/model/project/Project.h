@@ -14,6 +14,7 @@ namespace VelaMediaLib {
 
 class CommandHandler;
 class Source;
+class XMLOptions;
 
 /// The document: the timeline, the source bin, the clipboard, the command
 /// history and the settings, and the one reader-writer lock of the whole
@@ -138,6 +139,14 @@ public:
     virtual void attachCommandObserver(Observer* observer) = 0;
     virtual void detachCommandObserver(Observer* observer) = 0;
     virtual CommandHandler& edgeModCommandHandler() = 0;
+
+    // Document
+    /// Writes the whole project document (see InternalProjectDocument.cpp),
+    /// taking the read lock per value: other threads may read meanwhile.
+    virtual void toJSON(XMLOptions& options) const = 0;
+    /// A project of its own with the same content: the document written and
+    /// read back (ids are assigned anew). Throws as the reader does.
+    virtual boost::shared_ptr<Project> clone() const = 0;
 
     /// True while a document is being read into the project.
     virtual bool parsingProject() const = 0;

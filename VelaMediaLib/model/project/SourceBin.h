@@ -17,6 +17,7 @@ namespace VelaMediaLib {
 class FileSystem;
 class ProjectEditRate;
 class Source;
+class XMLOptions;
 struct SourceRefit;
 
 /// The project's imported sources, in the order they came, with an index by
@@ -42,6 +43,9 @@ public:
     Sources::const_iterator begin() const { return sources_.begin(); }
     Sources::const_iterator end() const { return sources_.end(); }
     Sources sources() const;
+    /// The array of the sources' entries in bin order, closed at indent
+    /// (SourceBinDocument.cpp).
+    void toJSON(XMLOptions& options, int indent) const;
     size_t numSources() const;
     size_t size() const { return numSources(); }
     /// The source's position, or -1.

@@ -27,6 +27,7 @@ class ParameterInterface;
 class ProjectEditRate;
 class ThreadSafe;
 class Timeline;
+class XMLOptions;
 
 /// What a change of file or rate gives a source: the stats, the rate, and
 /// the states its own clips take (stills keep theirs). Made and taken by the
@@ -121,6 +122,11 @@ public:
     SourceMediaIterator<Kind> mediaEnd() const {
         return SourceMediaIterator<Kind>(streamMedia(), streamMedia_.size());
     }
+
+    /// The source's entry, closed at indent: "id", "src" (the path as the
+    /// options' path modifier makes it), "rect", "lastMod", "sourceTracks",
+    /// "loudnessNormalization", "metadata" (SourceDocument.cpp).
+    void toJSON(XMLOptions& options, int indent) const;
 
     /// Marks the source offline or online (the project does, see
     /// Project::dropSourceOffline and bringSourceOnline).

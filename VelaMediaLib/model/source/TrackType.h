@@ -1,5 +1,7 @@
 #pragma once
 
+#include <string>
+
 namespace VelaMediaLib {
 
 /// The kind of one stream of a media file. A screen recording's picture
@@ -14,5 +16,35 @@ inline bool isVisualTrackType(TrackType type) {
 }
 
 inline bool isAudioTrackType(TrackType type) { return type == TrackType::Audio; }
+
+/// The type's name in the project document: "unknown", "video", "audio",
+/// "image", "screenVideo", "screenImage".
+inline const char* trackTypeName(TrackType type) {
+    switch (type) {
+    case TrackType::Video:
+        return "video";
+    case TrackType::Audio:
+        return "audio";
+    case TrackType::Image:
+        return "image";
+    case TrackType::ScreenVideo:
+        return "screenVideo";
+    case TrackType::ScreenImage:
+        return "screenImage";
+    default:
+        return "unknown";
+    }
+}
+
+/// The type of a document name; false for a name no type has.
+inline bool trackTypeFromName(const std::string& name, TrackType& type) {
+    for (const TrackType candidate : {TrackType::Unknown, TrackType::Video, TrackType::Audio,
+                                      TrackType::Image, TrackType::ScreenVideo, TrackType::ScreenImage})
+        if (name == trackTypeName(candidate)) {
+            type = candidate;
+            return true;
+        }
+    return false;
+}
 
 } // namespace VelaMediaLib

@@ -143,6 +143,14 @@ public:
     /// World to canvas pixels (origin top left): viewport * projection * camera.
     TransformMatrix calcScreenTransformAtTime(const RationalTime& time) const;
 
+    // Document (TimelineDocument.cpp)
+    /// The timeline's object, closed at indent: "id", "sceneTrack" (one scene
+    /// per mixer in name order, each {"velaml": {"tracks": [...]}, "ident":
+    /// the mixer's name}), "trackAttributes" (the first mixer's tracks),
+    /// "captionAttributes", "backgroundColor", "gain",
+    /// "legacyAttenuateAudioMix", "parameters", "metadata".
+    void toJSON(XMLOptions& options, int indent) const;
+
     // Observers
     void attachAddObserver(TimelineAddObserver* observer);
     void detachAddObserver(TimelineAddObserver* observer);

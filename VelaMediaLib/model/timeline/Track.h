@@ -191,6 +191,17 @@ public:
     /// The mixer, or the stitched clip holding the track, if any.
     TimeConverterPtr parentTimeConverter() const override;
 
+    // Document (TrackDocument.cpp)
+    /// The track's object, closed at indent: "trackIndex", "medias" (in time
+    /// order), "transitions" (each once, after every clip has its id),
+    /// "effects" and "metadata" (when not empty). With withFlags, the name
+    /// and flags too ("ident", "audioMuted", ...) before "metadata": for tracks
+    /// that no "trackAttributes" entry describes (groups' tracks, later scenes).
+    void toJSON(XMLOptions& options, int indent, int trackIndex, bool withFlags = false) const;
+    /// The track's "trackAttributes" entry, closed at indent: "ident",
+    /// "audioMuted", "videoHidden", "magnetic", "matte", "solo", "metadata".
+    void toJSONTrackAttributes(XMLOptions& options, int indent) const;
+
     /// An empty track of the same kind with the same flags, name and parameters.
     virtual boost::shared_ptr<Track> cloneEmpty() const = 0;
 

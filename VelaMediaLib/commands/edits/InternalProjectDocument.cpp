@@ -1,0 +1,80 @@
+// The project document's root object. The writer reads the model only, each
+// value under the project's read lock on its own, so other threads may read
+// while a document is written.
+#include <VelaMediaLib/commands/edits/InternalProject.h>
+
+#include <VelaMediaLib/document/format/JSONValues.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
+
+namespace VelaMediaLib {
+namespace {
+
+template <typename T>
+void writeAttribute(XMLOptions& options, int indent, const char* key,
+                    const boost::shared_ptr<Attribute<T>>& attribute) {
+    if (!attribute) return;
+    options.key(key);
+    attribute->writeValue(options, indent);
+}
+
+void writeClient(XMLOptions& options, int indent, const VersionInfo& info) {
+    options.key("authoringClientName");
+    JSONWriter object(options, indent);
+    options.key("name");
+    writeJSONValue(options, object.memberLevel(), info.clientName);
+    options.key("platform");
+    writeJSONValue(options, object.memberLevel(), info.platform);
+    options.key("version");
+    writeJSONValue(options, object.memberLevel(), info.clientVersion);
+}
+
+bool isClientKey(const std::string& key) { return key.rfind("authoringClientName:", 0) == 0; }
+
+// The project's metadata without the client keys, which "authoringClientName"
+// carries: a read project holds them whether or not the writer had any.
+void writeMetaData(XMLOptions& options, int indent, const std::map<std::string, std::string>& entries) {
+    bool any = false;
+    for (const auto& entry : entries) any = any || !isClientKey(entry.first);
+    if (!any) return;
+    options.key("metadata");
+    JSONWriter object(options, indent);
+    for (const auto& entry : entries) {
+        if (isClientKey(entry.first)) continue;
+        options.key(entry.first);
+        writeJSONValue(options, object.memberLevel(), entry.second);
+    }
+}
+
+} // namespace
+
+void InternalProject::toJSON(XMLOptions& options) const {
+    JSONWriter root(options, 0);
+    const int members = root.memberLevel();
+    writeAttribute(options, members, "title", titleAttribute());
+    writeAttribute(options, members, "description", descriptionAttribute());
+    writeAttribute(options, members, "author", authorAttribute());
+    writeAttribute(options, members, "targetLoudness", targetLoudnessAttribute());
+    writeAttribute(options, members, "shouldApplyLoudnessNormalization",
+                   shouldApplyLoudnessNormalizationAttribute());
+    writeAttribute(options, members, "videoFormatFrameRate", videoFormatFrameRateAttribute());
+    writeAttribute(options, members, "audioFormatSampleRate", audioFormatSampleRateAttribute());
+    writeAttribute(options, members, "allowSubFrameEditing", allowSubFrameEditingAttribute());
+    writeAttribute(options, members, "width", timeline_->attributeWidth());
+    writeAttribute(options, members, "height", timeline_->attributeHeight());
+    options.key("version");
+    writeJSONValue(options, members, std::string(documentVersion()));
+    const boost::rational<unsigned long> rate = editRate();
+    options.key("editRate");
+    writeJSONValue(options, members,
+                   SafeRational((long long)rate.numerator(), (long long)rate.denominator()));
+    writeClient(options, members, authorVersionInfo());
+    options.key("sourceBin");
+    sourceBin_->toJSON(options, members);
+    options.key("timeline");
+    timeline_->toJSON(options, members);
+    writeMetaData(options, members, metaDataCopy());
+    root.close();
+    if (!options.compact()) options.stream() << "\n";
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,46 @@
+#include <VelaMediaLib/effects/StoredEffect.h>
+
+#include <VelaMediaLib/document/format/JSONValues.h>
+#include <VelaMediaLib/document/format/JSONWriter.h>
+
+namespace VelaMediaLib {
+
+boost::shared_ptr<StoredEffect> StoredEffect::create(const Fields& fields) {
+    return boost::shared_ptr<StoredEffect>(new StoredEffect(fields));
+}
+
+boost::shared_ptr<Effect> StoredEffect::cloneEffect() const { return create(fields_); }
+
+namespace {
+
+void writeTree(XMLOptions& options, int indent, const char* key, const JSONTree& tree) {
+    if (tree.isNull()) return;
+    options.key(key);
+    tree.write(options, indent);
+}
+
+} // namespace
+
+void StoredEffect::toJSON(XMLOptions& options, int indent) const {
+    JSONWriter object(options, indent);
+    const int members = object.memberLevel();
+    options.key("_type");
+    writeJSONValue(options, members, fields_.type);
+    options.key("effectName");
+    writeJSONValue(options, members, fields_.effectName);
+    options.key("category");
+    writeJSONValue(options, members, fields_.category);
+    options.key("bypassed");
+    writeJSONValue(options, members, fields_.bypassed);
+    options.key("start");
+    writeJSONValue(options, members, (long long)fields_.start);
+    options.key("duration");
+    writeJSONValue(options, members, (long long)fields_.duration);
+    writeTree(options, members, "in", fields_.in);
+    writeTree(options, members, "center", fields_.center);
+    writeTree(options, members, "out", fields_.out);
+    writeTree(options, members, "parameters", fields_.parameters);
+    writeTree(options, members, "metadata", fields_.metadata);
+}
+
+} // namespace VelaMediaLib
