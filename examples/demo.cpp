@@ -206,8 +206,8 @@ ProjectPtr project() {
 void writeDocument(const Project& project, const std::string& path) {
     const std::string text = projectToJSONString(project);
     std::ofstream file(path, std::ios::binary);
-    file << text << "\n";
-    std::cout << "\nThe project written to " << path << " (" << text.size() + 1 << " bytes)"
+    file << text;
+    std::cout << "\nThe project written to " << path << " (" << text.size() << " bytes)"
               << (file ? "" : ": FAILED") << "\n";
 }
 

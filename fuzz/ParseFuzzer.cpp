@@ -5,6 +5,7 @@
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/document/ProjectDocument.h>
 #include <VelaMediaLib/document/RemixParser.h>
+#include <VelaMediaLib/model/project/Project.h>
 
 #include <cstdint>
 #include <cstdio>

@@ -12,17 +12,17 @@
 
 namespace VelaToolTesting {
 
-struct Run {
+struct ToolRun {
     int status;
     std::string out, err;
 };
 
-inline Run runVela(const std::vector<std::string>& words, const std::string& input = "") {
+inline ToolRun runVela(const std::vector<std::string>& words, const std::string& input = "") {
     std::istringstream in(input);
     std::ostringstream out, err;
     VelaTool::Console console{in, out, err};
     const int status = VelaTool::Tool().run(words, console);
-    return Run{status, out.str(), err.str()};
+    return ToolRun{status, out.str(), err.str()};
 }
 
 inline std::string samplePath(const std::string& name) { return std::string(VELA_SAMPLES_DIR) + "/" + name; }

@@ -23,18 +23,19 @@ std::string scratchPath(const std::string& name) { return ::testing::TempDir() +
 /// A sample made large by a long description, still a valid document.
 std::string largeDocument() {
     std::string text = readText(samplePath("every-kind.json"));
-    const size_t brace = text.find('{');
-    return text.insert(brace + 1, "\"description\": \"" + std::string(11 * 1024 * 1024, 'x') + "\",");
+    const std::string empty = "\"description\" : \"\"";
+    return text.replace(text.find(empty), empty.size(),
+                        "\"description\" : \"" + std::string(11 * 1024 * 1024, 'x') + "\"");
 }
 
 } // namespace
 
 TEST(VelaToolCommandLine, HelpOnTheToolAndEverySubcommand) {
-    const Run help = runVela({"--help"});
+    const ToolRun help = runVela({"--help"});
     EXPECT_EQ(0, help.status);
     for (const char* name : kSubcommands) {
         EXPECT_TRUE(contains(help.out, std::string("  ") + name + " ")) << name;
-        const Run own = runVela({name, "--help"});
+        const ToolRun own = runVela({name, "--help"});
         EXPECT_EQ(0, own.status) << name;
         EXPECT_TRUE(contains(own.out, std::string("usage: vela ") + name)) << own.out;
         EXPECT_EQ("", own.err);
@@ -43,24 +44,24 @@ TEST(VelaToolCommandLine, HelpOnTheToolAndEverySubcommand) {
 
 TEST(VelaToolCommandLine, WrongCommandLinesExitTwoWithTheUsage) {
     EXPECT_EQ(2, runVela({}).status);
-    const Run unknown = runVela({"frobnicate"});
+    const ToolRun unknown = runVela({"frobnicate"});
     EXPECT_EQ(2, unknown.status);
     EXPECT_TRUE(contains(unknown.err, "unknown command \"frobnicate\""));
-    const Run missing = runVela({"info"});
+    const ToolRun missing = runVela({"info"});
     EXPECT_EQ(2, missing.status);
     EXPECT_TRUE(contains(missing.err, "vela info: expected 1 operand, got 0"));
     EXPECT_TRUE(contains(missing.err, "usage: vela info"));
     EXPECT_EQ(2, runVela({"info", samplePath("every-kind.json"), "--yaml"}).status);
     EXPECT_EQ(2, runVela({"fmt", samplePath("every-kind.json"), "-o"}).status);
-    const Run tick = runVela({"at", samplePath("every-kind.json"), "12x"});
+    const ToolRun tick = runVela({"at", samplePath("every-kind.json"), "12x"});
     EXPECT_EQ(2, tick.status);
     EXPECT_TRUE(contains(tick.err, "TICK must be an integer, not \"12x\""));
     EXPECT_EQ("", tick.out);
 }
 
 TEST(VelaToolInfo, JSONHoldsTheSameAsTheText) {
-    const Run text = runVela({"info", samplePath("every-kind.json")});
-    const Run json = runVela({"info", samplePath("every-kind.json"), "--json"});
+    const ToolRun text = runVela({"info", samplePath("every-kind.json")});
+    const ToolRun json = runVela({"info", samplePath("every-kind.json"), "--json"});
     ASSERT_EQ(0, json.status) << json.err;
     ASSERT_EQ(0, text.status) << text.err;
     const Json::Value info = parseJson(json.out);
@@ -78,7 +79,7 @@ TEST(VelaToolInfo, JSONHoldsTheSameAsTheText) {
 }
 
 TEST(VelaToolInfo, CountsEveryKindAndTellsSourcesOffline) {
-    const Run json = runVela({"info", samplePath("every-kind.json"), "--json"});
+    const ToolRun json = runVela({"info", samplePath("every-kind.json"), "--json"});
     ASSERT_EQ(0, json.status) << json.err;
     const Json::Value info = parseJson(json.out);
     for (const char* kind : {"AMFile", "Callout", "Caption", "Group", "IMFile", "ScreenIMFile",
@@ -94,15 +95,15 @@ TEST(VelaToolInfo, CountsEveryKindAndTellsSourcesOffline) {
 
 TEST(VelaToolInfo, ReadsStandardInputForDash) {
     const std::string path = samplePath("nested.json");
-    const Run fromFile = runVela({"info", path, "--json"});
-    const Run fromInput = runVela({"info", "-", "--json"}, readText(path));
+    const ToolRun fromFile = runVela({"info", path, "--json"});
+    const ToolRun fromInput = runVela({"info", "-", "--json"}, readText(path));
     ASSERT_EQ(0, fromInput.status) << fromInput.err;
     EXPECT_EQ(fromFile.out, fromInput.out);
     EXPECT_EQ("30000/1001", parseJson(fromInput.out)["editRate"].asString());
 }
 
 TEST(VelaToolValidate, ValidDocumentExitsZero) {
-    const Run run = runVela({"validate", samplePath("animated.json")});
+    const ToolRun run = runVela({"validate", samplePath("animated.json")});
     EXPECT_EQ(0, run.status);
     EXPECT_EQ(samplePath("animated.json") + ": valid\n", run.out);
     EXPECT_EQ("", run.err);
@@ -114,48 +115,48 @@ TEST(VelaToolValidate, RefusedDocumentsGiveTheReadersMessageAndExitOne) {
         {"{\"version\": \"0.4\"}", "-: Unsupported project version : 0.4"},
     };
     for (const auto& refused : cases) {
-        const Run run = runVela({"validate", "-"}, refused.first);
+        const ToolRun run = runVela({"validate", "-"}, refused.first);
         EXPECT_EQ(1, run.status) << refused.first;
         EXPECT_EQ("", run.out);
         EXPECT_TRUE(contains(run.err, refused.second)) << run.err;
     }
-    const Run missing = runVela({"validate", "/nonexistent/project.json"});
+    const ToolRun missing = runVela({"validate", "/nonexistent/project.json"});
     EXPECT_EQ(1, missing.status);
     EXPECT_TRUE(contains(missing.err, "cannot open /nonexistent/project.json")) << missing.err;
 }
 
 TEST(VelaToolErrors, EverySubcommandReportsARefusedDocumentOnStandardError) {
     for (const char* name : {"info", "roundtrip", "fmt"}) {
-        const Run run = runVela({name, "-"}, "[1, 2");
+        const ToolRun run = runVela({name, "-"}, "[1, 2");
         EXPECT_EQ(1, run.status) << name;
         EXPECT_EQ("", run.out) << name;
         EXPECT_TRUE(contains(run.err, std::string("vela ") + name + ": Invalid project json")) << run.err;
     }
-    const Run at = runVela({"at", "-", "0"}, "[1, 2");
+    const ToolRun at = runVela({"at", "-", "0"}, "[1, 2");
     EXPECT_EQ(1, at.status);
     EXPECT_TRUE(contains(at.err, "vela at: Invalid project json"));
 }
 
 TEST(VelaToolRoundtrip, SampleIsEqualAndAChangedOneShowsTheFirstDifference) {
     const std::string text = readText(samplePath("animated.json"));
-    const Run equal = runVela({"roundtrip", "-"}, text);
+    const ToolRun equal = runVela({"roundtrip", "-"}, text);
     EXPECT_EQ(0, equal.status) << equal.out << equal.err;
     EXPECT_EQ("equal: " + std::to_string(text.size()) + " bytes read and written\n", equal.out);
 
     std::string spaced = text;
-    spaced.insert(spaced.find('\n') + 1, " "); // the second line indented one blank more
-    const Run differs = runVela({"roundtrip", "-"}, spaced);
+    spaced.insert(spaced.find('\n') + 1, " "); // the second line indented one blank more: at its third column
+    const ToolRun differs = runVela({"roundtrip", "-"}, spaced);
     EXPECT_EQ(1, differs.status);
-    EXPECT_TRUE(contains(differs.out, "first difference at line 2, column 1:")) << differs.out;
+    EXPECT_TRUE(contains(differs.out, "first difference at line 2, column 3:")) << differs.out;
 }
 
 TEST(VelaToolFmt, RewritesInTheLibrarysFormToOutputOrFile) {
     const std::string text = readText(samplePath("every-kind.json"));
-    const Run indented = runVela({"fmt", "-"}, text);
+    const ToolRun indented = runVela({"fmt", "-"}, text);
     EXPECT_EQ(0, indented.status) << indented.err;
     EXPECT_EQ(text, indented.out);
 
-    const Run compact = runVela({"fmt", "-", "--compact"}, text);
+    const ToolRun compact = runVela({"fmt", "-", "--compact"}, text);
     EXPECT_EQ(0, compact.status);
     EXPECT_EQ(1u, std::count(compact.out.begin(), compact.out.end(), '\n')) << "one line";
     EXPECT_LT(compact.out.size(), text.size());
@@ -164,7 +165,7 @@ TEST(VelaToolFmt, RewritesInTheLibrarysFormToOutputOrFile) {
 
     const std::string out = scratchPath("fmt.json");
     std::remove(out.c_str());
-    const Run toFile = runVela({"fmt", samplePath("every-kind.json"), "-o", out, "--compact"});
+    const ToolRun toFile = runVela({"fmt", samplePath("every-kind.json"), "-o", out, "--compact"});
     EXPECT_EQ(0, toFile.status);
     EXPECT_EQ("", toFile.out);
     EXPECT_EQ(compact.out, readText(out));
@@ -175,17 +176,18 @@ TEST(VelaToolFmt, ARefusedDocumentWritesNoFile) {
     std::remove(out.c_str());
     EXPECT_EQ(1, runVela({"fmt", "-", "-o", out}, "{\"version\": \"0.1\"}").status);
     EXPECT_FALSE(std::ifstream(out).good());
-    const Run unwritable = runVela({"fmt", samplePath("every-kind.json"), "-o", "/nonexistent/dir/out.json"});
+    const ToolRun unwritable =
+        runVela({"fmt", samplePath("every-kind.json"), "-o", "/nonexistent/dir/out.json"});
     EXPECT_EQ(1, unwritable.status);
     EXPECT_TRUE(contains(unwritable.err, "cannot write /nonexistent/dir/out.json"));
 }
 
 TEST(VelaToolProgress, OnlyADocumentOverTenMegabytesGetsAProgressLine) {
-    const Run small = runVela({"validate", samplePath("every-kind.json")});
+    const ToolRun small = runVela({"validate", samplePath("every-kind.json")});
     EXPECT_EQ("", small.err);
     const std::string path = scratchPath("large.json");
     writeText(path, largeDocument());
-    for (const Run& large : {runVela({"validate", path}), runVela({"validate", "-"}, readText(path))}) {
+    for (const ToolRun& large : {runVela({"validate", path}), runVela({"validate", "-"}, readText(path))}) {
         EXPECT_EQ(0, large.status) << large.err.substr(0, 300);
         EXPECT_TRUE(contains(large.err, "vela: loading ")) << large.err;
         EXPECT_TRUE(contains(large.err, "parsing done in ")) << large.err;

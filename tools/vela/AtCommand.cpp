@@ -7,6 +7,7 @@
 #include <VelaMediaLib/model/timeline/Track.h>
 
 #include <ostream>
+#include <sstream>
 
 using namespace VelaMediaLib;
 
@@ -26,6 +27,15 @@ VelaTime tickOf(const std::string& text) {
     return tick;
 }
 
+std::string timeText(const SafeRational& time) {
+    std::ostringstream out;
+    if (time.denominator() == 1)
+        out << time.numerator();
+    else
+        out << time;
+    return out.str();
+}
+
 /// How many clips hold the clip: its indentation under the track's own clip.
 int depthOf(const Media& media) {
     int depth = 0;
@@ -41,13 +51,13 @@ void printClip(std::ostream& out, const Track::MediaAtTime& found, int baseDepth
         media.rationalMediaRange().start() + found.parametricTime / media.rationalScalar();
     out << std::string(size_t(2 * (depthOf(media) - baseDepth + 1)), ' ')
         << MediaTypeFromMediaDispatcher::typeOf(media) << " \"" << media.identifier() << "\" ["
-        << range.start() << ", " << range.end() << ") media time " << mediaTime << "\n";
+        << range.start() << ", " << range.end() << ") media time " << timeText(mediaTime) << "\n";
 }
 
 void printTrack(std::ostream& out, const std::string& label, const Track& track, VelaTime tick) {
     std::vector<Track::MediaAtTime> found;
     track.recursivelyCollectMediasAtTime(SafeRational(tick), found);
-    out << label << ":" << (found.empty() ? " nothing" : "") << "\n";
+    out << label << " \"" << track.identifier() << "\":" << (found.empty() ? " nothing" : "") << "\n";
     if (found.empty()) return;
     const int baseDepth = depthOf(*found.front().media);
     for (const Track::MediaAtTime& clip : found) printClip(out, clip, baseDepth);
