@@ -74,9 +74,9 @@ const char* AtCommand::summary() const {
 std::string AtCommand::usage() const {
     return "usage: vela at DOC TICK\n"
            "  Prints, track by track, the clips active at TICK (ticks of the project's\n"
-           "  edit rate): kind, name, track range [start, end) and the clip's media time\n"
-           "  there; clips inside groups, stitched and unified clips are indented under\n"
-           "  their container. At a cut both touching clips are listed.\n"
+           "  edit rate): kind, name, range [start, end) on its track (a clip inside a\n"
+           "  group, stitched or unified clip: in its container's time, indented under\n"
+           "  it) and the clip's media time there. At a cut both touching clips are listed.\n"
            "  DOC is a project document, or - for standard input.\n";
 }
 
