@@ -195,3 +195,33 @@ TEST(VelaToolProgress, OnlyADocumentOverTenMegabytesGetsAProgressLine) {
     }
     std::remove(path.c_str());
 }
+
+TEST(VelaToolAt, ClipsAtATickWithTheirMediaTimeInsideEveryContainer) {
+    const ToolRun run = runVela({"at", samplePath("nested.json"), "50"});
+    EXPECT_EQ(0, run.status) << run.err;
+    EXPECT_EQ("track 0 \"composites\":\n"
+              "  Group \"outer\" [0, 120) media time 50\n"
+              "    Group \"middle\" [0, 120) media time 50\n"
+              "      Group \"inner\" [10, 110) media time 40\n"
+              "        VMFile \"speaker\" [0, 100) media time 960\n" // 900 + 40 / (2/3)
+              "        IMFile \"slide\" [20, 100) media time 20\n"
+              "    PlaceholderMedia \"lower third\" [30, 90) media time 20\n"
+              "track 1 \"lecture\":\n"
+              "  UnifiedMedia \"lecture\" [0, 240) media time 6050\n"
+              "    VMFile \"lecture picture\" [0, 240) media time 6050\n"
+              "    AMFile \"lecture sound\" [0, 240) media time 6050\n",
+              run.out);
+}
+
+TEST(VelaToolAt, BothClipsAtACutAndNothingPastTheEnd) {
+    const ToolRun cut = runVela({"at", samplePath("animated.json"), "100"});
+    EXPECT_TRUE(contains(cut.out, "  VMFile \"opening\" [0, 100) media time 100\n"
+                                  "  VMFile \"main part\" [100, 250) media time 500\n"))
+        << cut.out;
+    const ToolRun slow = runVela({"at", samplePath("animated.json"), "200"});
+    EXPECT_TRUE(
+        contains(slow.out, "  VMFile \"main part\" [100, 250) media time 1700/3\n")) // 500 + 100 / (3/2)
+        << slow.out;
+    const ToolRun past = runVela({"at", samplePath("animated.json"), "1000"});
+    EXPECT_EQ("track 0 \"\": nothing\ntrack 1 \"\": nothing\ntrack 2 \"\": nothing\n", past.out);
+}
