@@ -14,26 +14,31 @@ std::string readInterp(const Json::Value& animation) {
     const Json::Value* interp = optionalMember(animation, "interp");
     if (!interp) return std::string();
     const std::string code = jsonValueAsString(*interp);
+    if (code.empty()) return code;
     InterpolaterFactory<double>::byName(code); // refuses a code no interpolater has
     return code;
 }
 
-Animation readAnimation(const Json::Value& value) {
+AnimationTrack::Animation readAnimation(const Json::Value& value) {
     documentObject(value, "an animation object");
-    Animation animation;
-    if (const Json::Value* range = optionalMember(value, "range")) animation.range = jsonValueAsTickRange(*range);
-    if (const Json::Value* end = optionalMember(value, "endTime")) animation.endTime = jsonValueAsVelaTime(*end);
+    AnimationTrack::Animation animation;
+    if (const Json::Value* range = optionalMember(value, "range"))
+        animation.range = jsonValueAsTickRange(*range);
+    if (const Json::Value* end = optionalMember(value, "endTime"))
+        animation.endTime = jsonValueAsVelaTime(*end);
     if (const Json::Value* duration = optionalMember(value, "duration"))
         animation.duration = jsonValueAsVelaTime(*duration);
-    if (animation.range.second() < 0 || animation.duration < 0) refuseDocument("animation of negative duration");
+    if (animation.range.second() < 0 || animation.duration < 0)
+        refuseDocument("animation of negative duration");
     animation.interp = readInterp(value);
     if (const Json::Value* keyframes = optionalMember(value, "keyframes"))
         for (const Json::Value& entry : documentArray(*keyframes, "an array of animation keyframes")) {
             documentObject(entry, "an animation keyframe");
-            AnimationKeyFrame keyframe;
+            AnimationTrack::KeyFrame keyframe;
             if (const Json::Value* name = optionalMember(entry, "parameterName"))
                 keyframe.parameterName = jsonValueAsString(*name);
-            if (const Json::Value* keyValue = optionalMember(entry, "value")) keyframe.value = jsonTreeFromValue(*keyValue);
+            if (const Json::Value* keyValue = optionalMember(entry, "value"))
+                keyframe.value = jsonTreeFromValue(*keyValue);
             keyframe.interp = readInterp(entry);
             animation.keyframes.push_back(keyframe);
         }
@@ -46,7 +51,7 @@ AnimationTrackReader::AnimationTrackReader(const boost::shared_ptr<ReadContext>&
     : JSONReader(context), media_(media) {}
 
 AnimationTrack AnimationTrackReader::readTrack(const std::string& name, const Json::Value& animations) {
-    std::vector<Animation> read;
+    std::vector<AnimationTrack::Animation> read;
     for (const Json::Value& entry : documentArray(animations, "an array of animations"))
         read.push_back(readAnimation(entry));
     return AnimationTrack(name, read);
@@ -57,7 +62,8 @@ bool AnimationTrackReader::read(const Json::Value& tracks) {
     documentObject(tracks, "an animationTracks object");
     auto* media = dynamic_cast<MediaImpl*>(&media_);
     if (!media) return false;
-    for (auto it = tracks.begin(); it != tracks.end(); ++it) media->setAnimationTrack(readTrack(it.name(), *it));
+    for (auto it = tracks.begin(); it != tracks.end(); ++it)
+        media->setAnimationTrack(readTrack(it.name(), *it));
     return true;
 }
 

@@ -26,7 +26,8 @@ struct ClippingRead {
 
 ClippingRead readClippings(const Json::Value& root, const boost::shared_ptr<ReadContext>& context) {
     Project& project = *context->project;
-    if (ProjectReader::readEditRate(root) != project.editRate()) refuseDocument("clipping of another edit rate");
+    if (ProjectReader::readEditRate(root) != project.editRate())
+        refuseDocument("clipping of another edit rate");
     ClippingRead read;
     if (const Json::Value* sources = optionalMember(root, "sourceBin"))
         for (const Json::Value& entry : documentArray(*sources, "an array of source entries")) {
@@ -45,7 +46,8 @@ ClippingRead readClippings(const Json::Value& root, const boost::shared_ptr<Read
     if (const Json::Value* tracks = optionalMember(root, "tracks")) clippings.push_back(tracks);
     if (const Json::Value* many = optionalMember(root, "clippings"))
         for (const Json::Value& clipping : documentArray(*many, "an array of clippings"))
-            clippings.push_back(&requiredMember(documentObject(clipping, "a clipping"), "tracks", "a clipping"));
+            clippings.push_back(
+                &requiredMember(documentObject(clipping, "a clipping"), "tracks", "a clipping"));
     for (const Json::Value* tracks : clippings) {
         const auto mixer = GenericMixer::create(project.token());
         MixerReader(context, mixer).read(*tracks);

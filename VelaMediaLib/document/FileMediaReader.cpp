@@ -13,7 +13,8 @@ SourceLink FileMediaReader::readLink(const Json::Value& value) const {
     return SourceLink::holding(found->second, stream);
 }
 
-MediaState FileMediaReader::streamState(const SourceLink& link, StreamFilter plays, const MediaState& timing) {
+MediaState FileMediaReader::streamState(const SourceLink& link, StreamFilter plays,
+                                        const MediaState& timing) {
     FileMedia::checkStream(link, plays);
     return FileMedia::withStreamLimits(timing, *link.source(), link.stream);
 }

@@ -11,7 +11,8 @@ namespace VelaMediaLib {
 boost::shared_ptr<Media> GroupReader::createMedia(const Json::Value& value, const MediaState& timing) {
     Project& project = *context().project;
     const auto mixer = GenericMixer::create(project.token());
-    if (const Json::Value* tracks = optionalMember(value, "tracks")) MixerReader(readContext(), mixer).read(*tracks);
+    if (const Json::Value* tracks = optionalMember(value, "tracks"))
+        MixerReader(readContext(), mixer).read(*tracks);
     return Group::createFromMediaRange(project.token(), project.editRateToken(), mixer, timing.start,
                                        timing.mediaStart, timing.mediaDuration, timing.scalar);
 }

@@ -13,9 +13,11 @@ HotspotInfo HotspotReader::readHotspot(const Json::Value& value) {
     documentObject(value, "a hotspot object");
     HotspotInfo info;
     if (const Json::Value* action = optionalMember(value, "action")) info.action = jsonValueAsString(*action);
-    if (const Json::Value* pause = optionalMember(value, "pauseAtEnd")) info.pauseAtEnd = jsonValueAsBool(*pause);
+    if (const Json::Value* pause = optionalMember(value, "pauseAtEnd"))
+        info.pauseAtEnd = jsonValueAsBool(*pause);
     if (const Json::Value* url = optionalMember(value, "url")) info.url = jsonValueAsString(*url);
-    if (const Json::Value* gotoTime = optionalMember(value, "gotoTime")) info.gotoTime = jsonValueAsVelaTime(*gotoTime);
+    if (const Json::Value* gotoTime = optionalMember(value, "gotoTime"))
+        info.gotoTime = jsonValueAsVelaTime(*gotoTime);
     if (const Json::Value* window = optionalMember(value, "openURLInNewWindow"))
         info.openURLInNewWindow = jsonValueAsBool(*window);
     if (const Json::Value* marker = optionalMember(value, "markerParametricId")) {
@@ -23,7 +25,8 @@ HotspotInfo HotspotReader::readHotspot(const Json::Value& value) {
         if (id < 0 || id > 0xFFFFFFFFLL) refuseJSONValue("a marker id", *marker);
         info.readMarkerId = static_cast<unsigned>(id);
     }
-    if (const Json::Value* time = optionalMember(value, "markerTime")) info.markerTime = jsonValueAsVelaTime(*time);
+    if (const Json::Value* time = optionalMember(value, "markerTime"))
+        info.markerTime = jsonValueAsVelaTime(*time);
     if (const Json::Value* last = optionalMember(value, "lastMarkerGlobalTime"))
         info.lastMarkerGlobalTime = jsonValueAsVelaTime(*last);
     return info;

@@ -69,8 +69,8 @@ const struct {
 
 } // namespace
 
-std::unique_ptr<MediaReader> JSONReader::mediaReaderForJsonValue(const Json::Value& value,
-                                                                 const boost::shared_ptr<ReadContext>& context) {
+std::unique_ptr<MediaReader>
+JSONReader::mediaReaderForJsonValue(const Json::Value& value, const boost::shared_ptr<ReadContext>& context) {
     const Json::Value* type = optionalMember(documentObject(value, "a media object"), "_type");
     if (!type || !type->isString()) return nullptr;
     const std::string name = type->asString();

@@ -89,8 +89,8 @@ public:
     static void readSourceEffect(const Json::Value& value, Media& media);
     /// The reader of the media object's "_type" (exact, case-sensitive), or
     /// null for an unknown or missing kind: no media is built for it.
-    static std::unique_ptr<MediaReader> mediaReaderForJsonValue(const Json::Value& value,
-                                                                const boost::shared_ptr<ReadContext>& context);
+    static std::unique_ptr<MediaReader>
+    mediaReaderForJsonValue(const Json::Value& value, const boost::shared_ptr<ReadContext>& context);
 
     const boost::shared_ptr<ReadContext>& readContext() const { return context_; }
 

@@ -59,7 +59,8 @@ MediaState MediaReader::readTiming(const Json::Value& value) const {
     const Json::Value* mediaDuration = optionalMember(value, "mediaDuration");
     const Json::Value* scalar = optionalMember(value, "scalar");
     timing.mediaStart = mediaStart ? jsonValueAsVelaRational(*mediaStart) : SafeRational(0);
-    timing.mediaDuration = mediaDuration ? jsonValueAsVelaRational(*mediaDuration) : SafeRational(timing.duration);
+    timing.mediaDuration =
+        mediaDuration ? jsonValueAsVelaRational(*mediaDuration) : SafeRational(timing.duration);
     timing.scalar = scalar ? jsonValueAsVelaRational(*scalar) : SafeRational(1);
     checkTime(timing.mediaStart.asVelaTime(), "mediaStart");
     checkTime(timing.mediaDuration.asVelaTime(), "mediaDuration");

@@ -23,7 +23,8 @@ bool ProjectAssetParser::parse(std::istream& in) {
     parsingDocument([&] {
         if (const Json::Value* name = optionalMember(root, "ident")) ident = jsonValueAsString(*name);
         if (const Json::Value* name = optionalMember(root, "clientName")) client = jsonValueAsString(*name);
-        if (const Json::Value* length = optionalMember(root, "duration")) duration = jsonValueAsVelaTime(*length);
+        if (const Json::Value* length = optionalMember(root, "duration"))
+            duration = jsonValueAsVelaTime(*length);
         if (duration < 0) refuseDocument("negative duration: " + std::to_string(duration));
         root.removeMember("authoringClientName"); // an asset names its client by "clientName"
         return reader.read(root);

@@ -19,7 +19,8 @@ boost::shared_ptr<Project> InternalProject::clone() const {
     parser.parse(in);
     const boost::shared_ptr<Project> copy = parser.project();
     const SourceBin::Sources copied = copy->sourceBin()->sources();
-    for (size_t i = 0; i < copied.size() && i < sources.size(); ++i) copied[i]->setOnline(sources[i]->isOnline());
+    for (size_t i = 0; i < copied.size() && i < sources.size(); ++i)
+        copied[i]->setOnline(sources[i]->isOnline());
     return copy;
 }
 

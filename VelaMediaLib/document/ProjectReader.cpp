@@ -54,7 +54,8 @@ void ProjectReader::readProjectAttributes(const Json::Value& root, Project& proj
     if (const Json::Value* client = optionalMember(root, "authoringClientName")) {
         documentObject(*client, "an authoringClientName object");
         VersionInfo info;
-        if (const Json::Value* name = optionalMember(*client, "name")) info.clientName = jsonValueAsString(*name);
+        if (const Json::Value* name = optionalMember(*client, "name"))
+            info.clientName = jsonValueAsString(*name);
         if (const Json::Value* platform = optionalMember(*client, "platform"))
             info.platform = jsonValueAsString(*platform);
         if (const Json::Value* version = optionalMember(*client, "version"))
@@ -73,7 +74,8 @@ bool ProjectReader::read(const Json::Value& root) {
         readingWhere("project", [&] { readProjectAttributes(root, *project); });
         if (const Json::Value* sources = optionalMember(root, "sourceBin"))
             SourceBinReader(readContext(), fileSystem_).read(*sources);
-        if (const Json::Value* timeline = optionalMember(root, "timeline")) TimelineReader(readContext()).read(*timeline);
+        if (const Json::Value* timeline = optionalMember(root, "timeline"))
+            TimelineReader(readContext()).read(*timeline);
         readMetaData(root, *project);
         HotspotReader::postProcessHotspots(context());
     }

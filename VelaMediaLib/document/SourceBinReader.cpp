@@ -86,7 +86,8 @@ void SourceBinReader::readSource(const Json::Value& entry) {
     Project& project = *context().project;
     const boost::shared_ptr<MediaFileStats> recorded = readStats(entry);
     const SourcePtr source = readingWhere("source " + std::to_string(id), [&] {
-        const SourcePtr made = Source::create(project.editRateToken(), project.token(), recorded, fileSystem_);
+        const SourcePtr made =
+            Source::create(project.editRateToken(), project.token(), recorded, fileSystem_);
         if (const Json::Value* loudness = optionalMember(entry, "loudnessNormalization"))
             made->addAttribute<bool>("shouldApplyLoudnessNormalization", jsonValueAsBool(*loudness));
         if (const Json::Value* lastMod = optionalMember(entry, "lastMod")) jsonValueAsInt64(*lastMod);
@@ -103,7 +104,8 @@ void SourceBinReader::checkFile(Source& source, const MediaFileStats& recorded) 
     const std::string path = recorded.filename();
     if (!fileSystem_->isReadable(path)) {
         const auto& handler = context().missingFileHandler;
-        if (handler && !handler->handleInaccessibleFile(path)) throw ParserException("Load cancelled: " + path);
+        if (handler && !handler->handleInaccessibleFile(path))
+            throw ParserException("Load cancelled: " + path);
         source.setOnline(false);
         return;
     }

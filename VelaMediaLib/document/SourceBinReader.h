@@ -18,7 +18,8 @@ class MediaFileStats;
 /// the load: ParserException "Load cancelled: " and the path.
 class VELAMEDIALIB_API SourceBinReader : public JSONReader {
 public:
-    SourceBinReader(const boost::shared_ptr<ReadContext>& context, const boost::shared_ptr<FileSystem>& fileSystem);
+    SourceBinReader(const boost::shared_ptr<ReadContext>& context,
+                    const boost::shared_ptr<FileSystem>& fileSystem);
     bool read(const Json::Value& sources) override;
 
     /// The stats an entry records.

@@ -20,7 +20,8 @@ MediaPtr readPart(const Json::Value& value, const boost::shared_ptr<ReadContext>
 
 } // namespace
 
-boost::shared_ptr<Media> StitchedMediaReader::createMedia(const Json::Value& value, const MediaState& timing) {
+boost::shared_ptr<Media> StitchedMediaReader::createMedia(const Json::Value& value,
+                                                          const MediaState& timing) {
     Project& project = *context().project;
     const auto stitched = StitchedMedia::create(project.token(), project.editRateToken(), timing);
     if (const Json::Value* parts = optionalMember(value, "medias"))
@@ -30,10 +31,10 @@ boost::shared_ptr<Media> StitchedMediaReader::createMedia(const Json::Value& val
 }
 
 boost::shared_ptr<Media> UnifiedMediaReader::createMedia(const Json::Value& value, const MediaState&) {
-    const MediaPtr video =
-        readPart(requiredMember(value, "video", where().c_str()), readContext(), "a media kind of a video part");
-    const MediaPtr audio =
-        readPart(requiredMember(value, "audio", where().c_str()), readContext(), "a media kind of an audio part");
+    const MediaPtr video = readPart(requiredMember(value, "video", where().c_str()), readContext(),
+                                    "a media kind of a video part");
+    const MediaPtr audio = readPart(requiredMember(value, "audio", where().c_str()), readContext(),
+                                    "a media kind of an audio part");
     const auto visual = boost::dynamic_pointer_cast<VisualMedia>(video);
     const auto sound = boost::dynamic_pointer_cast<AudioMedia>(audio);
     if (!visual) refuseDocument(where() + ": \"video\" is not a visual media");

@@ -64,7 +64,8 @@ bool TimelineReader::read(const Json::Value& value) {
             const Json::Value& scene = documentObject((*scenes)[i], "a scene object");
             const auto mixer = GenericMixer::create(project.token());
             if (const Json::Value* velaml = optionalMember(scene, "velaml"))
-                if (const Json::Value* tracks = optionalMember(documentObject(*velaml, "a velaml object"), "tracks"))
+                if (const Json::Value* tracks =
+                        optionalMember(documentObject(*velaml, "a velaml object"), "tracks"))
                     MixerReader(readContext(), mixer).read(*tracks);
             mixers.push_back(mixer);
             names.push_back(sceneMixerName(scene, i));
@@ -83,7 +84,8 @@ bool TimelineReader::read(const Json::Value& value) {
         timeline->setCaptionAttributes(readCaptionAttributes(*captions, timeline->captionAttributes()));
     if (const Json::Value* colour = optionalMember(value, "backgroundColor"))
         timeline->addAttribute("backgroundColor", ValueTraits<TemplatedColor<int>>::read(*colour));
-    if (const Json::Value* gain = optionalMember(value, "gain")) timeline->addAttribute("gain", jsonValueAsDouble(*gain));
+    if (const Json::Value* gain = optionalMember(value, "gain"))
+        timeline->addAttribute("gain", jsonValueAsDouble(*gain));
     if (const Json::Value* legacy = optionalMember(value, "legacyAttenuateAudioMix"))
         timeline->addAttribute("legacyAttenuateAudioMix", jsonValueAsBool(*legacy));
     if (const Json::Value* parameters = optionalMember(value, parametersTagName()))

@@ -37,9 +37,11 @@ bool TrackReader::read(const Json::Value& value) {
 
 void TrackReader::readTrackAttributes(const Json::Value& value, Track& track) {
     documentObject(value, "a track attributes object");
-    if (const Json::Value* ident = optionalMember(value, "ident")) track.setIdentifier(jsonValueAsString(*ident));
+    if (const Json::Value* ident = optionalMember(value, "ident"))
+        track.setIdentifier(jsonValueAsString(*ident));
     for (const char* flag : kFlags)
-        if (const Json::Value* set = optionalMember(value, flag)) track.addAttribute<bool>(flag, jsonValueAsBool(*set));
+        if (const Json::Value* set = optionalMember(value, flag))
+            track.addAttribute<bool>(flag, jsonValueAsBool(*set));
     readMetaData(value, track);
 }
 

@@ -20,7 +20,8 @@ bool TransitionReader::read(const Json::Value& value) {
     documentObject(value, "a transition object");
     const std::string name = jsonValueAsString(requiredMember(value, "name", "a transition"));
     const long long duration = jsonValueAsVelaTime(requiredMember(value, "duration", "a transition"));
-    if (duration < 0) refuseDocument("transition " + name + ": negative duration " + std::to_string(duration));
+    if (duration < 0)
+        refuseDocument("transition " + name + ": negative duration " + std::to_string(duration));
     const MediaPtr left = mediaOf(value, "leftMedia");
     const MediaPtr right = mediaOf(value, "rightMedia");
     transition_ = boost::shared_ptr<Transition>(new Transition(name, duration));

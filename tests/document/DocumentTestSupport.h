@@ -36,8 +36,10 @@ namespace testing {
 /// A document of one video source and one track, with the pieces a test swaps in.
 inline std::string smallDocument(const std::string& medias, const std::string& extraRoot = "",
                                  const std::string& transitions = "[]") {
-    return "{" + extraRoot + "\"version\": \"1.0\", \"editRate\": 30, \"sourceBin\": [{\"id\": 1, \"src\": "
-           "\"/media/a.mp4\", \"rect\": [0, 0, 640, 480], \"sourceTracks\": [{\"type\": \"video\", \"range\": "
+    return "{" + extraRoot +
+           "\"version\": \"1.0\", \"editRate\": 30, \"sourceBin\": [{\"id\": 1, \"src\": "
+           "\"/media/a.mp4\", \"rect\": [0, 0, 640, 480], \"sourceTracks\": [{\"type\": \"video\", "
+           "\"range\": "
            "[0, 300], \"editRate\": 30, \"sampleRate\": 30}]}], \"timeline\": {\"id\": 2, \"sceneTrack\": "
            "{\"scenes\": [{\"velaml\": {\"tracks\": [{\"trackIndex\": 0, \"medias\": " +
            medias + ", \"transitions\": " + transitions + "}]}}]}}}";
@@ -75,7 +77,8 @@ inline std::string parseFailure(const std::string& text) {
 class DocumentFixture : public ::testing::Test {
 protected:
     void SetUp() override {
-        table->set("/m/video.mp4", {stream(TrackType::Video, 0, 3000, 30), stream(TrackType::Audio, 0, 3000, 30, 2)});
+        table->set("/m/video.mp4",
+                   {stream(TrackType::Video, 0, 3000, 30), stream(TrackType::Audio, 0, 3000, 30, 2)});
         table->set("/m/still.png", {stream(TrackType::Image, 0, 1, 30)});
         table->set("/m/screen.trec", {stream(TrackType::ScreenVideo, 0, 3000, 30)});
         table->set("/m/frame.trec", {stream(TrackType::ScreenImage, 0, 1, 30)});
@@ -157,7 +160,7 @@ inline boost::shared_ptr<Project> richProject(const boost::shared_ptr<FileSystem
     hotspot.markerTime = 7;
     callout->setHotspot(hotspot);
     callout->addMetaData("color", "red");
-    AnimationTrack bounce("opacity", {Animation()});
+    AnimationTrack bounce("opacity", {AnimationTrack::Animation()});
     callout->setAnimationTrack(bounce);
     second->addMedia(callout, 3100);
     const auto caption = Caption::create(token, rate, 3200, 40);
@@ -184,8 +187,9 @@ inline boost::shared_ptr<Project> richProject(const boost::shared_ptr<FileSystem
                                VMFile::create(video, 0, 0, SafeRational(100), SafeRational(30))},
                               100);
     third->addMedia(stitched, 100);
-    const auto unified = UnifiedMedia::create(VMFile::create(video, 0, 300, SafeRational(500), SafeRational(40)),
-                                              AMFile::create(video, 1, 300, SafeRational(500), SafeRational(40)));
+    const auto unified =
+        UnifiedMedia::create(VMFile::create(video, 0, 300, SafeRational(500), SafeRational(40)),
+                             AMFile::create(video, 1, 300, SafeRational(500), SafeRational(40)));
     third->addMedia(unified, 300);
     return project;
 }

@@ -14,17 +14,19 @@ namespace {
 std::string deepGroups(int levels) {
     std::string clip = "{\"_type\": \"PlaceholderMedia\", \"start\": 0, \"duration\": 10}";
     for (int i = 0; i < levels; ++i)
-        clip = "{\"_type\": \"Group\", \"start\": 0, \"duration\": 10, \"mediaStart\": 0, \"mediaDuration\": 10, "
+        clip = "{\"_type\": \"Group\", \"start\": 0, \"duration\": 10, \"mediaStart\": 0, \"mediaDuration\": "
+               "10, "
                "\"tracks\": [{\"medias\": [" +
                clip + "]}]}";
-    return "[" + clip + "]";
+    return "[{\"medias\": [" + clip + "]}]";
 }
 
 } // namespace
 
 TEST(ProjectReaderEdgeCases, EditRateDefaultsAndBothRationalForms) {
     EXPECT_EQ(parseText("{\"version\": \"1.0\"}")->editRate(), boost::rational<unsigned long>(30, 1));
-    EXPECT_EQ(parseText("{\"editRate\": \"60000/1001\"}")->editRate(), boost::rational<unsigned long>(60000, 1001));
+    EXPECT_EQ(parseText("{\"editRate\": \"60000/1001\"}")->editRate(),
+              boost::rational<unsigned long>(60000, 1001));
     EXPECT_EQ(parseText("{\"editRate\": 30}")->editRate(), boost::rational<unsigned long>(30, 1));
 }
 
@@ -52,8 +54,8 @@ TEST(ProjectReaderEdgeCases, VersionsAreComparedPartByPart) {
 TEST(ProjectReaderEdgeCases, VersionInfoComesFromTheRootOrDefaults) {
     std::istringstream none("{}");
     EXPECT_EQ(RemixParser::parseVersionInfo(none).version, "6.0");
-    std::istringstream client(
-        "{\"version\": \"1.0\", \"authoringClientName\": {\"name\": \"P\", \"version\": \"2\", \"platform\": \"x\"}}");
+    std::istringstream client("{\"version\": \"1.0\", \"authoringClientName\": {\"name\": \"P\", "
+                              "\"version\": \"2\", \"platform\": \"x\"}}");
     const VersionInfo info = RemixParser::parseVersionInfo(client);
     EXPECT_EQ(info.version, "1.0");
     EXPECT_EQ(info.clientName, "P");
@@ -73,7 +75,8 @@ TEST(ProjectReaderEdgeCases, ReferencesResolveToTheRightObjects) {
     ASSERT_TRUE(clips[0]->rightTransition());
     EXPECT_EQ(clips[0]->rightTransition(), clips[1]->leftTransition());
     EXPECT_EQ(clips[0]->rightTransition()->rightMedia(), clips[1]);
-    EXPECT_EQ(boost::dynamic_pointer_cast<FileMedia>(clips[0])->source(), project->sourceBin()->sources().front());
+    EXPECT_EQ(boost::dynamic_pointer_cast<FileMedia>(clips[0])->source(),
+              project->sourceBin()->sources().front());
     EXPECT_FALSE(project->parsingProject());
 }
 
@@ -87,21 +90,24 @@ TEST(ProjectReaderFailures, TheFailureTable) {
         "\"animationTracks\": {\"opacity\": [{\"range\": [0, 5], \"interp\": \"nope\"}]}, ";
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30, badInterp) + "]")),
               "trying to read an unknown interpolater");
-    const std::string badFunc =
-        "\"leftEdgeMods\": [{\"duration\": 5, \"group\": \"g\", \"func\": {\"name\": \"Warp\", \"value\": 1}}], ";
-    EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30, badFunc) + "]")), "Unknown edge mod func Warp");
+    const std::string badFunc = "\"leftEdgeMods\": [{\"duration\": 5, \"group\": \"g\", \"func\": {\"name\": "
+                                "\"Warp\", \"value\": 1}}], ";
+    EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30, badFunc) + "]")),
+              "Unknown edge mod func Warp");
     RemixParser parser;
     EXPECT_FALSE(parser.parse(std::string("/no/such/dir/project.json")));
 }
 
 TEST(ProjectReaderFailures, MalformedDocumentsNameWhatWasWrong) {
-    EXPECT_EQ(parseFailure(smallDocument("[{\"id\": 3, \"_type\": \"VMFile\", \"src\": 1, \"trackNumber\": 0}]")),
-              "Invalid project json - missing member \"start\" in media 3");
+    EXPECT_EQ(
+        parseFailure(smallDocument("[{\"id\": 3, \"_type\": \"VMFile\", \"src\": 1, \"trackNumber\": 0}]")),
+        "Invalid project json - missing member \"start\" in media 3");
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30) + ", " + videoClip(3, 40, 30) + "]")),
               "Invalid project json - duplicate id: 3");
-    EXPECT_EQ(parseFailure(smallDocument("[{\"id\": 3, \"_type\": \"VMFile\", \"src\": 7, \"trackNumber\": 0, "
-                                         "\"start\": 0, \"duration\": 5, \"mediaDuration\": 5}]")),
-              "Invalid project json - unknown source id: 7");
+    EXPECT_EQ(
+        parseFailure(smallDocument("[{\"id\": 3, \"_type\": \"VMFile\", \"src\": 7, \"trackNumber\": 0, "
+                                   "\"start\": 0, \"duration\": 5, \"mediaDuration\": 5}]")),
+        "Invalid project json - unknown source id: 7");
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30) + "]", "",
                                          "[{\"name\": \"Fade\", \"duration\": 4, \"leftMedia\": 99}]")),
               "Invalid project json - unknown media id: 99");
@@ -122,9 +128,10 @@ TEST(ProjectReaderFailures, MalformedDocumentsNameWhatWasWrong) {
 }
 
 TEST(ProjectReaderFailures, AbsurdNumbersAreRefusedNotOverflowed) {
-    const std::string clip = "{\"id\": 3, \"_type\": \"VMFile\", \"src\": 1, \"trackNumber\": 0, \"start\": 0, "
-                             "\"duration\": 30, \"mediaDuration\": \"9223372036854775807/2\", \"scalar\": "
-                             "\"9223372036854775807/3\"}";
+    const std::string clip =
+        "{\"id\": 3, \"_type\": \"VMFile\", \"src\": 1, \"trackNumber\": 0, \"start\": 0, "
+        "\"duration\": 30, \"mediaDuration\": \"9223372036854775807/2\", \"scalar\": "
+        "\"9223372036854775807/3\"}";
     const std::string failure = parseFailure(smallDocument("[" + clip + "]"));
     EXPECT_EQ(failure.rfind("Invalid project json - media 3: ", 0), 0u) << failure;
     EXPECT_EQ(parseFailure("{\"editRate\": \"1/0\"}").rfind("Invalid project json - ", 0), 0u);
@@ -135,8 +142,9 @@ TEST(ProjectReaderFailures, AFailedParseKeepsNothing) {
     RemixParser parser;
     const auto first = parseText(smallDocument("[" + videoClip(3, 0, 30) + "]"), parser);
     ASSERT_TRUE(first);
-    EXPECT_THROW(parseText(smallDocument("[" + videoClip(3, 0, 30) + ", " + videoClip(4, 10, 30) + "]"), parser),
-                 ParserException);
+    EXPECT_THROW(
+        parseText(smallDocument("[" + videoClip(3, 0, 30) + ", " + videoClip(4, 10, 30) + "]"), parser),
+        ParserException);
     EXPECT_EQ(parser.project(), first);
     EXPECT_EQ(first->timeline()->allMedias().size(), 1u);
     EXPECT_EQ(parser.versionInfo().version, "1.0");

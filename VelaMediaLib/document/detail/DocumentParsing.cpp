@@ -54,7 +54,8 @@ VersionInfo documentVersionInfo(const Json::Value& root) {
     info.version = version ? versionText(*version) : "6.0";
     if (const Json::Value* client = optionalMember(root, "authoringClientName")) {
         documentObject(*client, "an authoringClientName object");
-        if (const Json::Value* name = optionalMember(*client, "name")) info.clientName = jsonValueAsString(*name);
+        if (const Json::Value* name = optionalMember(*client, "name"))
+            info.clientName = jsonValueAsString(*name);
         if (const Json::Value* clientVersion = optionalMember(*client, "version"))
             info.clientVersion = jsonValueAsString(*clientVersion);
         if (const Json::Value* platform = optionalMember(*client, "platform"))

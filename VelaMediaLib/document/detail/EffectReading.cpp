@@ -19,10 +19,12 @@ boost::shared_ptr<Effect> readEffect(const Json::Value& value) {
     documentObject(value, "an effect object");
     StoredEffect::Fields fields;
     if (const Json::Value* type = optionalMember(value, "_type")) fields.type = jsonValueAsString(*type);
-    if (const Json::Value* name = optionalMember(value, "effectName")) fields.effectName = jsonValueAsString(*name);
+    if (const Json::Value* name = optionalMember(value, "effectName"))
+        fields.effectName = jsonValueAsString(*name);
     if (const Json::Value* category = optionalMember(value, "category"))
         fields.category = jsonValueAsString(*category);
-    if (const Json::Value* bypassed = optionalMember(value, "bypassed")) fields.bypassed = jsonValueAsBool(*bypassed);
+    if (const Json::Value* bypassed = optionalMember(value, "bypassed"))
+        fields.bypassed = jsonValueAsBool(*bypassed);
     if (const Json::Value* start = optionalMember(value, "start")) fields.start = jsonValueAsVelaTime(*start);
     if (const Json::Value* duration = optionalMember(value, "duration"))
         fields.duration = jsonValueAsVelaTime(*duration);

@@ -23,9 +23,8 @@ void readScreenData(const Json::Value& media, ScreenDataHolder& holder) {
     const auto data = boost::make_shared<ScreenRecordingData>();
     if (const Json::Value* rect = optionalMember(*screen, "rect")) {
         jsonArrayOf(*rect, 4, "a rectangle [x, y, width, height]");
-        data->setRecordingRect(
-            Rect<int>(jsonValueAsInt((*rect)[0]), jsonValueAsInt((*rect)[1]), jsonValueAsInt((*rect)[2]),
-                      jsonValueAsInt((*rect)[3])));
+        data->setRecordingRect(Rect<int>(jsonValueAsInt((*rect)[0]), jsonValueAsInt((*rect)[1]),
+                                         jsonValueAsInt((*rect)[2]), jsonValueAsInt((*rect)[3])));
     }
     if (const Json::Value* cursor = optionalMember(*screen, "cursor"))
         for (const Json::Value& entry : documentArray(*cursor, "an array of cursor samples")) {

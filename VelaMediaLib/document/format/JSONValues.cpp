@@ -101,7 +101,7 @@ void writeJSONValue(XMLOptions& options, int indent, const RationalTime& value) 
 }
 
 void writeJSONValue(XMLOptions& options, int, const Range<long long>& value) {
-    options.stream() << "[" << value.first() << ", " << value.second() << "]";
+    options.stream() << "[" << value.first() << options.inlineSeparator() << value.second() << "]";
 }
 
 bool jsonValueAsBool(const Json::Value& json) {

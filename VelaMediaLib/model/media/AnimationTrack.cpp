@@ -6,7 +6,7 @@
 namespace VelaMediaLib {
 namespace {
 
-void writeKeyFrame(XMLOptions& options, int indent, const AnimationKeyFrame& keyframe) {
+void writeKeyFrame(XMLOptions& options, int indent, const AnimationTrack::KeyFrame& keyframe) {
     JSONWriter object(options, indent);
     options.key("parameterName");
     writeJSONValue(options, object.memberLevel(), keyframe.parameterName);
@@ -16,7 +16,7 @@ void writeKeyFrame(XMLOptions& options, int indent, const AnimationKeyFrame& key
     writeJSONValue(options, object.memberLevel(), keyframe.interp);
 }
 
-void writeAnimation(XMLOptions& options, int indent, const Animation& animation) {
+void writeAnimation(XMLOptions& options, int indent, const AnimationTrack::Animation& animation) {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
     options.key("range");
@@ -29,7 +29,7 @@ void writeAnimation(XMLOptions& options, int indent, const Animation& animation)
     writeJSONValue(options, members, animation.interp);
     options.key("keyframes");
     JSONWriter keyframes(options, members, JSONWriter::Array);
-    for (const AnimationKeyFrame& keyframe : animation.keyframes) {
+    for (const AnimationTrack::KeyFrame& keyframe : animation.keyframes) {
         options.element();
         writeKeyFrame(options, keyframes.memberLevel(), keyframe);
     }
@@ -39,7 +39,7 @@ void writeAnimation(XMLOptions& options, int indent, const Animation& animation)
 
 void AnimationTrack::toJSON(XMLOptions& options, int indent) const {
     JSONWriter array(options, indent, JSONWriter::Array);
-    for (const Animation& animation : animations_) {
+    for (const AnimationTrack::Animation& animation : animations_) {
         options.element();
         writeAnimation(options, array.memberLevel(), animation);
     }

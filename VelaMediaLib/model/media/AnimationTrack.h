@@ -12,38 +12,38 @@ namespace VelaMediaLib {
 
 class XMLOptions;
 
-/// One keyframe of an animation's description: the parameter it sets, the
-/// value (kept whole, in the parameter's document form) and the interpolater
-/// code that leads into it.
-struct VELAMEDIALIB_API AnimationKeyFrame {
-    std::string parameterName;
-    JSONTree value;
-    std::string interp;
-
-    bool operator==(const AnimationKeyFrame& other) const {
-        return parameterName == other.parameterName && value == other.value && interp == other.interp;
-    }
-};
-
-/// One animation of a parameter: the ticks it covers on its clip, its end
-/// and length, its interpolater code and the keyframes it describes.
-struct VELAMEDIALIB_API Animation {
-    Range<long long> range = Range<long long>(0, 0);
-    VelaTime endTime = 0;
-    VelaTime duration = 0;
-    std::string interp;
-    std::vector<AnimationKeyFrame> keyframes;
-
-    bool operator==(const Animation& other) const {
-        return range == other.range && endTime == other.endTime && duration == other.duration &&
-               interp == other.interp && keyframes == other.keyframes;
-    }
-};
-
 /// The animations of one parameter of a clip, by the parameter's name. A
 /// value: the clip keeps a copy under the project lock.
 class VELAMEDIALIB_API AnimationTrack {
 public:
+    /// One keyframe of an animation's description: the parameter it sets, the
+    /// value (kept whole, in the parameter's document form) and the interpolater
+    /// code that leads into it.
+    struct KeyFrame {
+        std::string parameterName;
+        JSONTree value;
+        std::string interp;
+
+        bool operator==(const KeyFrame& other) const {
+            return parameterName == other.parameterName && value == other.value && interp == other.interp;
+        }
+    };
+
+    /// One animation of a parameter: the ticks it covers on its clip, its end
+    /// and length, its interpolater code and the keyframes it describes.
+    struct Animation {
+        Range<long long> range = Range<long long>(0, 0);
+        VelaTime endTime = 0;
+        VelaTime duration = 0;
+        std::string interp;
+        std::vector<KeyFrame> keyframes;
+
+        bool operator==(const Animation& other) const {
+            return range == other.range && endTime == other.endTime && duration == other.duration &&
+                   interp == other.interp && keyframes == other.keyframes;
+        }
+    };
+
     AnimationTrack() = default;
     AnimationTrack(std::string name, std::vector<Animation> animations)
         : name_(std::move(name)), animations_(std::move(animations)) {}

@@ -16,11 +16,12 @@ namespace {
 
 // Arrays of numbers: [a, b, c].
 template <typename Numbers>
-void writeNumbers(std::ostream& out, const Numbers& values) {
+void writeNumbers(XMLOptions& options, const Numbers& values) {
+    std::ostream& out = options.stream();
     const char* separator = "[";
     for (const double value : values) {
         out << separator << formatDouble(value);
-        separator = ", ";
+        separator = options.inlineSeparator();
     }
     out << "]";
 }
@@ -28,8 +29,9 @@ void writeNumbers(std::ostream& out, const Numbers& values) {
 } // namespace
 
 void ValueTraits<Rect<float>>::write(XMLOptions& options, int, const Rect<float>& r) {
-    options.stream() << "[" << formatFloat(r.x) << ", " << formatFloat(r.y) << ", " << formatFloat(r.width)
-                     << ", " << formatFloat(r.height) << "]";
+    options.stream() << "[" << formatFloat(r.x) << options.inlineSeparator() << formatFloat(r.y)
+                     << options.inlineSeparator() << formatFloat(r.width) << options.inlineSeparator()
+                     << formatFloat(r.height) << "]";
 }
 Rect<float> ValueTraits<Rect<float>>::read(const Json::Value& json) {
     jsonArrayOf(json, 4, "a rectangle [x, y, width, height]");
@@ -38,7 +40,8 @@ Rect<float> ValueTraits<Rect<float>>::read(const Json::Value& json) {
 }
 
 void ValueTraits<TemplatedColor<int>>::write(XMLOptions& options, int, const TemplatedColor<int>& c) {
-    options.stream() << "[" << c.red << ", " << c.green << ", " << c.blue << ", " << c.alpha << "]";
+    options.stream() << "[" << c.red << options.inlineSeparator() << c.green << options.inlineSeparator()
+                     << c.blue << options.inlineSeparator() << c.alpha << "]";
 }
 TemplatedColor<int> ValueTraits<TemplatedColor<int>>::read(const Json::Value& json) {
     jsonArrayOf(json, 4, "a colour [red, green, blue, alpha]");
@@ -48,7 +51,7 @@ TemplatedColor<int> ValueTraits<TemplatedColor<int>>::read(const Json::Value& js
 
 void ValueTraits<Point3d>::write(XMLOptions& options, int, const Point3d& p) {
     const double values[] = {p.x, p.y, p.z};
-    writeNumbers(options.stream(), values);
+    writeNumbers(options, values);
 }
 Point3d ValueTraits<Point3d>::read(const Json::Value& json) {
     jsonArrayOf(json, 3, "a point [x, y, z]");
@@ -56,7 +59,7 @@ Point3d ValueTraits<Point3d>::read(const Json::Value& json) {
 }
 
 void ValueTraits<TransformMatrix>::write(XMLOptions& options, int, const TransformMatrix& m) {
-    writeNumbers(options.stream(), m.elements());
+    writeNumbers(options, m.elements());
 }
 TransformMatrix ValueTraits<TransformMatrix>::read(const Json::Value& json) {
     jsonArrayOf(json, 16, "a matrix of 16 numbers");
@@ -67,7 +70,7 @@ TransformMatrix ValueTraits<TransformMatrix>::read(const Json::Value& json) {
 
 void ValueTraits<AudioPosition>::write(XMLOptions& options, int, const AudioPosition& p) {
     const double values[] = {p.pan, p.depth};
-    writeNumbers(options.stream(), values);
+    writeNumbers(options, values);
 }
 AudioPosition ValueTraits<AudioPosition>::read(const Json::Value& json) {
     jsonArrayOf(json, 2, "an audio position [pan, depth]");
@@ -75,8 +78,9 @@ AudioPosition ValueTraits<AudioPosition>::read(const Json::Value& json) {
 }
 
 void ValueTraits<CaptionData>::write(XMLOptions& options, int, const CaptionData& c) {
-    options.stream() << "{" << keyName("text") << quotedJSONString(c.text) << ", " << keyName("lang")
-                     << quotedJSONString(c.language) << "}";
+    options.stream() << "{" << options.inlineKey("text") << quotedJSONString(c.text)
+                     << options.inlineSeparator() << options.inlineKey("lang") << quotedJSONString(c.language)
+                     << "}";
 }
 CaptionData ValueTraits<CaptionData>::read(const Json::Value& json) {
     const char* what = "caption data {\"text\", \"lang\"}";
@@ -85,8 +89,8 @@ CaptionData ValueTraits<CaptionData>::read(const Json::Value& json) {
 }
 
 void ValueTraits<KeystrokeData>::write(XMLOptions& options, int, const KeystrokeData& k) {
-    options.stream() << "{" << keyName("key") << quotedJSONString(k.key) << ", " << keyName("modifiers")
-                     << k.modifiers << "}";
+    options.stream() << "{" << options.inlineKey("key") << quotedJSONString(k.key)
+                     << options.inlineSeparator() << options.inlineKey("modifiers") << k.modifiers << "}";
 }
 KeystrokeData ValueTraits<KeystrokeData>::read(const Json::Value& json) {
     const char* what = "a keystroke {\"key\", \"modifiers\"}";
@@ -97,12 +101,14 @@ KeystrokeData ValueTraits<KeystrokeData>::read(const Json::Value& json) {
 
 void ValueTraits<TextAttributeList>::write(XMLOptions& options, int, const TextAttributeList& list) {
     std::ostream& out = options.stream();
-    out << "{" << keyName("text") << quotedJSONString(list.text()) << ", " << keyName("runs") << "[";
+    out << "{" << options.inlineKey("text") << quotedJSONString(list.text()) << options.inlineSeparator()
+        << options.inlineKey("runs") << "[";
     bool first = true;
     for (const TextAttributeList::Run& run : list.runs()) {
-        out << (first ? "" : ", ") << "{" << keyName("start") << run.start << ", " << keyName("length")
-            << run.length << ", " << keyName("name") << quotedJSONString(run.name) << ", " << keyName("value")
-            << quotedJSONString(run.value) << "}";
+        out << (first ? "" : options.inlineSeparator()) << "{" << options.inlineKey("start") << run.start
+            << options.inlineSeparator() << options.inlineKey("length") << run.length
+            << options.inlineSeparator() << options.inlineKey("name") << quotedJSONString(run.name)
+            << options.inlineSeparator() << options.inlineKey("value") << quotedJSONString(run.value) << "}";
         first = false;
     }
     out << "]}";
@@ -123,7 +129,8 @@ TextAttributeList ValueTraits<TextAttributeList>::read(const Json::Value& json) 
 void ValueTraits<std::vector<double>>::write(XMLOptions& options, int, const std::vector<double>& values) {
     std::ostream& out = options.stream();
     out << "[";
-    for (size_t i = 0; i < values.size(); ++i) out << (i ? ", " : "") << formatDouble(values[i]);
+    for (size_t i = 0; i < values.size(); ++i)
+        out << (i ? options.inlineSeparator() : "") << formatDouble(values[i]);
     out << "]";
 }
 std::vector<double> ValueTraits<std::vector<double>>::read(const Json::Value& json) {
@@ -138,7 +145,7 @@ void ValueTraits<std::list<Rect<float>>>::write(XMLOptions& options, int indent,
     options.stream() << "[";
     bool first = true;
     for (const Rect<float>& rect : rects) {
-        options.stream() << (first ? "" : ", ");
+        options.stream() << (first ? "" : options.inlineSeparator());
         Member::write(options, indent, rect);
         first = false;
     }
