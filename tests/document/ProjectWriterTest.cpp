@@ -7,6 +7,8 @@
 #include <VelaMediaLib/effects/StoredEffect.h>
 #include <VelaMediaLib/model/media/Group.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/media/ScreenRecordingData.h>
+#include <VelaMediaLib/model/media/ScreenVMFile.h>
 #include <VelaMediaLib/model/media/VMFile.h>
 #include <VelaMediaLib/model/source/Source.h>
 
@@ -435,4 +437,19 @@ TEST_F(ProjectWriterConcurrencyTest, WritersAndReadersRunTogether) {
     reader.join();
     EXPECT_EQ(texts[0], expected);
     EXPECT_EQ(texts[1], expected);
+}
+
+// A screen recording's clip carries its cursor, clicks and keys.
+TEST_F(ProjectWriterTest, AScreenRecordingWritesItsScreenData) {
+    loader->set("media/s.trec", {stream(TrackType::ScreenVideo, 0, 3000, 600)});
+    const auto recording = ScreenVMFile::create(project->loadSource("media/s.trec"), 0, 0);
+    EXPECT_FALSE(parseJson(objectText(*recording)).isMember("screenData")) << "nothing to write";
+    const auto data = boost::make_shared<ScreenRecordingData>(Rect<int>(0, 0, 800, 600));
+    data->addCursorSample(RationalTime(SafeRational(1, 2)), Point3d(10, 20, 0));
+    data->addClick(RationalTime(3), ScreenClick::Right);
+    data->addKeystroke(RationalTime(4), KeystrokeData("a", 2));
+    recording->setScreenData(data);
+    EXPECT_EQ(parseJson(objectText(*recording))["screenData"],
+              parseJson(R"({"recordingRect": [0, 0, 800, 600], "cursor": [["1/2", 10.0, 20.0]],
+                            "clicks": [[3, 1]], "keystrokes": [[4, {"key": "a", "modifiers": 2}]]})"));
 }

@@ -23,6 +23,11 @@ public:
 /// (no cursor, the origin, no clicks or keys, an empty rectangle). The data
 /// never changes once held, so a query copies the pointer under the
 /// project's read lock and asks it after letting go.
+class ScreenDataHolder;
+class XMLOptions;
+/// Writes the holder's "screenData" member when it holds any.
+VELAMEDIALIB_API void writeScreenData(XMLOptions& options, int indent, const ScreenDataHolder& holder);
+
 class VELAMEDIALIB_API ScreenDataHolder : public ScreenDataProvider, public virtual ProjectToken {
 public:
     explicit ScreenDataHolder(

@@ -10,6 +10,10 @@ namespace VelaMediaLib {
 /// and keystroke data (given by the host, shared by clones).
 class VELAMEDIALIB_API ScreenIMFile : public AbstractIMFile, public ScreenDataHolder {
 public:
+    /// "screenData" (see ScreenRecordingData::toJSON), when the clip has any.
+    void toJSONSpecificProperties(XMLOptions& options, int indent) const override {
+        writeScreenData(options, indent, *this);
+    }
     /// The still from start for duration ticks; see AbstractIMFile::stillState.
     static boost::shared_ptr<ScreenIMFile> create(const boost::shared_ptr<const Source>& source, int stream,
                                                   VelaTime start, VelaTime duration);

@@ -8,6 +8,8 @@
 
 namespace VelaMediaLib {
 
+class XMLOptions;
+
 /// A cursor position at a time of the recording.
 struct VELAMEDIALIB_API ScreenCursorSample {
     RationalTime time;
@@ -51,6 +53,12 @@ public:
     std::vector<ScreenClick> clicksInRange(const Range<RationalTime>& range) const override;
     std::vector<ScreenKeystroke> keystrokesInRange(const Range<RationalTime>& range) const override;
     Rect<int> recordingRect() const override { return rect_; }
+    bool isEmpty() const { return cursor_.empty() && clicks_.empty() && keys_.empty(); }
+    /// The recording's object, closed at indent: "recordingRect" [x, y, w, h],
+    /// "cursor" [[time, x, y], ...], "clicks" [[time, button], ...] (0 left,
+    /// 1 right, 2 middle), "keystrokes" [[time, {"key", "modifiers"}], ...];
+    /// times are rationals (ScreenRecordingDataDocument.cpp).
+    void toJSON(XMLOptions& options, int indent) const;
 
     bool operator==(const ScreenRecordingData& o) const {
         return rect_ == o.rect_ && cursor_ == o.cursor_ && clicks_ == o.clicks_ && keys_ == o.keys_;

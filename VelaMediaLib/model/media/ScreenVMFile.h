@@ -11,6 +11,10 @@ namespace VelaMediaLib {
 /// the host gives it (setScreenData) and its clones share.
 class VELAMEDIALIB_API ScreenVMFile : public VMFile, public ScreenDataHolder {
 public:
+    /// "screenData" (see ScreenRecordingData::toJSON), when the clip has any.
+    void toJSONSpecificProperties(XMLOptions& options, int indent) const override {
+        writeScreenData(options, indent, *this);
+    }
     static boost::shared_ptr<ScreenVMFile> create(const boost::shared_ptr<const Source>& source, int stream,
                                                   VelaTime start);
     static boost::shared_ptr<ScreenVMFile> create(const boost::shared_ptr<const Source>& source, int stream,
