@@ -1,6 +1,7 @@
 # Thin front door over CMake. Every target installs missing Debian packages first.
 JOBS ?= $(shell nproc)
 BENCH_FILTER ?= .
+FUZZ_SECONDS ?= 600
 CMAKE_FLAGS ?=
 ifneq ($(CI),)
 CMAKE_FLAGS += -DVELA_WERROR=ON
@@ -8,7 +9,7 @@ endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
 SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
-.PHONY: deps demo test bench sanitize tsan clang header-check layer-check format format-check install-check
+.PHONY: deps demo fuzz test bench sanitize tsan clang header-check layer-check format format-check install-check
 
 deps:
 	@scripts/install-deps
@@ -18,8 +19,9 @@ build/build.ninja: | deps
 	$(CONFIGURE)=Debug -B build $(CMAKE_FLAGS)
 
 demo: build/build.ninja
-	cmake --build build --target vela-demo -j $(JOBS)
-	./build/examples/vela-demo
+	cmake --build build --target vela-demo vela -j $(JOBS)
+	./build/examples/vela-demo build/demo-project.json
+	./build/tools/vela/vela info build/demo-project.json
 
 test: build/build.ninja
 	cmake --build build -j $(JOBS)
@@ -48,6 +50,18 @@ clang: deps
 	  -DCMAKE_CXX_FLAGS=-DVELA_PORTABLE_INT128 $(CMAKE_FLAGS)
 	cmake --build build-clang -j $(JOBS)
 	ctest --test-dir build-clang --output-on-failure -j $(JOBS)
+
+# The project parser under libFuzzer (Clang, AddressSanitizer, UBSan) for
+# FUZZ_SECONDS, seeded with the sample documents; new inputs gather in
+# build-fuzz/corpus, findings in build-fuzz/findings (the run fails on one).
+fuzz: deps
+	CXX=clang++ $(CONFIGURE)=RelWithDebInfo -B build-fuzz -DVELA_BUILD_FUZZ=ON -DVELA_SANITIZE=address,undefined \
+	  -DVELA_BUILD_TESTS=OFF -DVELA_BUILD_BENCH=OFF -DVELA_BUILD_EXAMPLES=OFF -DVELA_BUILD_TOOLS=OFF $(CMAKE_FLAGS)
+	cmake --build build-fuzz --target vela_parse_fuzzer -j $(JOBS)
+	mkdir -p build-fuzz/corpus build-fuzz/findings
+	./build-fuzz/fuzz/vela_parse_fuzzer -max_total_time=$(FUZZ_SECONDS) -timeout=10 -rss_limit_mb=2048 \
+	  -max_len=262144 -dict=fuzz/project.dict -artifact_prefix=build-fuzz/findings/ -print_final_stats=1 \
+	  build-fuzz/corpus examples/projects
 
 # No library file includes a header of a layer above its own.
 layer-check:

@@ -2,10 +2,12 @@
 #include "HeaderStatsLoader.h"
 
 #include <VelaMediaLib/VelaMediaLib.h>
+#include <VelaMediaLib/document/ProjectDocument.h>
 
 #include <boost/filesystem.hpp>
 #include <boost/make_shared.hpp>
 
+#include <fstream>
 #include <iomanip>
 #include <iostream>
 #include <sstream>
@@ -165,7 +167,7 @@ void printTracks(const char* step, const Project& project, const std::vector<Tra
     std::cout << "   (undo steps " << project.commandHistory()->undoStack().size() << ")\n";
 }
 
-void project() {
+ProjectPtr project() {
     std::cout << "\nA project: clips on a magnetic and a plain track, edited through the history\n";
     const ProjectPtr project = Project::create(30, 1);
     const auto mixer = project->newMixer("main");
@@ -197,6 +199,16 @@ void project() {
     project->redo();
     project->redo();
     printTracks("redo twice: B gone, gaps closed", *project, tracks);
+    return project;
+}
+
+/// The project as its document, for `vela info` and the other tools.
+void writeDocument(const Project& project, const std::string& path) {
+    const std::string text = projectToJSONString(project);
+    std::ofstream file(path, std::ios::binary);
+    file << text;
+    std::cout << "\nThe project written to " << path << " (" << text.size() << " bytes)"
+              << (file ? "" : ": FAILED") << "\n";
 }
 
 } // namespace
@@ -282,7 +294,8 @@ void sources() {
     fs::remove_all(folder);
 }
 
-int main() {
+/// With a path, the demo's project is also written there as its document.
+int main(int argc, char** argv) {
     std::cout << "VelaMediaLib: exact time at work\n\n";
     frameRates();
     seconds();
@@ -290,7 +303,8 @@ int main() {
     rounding();
     parameters();
     clips();
-    project();
+    const ProjectPtr edited = project();
     sources();
+    if (argc > 1) writeDocument(*edited, argv[1]);
     return 0;
 }

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "Subcommand.h"
+
+namespace VelaTool {
+
+/// `vela fmt DOC [-o OUT] [--compact]`: the document rewritten in the library's form.
+class FmtCommand : public Subcommand {
+public:
+    const char* name() const override;
+    const char* summary() const override;
+    std::string usage() const override;
+    ArgumentSpec spec() const override;
+    int run(const Arguments& arguments, Console& console) const override;
+};
+
+} // namespace VelaTool

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "Subcommand.h"
+
+namespace VelaTool {
+
+/// `vela roundtrip DOC`: reads, writes in the same form, and compares; exit 1 on a difference.
+class RoundtripCommand : public Subcommand {
+public:
+    const char* name() const override;
+    const char* summary() const override;
+    std::string usage() const override;
+    ArgumentSpec spec() const override;
+    int run(const Arguments& arguments, Console& console) const override;
+};
+
+} // namespace VelaTool

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "Subcommand.h"
+
+namespace VelaTool {
+
+/// `vela validate DOC`: exit 0 when the library reads the document, else its message and exit 1.
+class ValidateCommand : public Subcommand {
+public:
+    const char* name() const override;
+    const char* summary() const override;
+    std::string usage() const override;
+    ArgumentSpec spec() const override;
+    int run(const Arguments& arguments, Console& console) const override;
+};
+
+} // namespace VelaTool
