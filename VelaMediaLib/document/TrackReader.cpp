@@ -24,8 +24,10 @@ bool TrackReader::read(const Json::Value& value) {
             if (!reader) continue; // a kind this library does not know
             reader->read(entry);
             const MediaPtr media = reader->media();
-            readingWhere("media " + (entry.isMember(idTagName()) ? compactJSON(entry[idTagName()]) : ""),
-                         [&] { track_->addMedia(media, media->startTime()); });
+            const auto where = [&] {
+                return "media " + (entry.isMember(idTagName()) ? compactJSON(entry[idTagName()]) : "");
+            };
+            readingWhere(where, [&] { track_->addMedia(media, media->startTime()); });
         }
     if (const Json::Value* transitions = optionalMember(value, "transitions"))
         for (const Json::Value& entry : documentArray(*transitions, "an array of transitions"))

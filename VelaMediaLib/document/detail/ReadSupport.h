@@ -37,10 +37,17 @@ void readAttributeMember(const Json::Value& object, const char* key, Attributabl
 /// A "parameters", "effects" and "metadata" member of the value, onto the object.
 void readParametersEffectsAndMetaData(const Json::Value& value, SubTimeline& object);
 
+inline std::string whereText(const std::string& where) { return where; }
+template <typename Describe>
+auto whereText(const Describe& describe) -> decltype(describe()) {
+    return describe();
+}
+
 /// Runs the step, turning whatever but a ParserException it throws into
-/// ParserException "Invalid project json - <where>: <what>".
-template <typename Step>
-auto readingWhere(const std::string& where, const Step& step) -> decltype(step()) {
+/// ParserException "Invalid project json - <where>: <what>". `where` is the
+/// text or a function giving it, called only on failure (loads run this per clip).
+template <typename Where, typename Step>
+auto readingWhere(const Where& where, const Step& step) -> decltype(step()) {
     try {
         return step();
     } catch (const ParserException&) {
@@ -48,7 +55,7 @@ auto readingWhere(const std::string& where, const Step& step) -> decltype(step()
     } catch (const std::bad_alloc&) {
         throw;
     } catch (const std::exception& e) {
-        refuseDocument(where + ": " + e.what());
+        refuseDocument(whereText(where) + ": " + e.what());
     }
 }
 
