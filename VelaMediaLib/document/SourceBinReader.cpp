@@ -91,6 +91,7 @@ void SourceBinReader::readSource(const Json::Value& entry) {
         if (const Json::Value* loudness = optionalMember(entry, "loudnessNormalization"))
             made->addAttribute<bool>("shouldApplyLoudnessNormalization", jsonValueAsBool(*loudness));
         if (const Json::Value* lastMod = optionalMember(entry, "lastMod")) jsonValueAsInt64(*lastMod);
+        made->removeMetaData(Source::timeAddedMetaDataKey()); // a read source was added when the document says
         readMetaData(entry, *made);
         project.sourceBin()->insertSource(made, -1);
         return made;
