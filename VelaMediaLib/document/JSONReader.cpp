@@ -38,7 +38,8 @@ void JSONReader::readSourceEffect(const Json::Value& value, Media& media) {
     if (!effect) return;
     auto* clip = dynamic_cast<MediaImpl*>(&media);
     const auto stored = boost::dynamic_pointer_cast<StoredEffect>(readEffect(*effect));
-    if (clip && stored) clip->setSourceEffect(stored);
+    if (!clip || !stored) refuseDocument("a sourceEffect this clip cannot keep");
+    clip->setSourceEffect(stored);
 }
 
 namespace {

@@ -31,7 +31,7 @@ bool TrackReader::read(const Json::Value& value) {
         }
     if (const Json::Value* transitions = optionalMember(value, "transitions"))
         for (const Json::Value& entry : documentArray(*transitions, "an array of transitions"))
-            TransitionReader(readContext()).read(entry);
+            TransitionReader(readContext(), track_).read(entry);
     readParametersEffectsAndMetaData(value, *track_);
     readTrackAttributes(value, *track_);
     return true;

@@ -3,6 +3,7 @@
 #include <VelaMediaLib/document/format/detail/JSONTreeAccess.h>
 #include <VelaMediaLib/model/media/Media.h>
 #include <VelaMediaLib/model/media/Transition.h>
+#include <VelaMediaLib/model/timeline/Track.h>
 
 namespace VelaMediaLib {
 
@@ -15,6 +16,19 @@ boost::shared_ptr<Media> TransitionReader::mediaOf(const Json::Value& value, con
     return found->second;
 }
 
+void TransitionReader::checkSides(const std::string& name, long long duration, const MediaPtr& left,
+                                  const MediaPtr& right) const {
+    for (const MediaPtr& side : {left, right}) {
+        if (!side) continue;
+        if (!track_ || !track_->hasMedia(side))
+            refuseDocument("transition " + name + " names a clip of another track");
+        if (duration > side->trackRange().duration())
+            refuseDocument("transition " + name + " is longer than its clip");
+    }
+    if (left && right && left->trackRange().end() != right->trackRange().start())
+        refuseDocument("transition " + name + " lies between clips that do not touch");
+}
+
 bool TransitionReader::read(const Json::Value& value) {
     setValue(value);
     documentObject(value, "a transition object");
@@ -24,6 +38,7 @@ bool TransitionReader::read(const Json::Value& value) {
         refuseDocument("transition " + name + ": negative duration " + std::to_string(duration));
     const MediaPtr left = mediaOf(value, "leftMedia");
     const MediaPtr right = mediaOf(value, "rightMedia");
+    checkSides(name, duration, left, right);
     transition_ = boost::shared_ptr<Transition>(new Transition(name, duration));
     if (const Json::Value* attributes = optionalMember(value, "attributes"))
         transition_->setAttributes(jsonTreeFromValue(documentObject(*attributes, "an object of attributes")));

@@ -7,19 +7,28 @@ namespace VelaMediaLib {
 
 class Transition;
 
+class Track;
+
 /// Reads a transition object ("name", "duration", "leftMedia", "rightMedia",
-/// "attributes") and sets it on the clips it names (read before, by "id"):
-/// the right edge of the left clip, the left edge of the right one. An id
-/// naming no clip is refused: "Invalid project json - unknown media id: N".
+/// "attributes") of a track and sets it on the clips it names (read before,
+/// by "id"): the right edge of the left clip, the left edge of the right one.
+/// Refused ("Invalid project json - ..."): an id naming no clip ("unknown
+/// media id: N"), a clip of another track, two sides that do not touch, and
+/// a transition longer than a clip it lies on.
 class VELAMEDIALIB_API TransitionReader : public JSONReader {
 public:
-    using JSONReader::JSONReader;
+    TransitionReader(const boost::shared_ptr<ReadContext>& context, const boost::shared_ptr<Track>& track)
+        : JSONReader(context), track_(track) {}
     bool read(const Json::Value& value) override;
     const boost::shared_ptr<Transition>& transition() const { return transition_; }
 
 private:
     boost::shared_ptr<Media> mediaOf(const Json::Value& value, const char* key) const;
 
+    void checkSides(const std::string& name, long long duration, const boost::shared_ptr<Media>& left,
+                    const boost::shared_ptr<Media>& right) const;
+
+    boost::shared_ptr<Track> track_;
     boost::shared_ptr<Transition> transition_;
 };
 

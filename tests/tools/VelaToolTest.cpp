@@ -224,4 +224,7 @@ TEST(VelaToolAt, BothClipsAtACutAndNothingPastTheEnd) {
         << slow.out;
     const ToolRun past = runVela({"at", samplePath("animated.json"), "1000"});
     EXPECT_EQ("track 0 \"\": nothing\ntrack 1 \"\": nothing\ntrack 2 \"\": nothing\n", past.out);
+    const ToolRun before = runVela({"at", samplePath("animated.json"), "-5"}); // a tick, not an option
+    EXPECT_EQ(0, before.status) << before.err;
+    EXPECT_EQ(past.out, before.out);
 }

@@ -8,7 +8,10 @@ namespace {
 
 bool isHelp(const std::string& word) { return word == "--help" || word == "-h"; }
 
-bool looksLikeOption(const std::string& word) { return word.size() > 1 && word[0] == '-'; }
+// A negative number ("vela at DOC -5") is an operand, not an option.
+bool looksLikeOption(const std::string& word) {
+    return word.size() > 1 && word[0] == '-' && !(word[1] >= '0' && word[1] <= '9');
+}
 
 } // namespace
 

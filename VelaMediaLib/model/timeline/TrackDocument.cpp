@@ -55,6 +55,7 @@ void Track::toJSON(XMLOptions& options, int indent, int trackIndex, bool withFla
             effect->toJSON(options, array.memberLevel());
         }
     }
+    if (hasMadeParameters()) toJSONParameterList(options, members); // a track's volume curve
     if (withFlags) {
         options.key("ident");
         writeJSONValue(options, members, identifier());

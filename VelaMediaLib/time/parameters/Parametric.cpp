@@ -67,6 +67,14 @@ void Parametric::addParameter(const std::string& name,
 
 bool Parametric::hasMadeParameter(const std::string& name) const { return bool(madeParameter(name)); }
 
+bool Parametric::hasMadeParameters() const {
+    ScopedReadLock lock(projectLock());
+    bool any = false;
+    parameters_.forEach(
+        [&](const std::string&, const boost::shared_ptr<ParameterInterface>&) { any = true; });
+    return any;
+}
+
 void Parametric::toJSONParameterList(XMLOptions& options, int indent) const {
     NamedParameters made;
     {

@@ -41,6 +41,8 @@ public:
     /// Adds or replaces a parameter of the name.
     void addParameter(const std::string& name, const boost::shared_ptr<ParameterInterface>& parameter);
     bool hasMadeParameter(const std::string& name) const;
+    /// Whether any parameter has been made (one not made holds its default).
+    bool hasMadeParameters() const;
 
     /// The value at the parametric time without making the parameter.
     template <typename T>
