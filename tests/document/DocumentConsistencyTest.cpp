@@ -1,6 +1,8 @@
 #include "../JsonTestSupport.h"
 #include "DocumentTestSupport.h"
 
+#include <VelaMediaLib/document/ProjectReader.h>
+
 #include <json/writer.h>
 
 #include <gtest/gtest.h>
@@ -19,7 +21,6 @@ std::string twoTrackDocument(const std::string& firstMedias, const std::string& 
            firstMedias + ", \"transitions\": []}, {\"trackIndex\": 1, \"medias\": " + secondMedias +
            ", \"transitions\": " + secondTransitions + "}]}}]}}}";
 }
-
 
 } // namespace
 
@@ -188,4 +189,36 @@ TEST_F(DocumentWrongTypes, EveryValueOfEveryWrongTypeEndsInOneParserException) {
     for (const std::string& line : escaped) report += "escaped " + line + "\n";
     for (const std::string& line : unstable) report += "unstable " + line + "\n";
     EXPECT_TRUE(escaped.empty() && unstable.empty()) << report;
+}
+
+// A reader given the caller's tree reads it as it is: only a parser that owns
+// its tree lets each track's part go once built.
+TEST(DocumentConsistency, AReaderLeavesTheCallersTreeAsItWas) {
+    const Json::Value root = parseJson(smallDocument("[" + videoClip(3, 0, 30) + "]"));
+    const Json::Value before = root;
+    ProjectReader reader;
+    ASSERT_TRUE(reader.read(root));
+    EXPECT_EQ(root, before);
+    EXPECT_EQ(reader.project()->timeline()->allMedias().size(), 1u);
+}
+
+// Every mixer of the timeline is a scene of its own, read back by name with its clips.
+TEST(DocumentConsistency, EveryMixerReadsBackAsItsOwnScene) {
+    const auto project = Project::create(30, 1);
+    for (const char* name : {"main", "second", "third"}) {
+        const auto mixer = project->newMixer(name);
+        const auto track = project->timeline()->newTrack();
+        mixer->addTrack(track);
+        track->addMedia(PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 20), 10);
+    }
+    const std::string written = projectToJSONString(*project);
+    const auto read = parseText(written);
+    ASSERT_EQ(read->timeline()->mixers().size(), 3u);
+    for (const char* name : {"main", "second", "third"}) {
+        const MixerPtr mixer = read->timeline()->mixer(name);
+        ASSERT_TRUE(mixer) << name;
+        ASSERT_EQ(mixer->numTracks(), 1u);
+        EXPECT_EQ(mixer->trackAtIndex(0)->medias().size(), 1u) << name;
+    }
+    EXPECT_EQ(projectToJSONString(*read), written);
 }
