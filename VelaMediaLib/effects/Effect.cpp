@@ -7,10 +7,8 @@ namespace VelaMediaLib {
 
 void Effect::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
-    options.key("_type");
-    writeJSONValue(options, object.memberLevel(), std::string("Effect"));
-    options.key("effectName");
-    writeJSONValue(options, object.memberLevel(), effectName());
+    writeJSONMember(options, object.memberLevel(), "_type", std::string("Effect"));
+    writeJSONMember(options, object.memberLevel(), "effectName", effectName());
 }
 
 } // namespace VelaMediaLib

@@ -24,18 +24,12 @@ void writeTree(XMLOptions& options, int indent, const char* key, const JSONTree&
 void StoredEffect::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("_type");
-    writeJSONValue(options, members, fields_.type);
-    options.key("effectName");
-    writeJSONValue(options, members, fields_.effectName);
-    options.key("category");
-    writeJSONValue(options, members, fields_.category);
-    options.key("bypassed");
-    writeJSONValue(options, members, fields_.bypassed);
-    options.key("start");
-    writeJSONValue(options, members, (long long)fields_.start);
-    options.key("duration");
-    writeJSONValue(options, members, (long long)fields_.duration);
+    writeJSONMember(options, members, "_type", fields_.type);
+    writeJSONMember(options, members, "effectName", fields_.effectName);
+    writeJSONMember(options, members, "category", fields_.category);
+    writeJSONMember(options, members, "bypassed", fields_.bypassed);
+    writeJSONMember(options, members, "start", (long long)fields_.start);
+    writeJSONMember(options, members, "duration", (long long)fields_.duration);
     writeTree(options, members, "in", fields_.in);
     writeTree(options, members, "center", fields_.center);
     writeTree(options, members, "out", fields_.out);

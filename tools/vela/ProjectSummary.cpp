@@ -1,6 +1,6 @@
 #include "ProjectSummary.h"
 
-#include "JSONText.h"
+#include <VelaMediaLib/document/format/JSONWriter.h>
 
 #include <VelaMediaLib/model/media/MediaTypeFromMediaDispatcher.h>
 #include <VelaMediaLib/model/source/Source.h>
@@ -93,15 +93,15 @@ void ProjectSummary::printJSON(std::ostream& out) const {
         << ",\"clips\":{";
     const char* separator = "";
     for (const auto& kind : clipsByKind_) {
-        out << separator << quotedJSON(kind.first) << ":" << kind.second;
+        out << separator << VelaMediaLib::quotedJSONString(kind.first) << ":" << kind.second;
         separator = ",";
     }
     out << "},\"sources\":[";
     separator = "";
     for (const SourceLine& source : sources_) {
-        out << separator << "{\"src\":" << quotedJSON(source.path)
+        out << separator << "{\"src\":" << VelaMediaLib::quotedJSONString(source.path)
             << ",\"online\":" << (source.online ? "true" : "false")
-            << ",\"status\":" << quotedJSON(source.status) << "}";
+            << ",\"status\":" << VelaMediaLib::quotedJSONString(source.status) << "}";
         separator = ",";
     }
     out << "]}\n";

@@ -20,12 +20,9 @@ void writeAttribute(XMLOptions& options, int indent, const char* key,
 void writeClient(XMLOptions& options, int indent, const VersionInfo& info) {
     options.key("authoringClientName");
     JSONWriter object(options, indent);
-    options.key("name");
-    writeJSONValue(options, object.memberLevel(), info.clientName);
-    options.key("platform");
-    writeJSONValue(options, object.memberLevel(), info.platform);
-    options.key("version");
-    writeJSONValue(options, object.memberLevel(), info.clientVersion);
+    writeJSONMember(options, object.memberLevel(), "name", info.clientName);
+    writeJSONMember(options, object.memberLevel(), "platform", info.platform);
+    writeJSONMember(options, object.memberLevel(), "version", info.clientVersion);
 }
 
 bool isClientKey(const std::string& key) { return key.rfind("authoringClientName:", 0) == 0; }
@@ -61,8 +58,7 @@ void InternalProject::toJSON(XMLOptions& options) const {
     writeAttribute(options, members, "allowSubFrameEditing", allowSubFrameEditingAttribute());
     writeAttribute(options, members, "width", timeline_->attributeWidth());
     writeAttribute(options, members, "height", timeline_->attributeHeight());
-    options.key("version");
-    writeJSONValue(options, members, std::string(documentVersion()));
+    writeJSONMember(options, members, "version", std::string(documentVersion()));
     const boost::rational<unsigned long> rate = editRate();
     options.key("editRate");
     writeJSONValue(options, members,

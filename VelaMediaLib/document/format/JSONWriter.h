@@ -14,6 +14,7 @@
 // options.element() put the separator and the indentation in.
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 
 #include <string>
@@ -24,6 +25,13 @@ namespace VelaMediaLib {
 VELAMEDIALIB_API std::string keyName(const std::string& key);
 /// The text as a JSON string literal, quotes included.
 VELAMEDIALIB_API std::string quotedJSONString(const std::string& text);
+
+/// One member of the open object: its key and its value in the value's form.
+template <typename T>
+void writeJSONMember(XMLOptions& options, int indent, const std::string& key, const T& value) {
+    options.key(key);
+    writeJSONValue(options, indent, value);
+}
 
 /// Keeps one JSON object or array open, its members at level + 1: opens it on
 /// construction and closes it by close() or, failing that, the destructor.

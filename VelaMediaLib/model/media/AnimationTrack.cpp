@@ -8,25 +8,19 @@ namespace {
 
 void writeKeyFrame(XMLOptions& options, int indent, const AnimationTrack::KeyFrame& keyframe) {
     JSONWriter object(options, indent);
-    options.key("parameterName");
-    writeJSONValue(options, object.memberLevel(), keyframe.parameterName);
+    writeJSONMember(options, object.memberLevel(), "parameterName", keyframe.parameterName);
     options.key("value");
     keyframe.value.write(options, object.memberLevel());
-    options.key("interp");
-    writeJSONValue(options, object.memberLevel(), keyframe.interp);
+    writeJSONMember(options, object.memberLevel(), "interp", keyframe.interp);
 }
 
 void writeAnimation(XMLOptions& options, int indent, const AnimationTrack::Animation& animation) {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("range");
-    writeJSONValue(options, members, animation.range);
-    options.key("endTime");
-    writeJSONValue(options, members, (long long)animation.endTime);
-    options.key("duration");
-    writeJSONValue(options, members, (long long)animation.duration);
-    options.key("interp");
-    writeJSONValue(options, members, animation.interp);
+    writeJSONMember(options, members, "range", animation.range);
+    writeJSONMember(options, members, "endTime", (long long)animation.endTime);
+    writeJSONMember(options, members, "duration", (long long)animation.duration);
+    writeJSONMember(options, members, "interp", animation.interp);
     options.key("keyframes");
     JSONWriter keyframes(options, members, JSONWriter::Array);
     for (const AnimationTrack::KeyFrame& keyframe : animation.keyframes) {

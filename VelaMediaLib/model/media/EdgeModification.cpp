@@ -8,17 +8,13 @@ namespace VelaMediaLib {
 void EdgeModification::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("duration");
-    writeJSONValue(options, members, (long long)duration_);
-    options.key("group");
-    writeJSONValue(options, members, group_);
+    writeJSONMember(options, members, "duration", (long long)duration_);
+    writeJSONMember(options, members, "group", group_);
     options.key("func");
     {
         JSONWriter func(options, members);
-        options.key("name");
-        writeJSONValue(options, func.memberLevel(), functionName_);
-        options.key("value");
-        writeJSONValue(options, func.memberLevel(), value_);
+        writeJSONMember(options, func.memberLevel(), "name", functionName_);
+        writeJSONMember(options, func.memberLevel(), "value", value_);
     }
     if (parameters_.isEmpty()) return;
     options.key("parameters");

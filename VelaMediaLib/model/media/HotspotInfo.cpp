@@ -12,22 +12,15 @@ void HotspotInfo::toJSON(XMLOptions& options, int indent, bool targetWritten) co
     const boost::shared_ptr<Parametric> target = markerTarget.lock();
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("action");
-    writeJSONValue(options, members, action);
-    options.key("pauseAtEnd");
-    writeJSONValue(options, members, pauseAtEnd);
-    options.key("url");
-    writeJSONValue(options, members, url);
-    options.key("gotoTime");
-    writeJSONValue(options, members, (long long)gotoTime);
-    options.key("openURLInNewWindow");
-    writeJSONValue(options, members, openURLInNewWindow);
+    writeJSONMember(options, members, "action", action);
+    writeJSONMember(options, members, "pauseAtEnd", pauseAtEnd);
+    writeJSONMember(options, members, "url", url);
+    writeJSONMember(options, members, "gotoTime", (long long)gotoTime);
+    writeJSONMember(options, members, "openURLInNewWindow", openURLInNewWindow);
     options.key("markerParametricId")
         << (target && targetWritten ? options.assignNewIdent(target.get()) : 0u);
-    options.key("markerTime");
-    writeJSONValue(options, members, (long long)markerTime);
-    options.key("lastMarkerGlobalTime");
-    writeJSONValue(options, members, (long long)lastMarkerGlobalTime);
+    writeJSONMember(options, members, "markerTime", (long long)markerTime);
+    writeJSONMember(options, members, "lastMarkerGlobalTime", (long long)lastMarkerGlobalTime);
 }
 
 bool HotspotInfo::operator==(const HotspotInfo& other) const {

@@ -373,16 +373,11 @@ void MediaImpl::setupSharedClone(const boost::shared_ptr<Media>& clone) const {
 
 void MediaImpl::toJSONTemporalValues(XMLOptions& options, int indent) const {
     const MediaState s = state();
-    options.key("start");
-    writeJSONValue(options, indent, s.start);
-    options.key("duration");
-    writeJSONValue(options, indent, s.duration);
-    options.key("mediaStart");
-    writeJSONValue(options, indent, s.mediaStart);
-    options.key("mediaDuration");
-    writeJSONValue(options, indent, s.mediaDuration);
-    options.key("scalar");
-    writeJSONValue(options, indent, s.scalar);
+    writeJSONMember(options, indent, "start", s.start);
+    writeJSONMember(options, indent, "duration", s.duration);
+    writeJSONMember(options, indent, "mediaStart", s.mediaStart);
+    writeJSONMember(options, indent, "mediaDuration", s.mediaDuration);
+    writeJSONMember(options, indent, "scalar", s.scalar);
 }
 
 } // namespace VelaMediaLib

@@ -16,8 +16,7 @@ void writeSourceReference(XMLOptions& options, int indent, const MediaImpl& medi
     if (!file) return;
     const boost::shared_ptr<const Source> source = file->source();
     if (source) options.key("src") << options.assignNewIdent(source.get());
-    options.key("trackNumber");
-    writeJSONValue(options, indent, file->streamIndex());
+    writeJSONMember(options, indent, "trackNumber", file->streamIndex());
 }
 
 void writeEdgeModifications(XMLOptions& options, int indent, const char* key,
@@ -47,14 +46,12 @@ void MediaImpl::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
     options.key("id") << options.assignNewIdent(this);
-    options.key("_type");
-    writeJSONValue(options, members, MediaTypeFromMediaDispatcher::typeOf(*this));
+    writeJSONMember(options, members, "_type", MediaTypeFromMediaDispatcher::typeOf(*this));
     writeSourceReference(options, members, *this);
     options.key("attributes");
     {
         JSONWriter attributes(options, members);
-        options.key("ident");
-        writeJSONValue(options, attributes.memberLevel(), identifier());
+        writeJSONMember(options, attributes.memberLevel(), "ident", identifier());
         writeAttributes(options, attributes.memberLevel());
     }
     toJSONSpecificProperties(options, members);

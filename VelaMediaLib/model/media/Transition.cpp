@@ -31,10 +31,8 @@ void writeSide(XMLOptions& options, const char* key, const boost::shared_ptr<Med
 
 void Transition::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
-    options.key("name");
-    writeJSONValue(options, object.memberLevel(), name_);
-    options.key("duration");
-    writeJSONValue(options, object.memberLevel(), (long long)duration_);
+    writeJSONMember(options, object.memberLevel(), "name", name_);
+    writeJSONMember(options, object.memberLevel(), "duration", (long long)duration_);
     writeSide(options, "leftMedia", leftMedia());
     writeSide(options, "rightMedia", rightMedia());
     if (attributes_.isEmpty()) return;

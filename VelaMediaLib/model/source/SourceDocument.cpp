@@ -22,24 +22,16 @@ SafeRational rationalOf(const boost::rational<unsigned long>& rate) {
 void writeStream(XMLOptions& options, int indent, const TrackStats& stream) {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("type");
-    writeJSONValue(options, members, std::string(trackTypeName(stream.type)));
-    options.key("range");
-    writeJSONValue(options, members, stream.range);
-    options.key("editRate");
-    writeJSONValue(options, members, rationalOf(stream.rangeEditRate));
+    writeJSONMember(options, members, "type", std::string(trackTypeName(stream.type)));
+    writeJSONMember(options, members, "range", stream.range);
+    writeJSONMember(options, members, "editRate", rationalOf(stream.rangeEditRate));
     options.key("trackRect");
     writeRect(options, stream.rect);
-    options.key("sampleRate");
-    writeJSONValue(options, members, stream.sampleRate);
-    options.key("bitDepth");
-    writeJSONValue(options, members, stream.bitDepth);
-    options.key("numChannels");
-    writeJSONValue(options, members, stream.numChannels);
-    options.key("integratedLUFS");
-    writeJSONValue(options, members, stream.integratedLUFS);
-    options.key("peakLevel");
-    writeJSONValue(options, members, stream.peakLevel);
+    writeJSONMember(options, members, "sampleRate", stream.sampleRate);
+    writeJSONMember(options, members, "bitDepth", stream.bitDepth);
+    writeJSONMember(options, members, "numChannels", stream.numChannels);
+    writeJSONMember(options, members, "integratedLUFS", stream.integratedLUFS);
+    writeJSONMember(options, members, "peakLevel", stream.peakLevel);
     options.key("metaData");
     {
         JSONWriter array(options, members, JSONWriter::Array);
@@ -48,14 +40,11 @@ void writeStream(XMLOptions& options, int indent, const TrackStats& stream) {
             writeJSONValue(options, array.memberLevel(), entry);
         }
     }
-    options.key("orientation");
-    writeJSONValue(options, members, int(stream.orientation));
+    writeJSONMember(options, members, "orientation", int(stream.orientation));
     if (!stream.filename.empty()) {
-        options.key("filename");
-        writeJSONValue(options, members, options.modifyPath(stream.filename));
+        writeJSONMember(options, members, "filename", options.modifyPath(stream.filename));
     }
-    options.key("fileTrackNumber");
-    writeJSONValue(options, members, stream.fileTrackNumber);
+    writeJSONMember(options, members, "fileTrackNumber", stream.fileTrackNumber);
 }
 
 } // namespace
@@ -65,8 +54,7 @@ void Source::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
     options.key("id") << options.assignNewIdent(this);
-    options.key("src");
-    writeJSONValue(options, members, options.modifyPath(contents.filename));
+    writeJSONMember(options, members, "src", options.modifyPath(contents.filename));
     options.key("rect");
     writeRect(options, contents.rect);
     options.key("lastMod");
@@ -80,8 +68,7 @@ void Source::toJSON(XMLOptions& options, int indent) const {
         }
     }
     if (const auto loudness = shouldApplyLoudnessNormalizationAttribute()) {
-        options.key("loudnessNormalization");
-        writeJSONValue(options, members, loudness->value());
+        writeJSONMember(options, members, "loudnessNormalization", loudness->value());
     }
     MetaDatable::toJSON(options, members, *this);
 }

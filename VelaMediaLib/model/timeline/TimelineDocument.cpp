@@ -23,8 +23,7 @@ void writeScene(XMLOptions& options, int indent, const std::string& name, const 
             all[index]->toJSON(options, tracks.memberLevel(), int(index), !first);
         }
     }
-    options.key("ident");
-    writeJSONValue(options, scene.memberLevel(), name);
+    writeJSONMember(options, scene.memberLevel(), "ident", name);
 }
 
 template <typename T>

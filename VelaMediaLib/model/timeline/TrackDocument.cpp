@@ -27,8 +27,7 @@ std::vector<TransitionPtr> transitionsOf(const std::vector<MediaPtr>& medias) {
 void Track::toJSON(XMLOptions& options, int indent, int trackIndex, bool withFlags) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("trackIndex");
-    writeJSONValue(options, members, trackIndex);
+    writeJSONMember(options, members, "trackIndex", trackIndex);
     const std::vector<MediaPtr> clips = medias();
     {
         options.key("medias");
@@ -57,8 +56,7 @@ void Track::toJSON(XMLOptions& options, int indent, int trackIndex, bool withFla
     }
     if (hasMadeParameters()) toJSONParameterList(options, members); // a track's volume curve
     if (withFlags) {
-        options.key("ident");
-        writeJSONValue(options, members, identifier());
+        writeJSONMember(options, members, "ident", identifier());
         for (const char* flag : kFlagNames) {
             options.key(flag);
             writeJSONValue(options, members, attributeValue<bool>(flag, false));
@@ -69,8 +67,7 @@ void Track::toJSON(XMLOptions& options, int indent, int trackIndex, bool withFla
 
 void Track::toJSONTrackAttributes(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
-    options.key("ident");
-    writeJSONValue(options, object.memberLevel(), identifier());
+    writeJSONMember(options, object.memberLevel(), "ident", identifier());
     for (const char* flag : kFlagNames) {
         options.key(flag);
         writeJSONValue(options, object.memberLevel(), attributeValue<bool>(flag, false));

@@ -10,28 +10,19 @@ namespace VelaMediaLib {
 void CaptionAttributes::toJSON(XMLOptions& options, int indent) const {
     JSONWriter object(options, indent);
     const int members = object.memberLevel();
-    options.key("enabled");
-    writeJSONValue(options, members, enabled);
-    options.key("fontName");
-    writeJSONValue(options, members, fontName);
-    options.key("fontSize");
-    writeJSONValue(options, members, fontSize);
+    writeJSONMember(options, members, "enabled", enabled);
+    writeJSONMember(options, members, "fontName", fontName);
+    writeJSONMember(options, members, "fontSize", fontSize);
     options.key("backgroundColor");
     ValueTraits<TemplatedColor<int>>::write(options, members, backgroundColor);
     options.key("foregroundColor");
     ValueTraits<TemplatedColor<int>>::write(options, members, foregroundColor);
-    options.key("lang");
-    writeJSONValue(options, members, lang);
-    options.key("alignment");
-    writeJSONValue(options, members, alignment);
-    options.key("defaultFontSize");
-    writeJSONValue(options, members, defaultFontSize);
-    options.key("opacity");
-    writeJSONValue(options, members, opacity);
-    options.key("backgroundEnabled");
-    writeJSONValue(options, members, backgroundEnabled);
-    options.key("backgroundOnlyAroundText");
-    writeJSONValue(options, members, backgroundOnlyAroundText);
+    writeJSONMember(options, members, "lang", lang);
+    writeJSONMember(options, members, "alignment", alignment);
+    writeJSONMember(options, members, "defaultFontSize", defaultFontSize);
+    writeJSONMember(options, members, "opacity", opacity);
+    writeJSONMember(options, members, "backgroundEnabled", backgroundEnabled);
+    writeJSONMember(options, members, "backgroundOnlyAroundText", backgroundOnlyAroundText);
 }
 
 } // namespace VelaMediaLib
