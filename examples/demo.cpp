@@ -213,24 +213,6 @@ void writeDocument(const Project& project, const std::string& path) {
 
 } // namespace
 
-const char* typeName(TrackType type) {
-    switch (type) {
-    case TrackType::Video:
-        return "video";
-    case TrackType::Audio:
-        return "audio";
-    case TrackType::Image:
-        return "image";
-    case TrackType::ScreenVideo:
-        return "screen video";
-    case TrackType::ScreenImage:
-        return "screen image";
-    case TrackType::Unknown:
-        break;
-    }
-    return "unknown";
-}
-
 void printSources(const char* step, const Project& project) {
     std::cout << "  " << step << ":";
     for (const SourcePtr& source : project.sourceBin()->sources())
@@ -259,7 +241,7 @@ void sources() {
         const auto stats = source->stats();
         const Range<VelaTime> ticks = source->timeRangeForTrack(0);
         std::cout << "    " << fs::path(source->filename()).filename().string() << ": "
-                  << typeName(stats->trackType(0)) << " stream, ";
+                  << trackTypeName(stats->trackType(0)) << " stream, ";
         if (stats->trackType(0) == TrackType::Audio)
             std::cout << stats->numChannels(0) << " channels at "
                       << RationalUtil::toVelaTime(stats->sampleRate(0)) << " Hz";
