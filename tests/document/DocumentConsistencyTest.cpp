@@ -43,6 +43,14 @@ TEST(DocumentConsistency, ATransitionBetweenClipsThatDoNotTouchIsRefused) {
         << parseFailure(text);
 }
 
+// A transition longer than a clip it lies on cannot play on it.
+TEST(DocumentConsistency, ATransitionLongerThanItsClipIsRefused) {
+    const std::string text = smallDocument("[" + videoClip(3, 0, 30) + ", " + videoClip(4, 30, 30) + "]", "",
+                                           "[{\"name\": \"Fade\", \"duration\": 31, \"leftMedia\": 3, "
+                                           "\"rightMedia\": 4}]");
+    EXPECT_EQ(parseFailure(text), "Invalid project json - transition Fade is longer than its clip");
+}
+
 // A track's volume is a keyframable parameter of the track: it must survive a write and a read.
 TEST(DocumentConsistency, ATracksVolumeSurvivesTheDocument) {
     const auto project = Project::create(30, 1);
