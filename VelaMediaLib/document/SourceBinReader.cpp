@@ -91,7 +91,8 @@ void SourceBinReader::readSource(const Json::Value& entry) {
         if (const Json::Value* loudness = optionalMember(entry, "loudnessNormalization"))
             made->addAttribute<bool>("shouldApplyLoudnessNormalization", jsonValueAsBool(*loudness));
         if (const Json::Value* lastMod = optionalMember(entry, "lastMod")) jsonValueAsInt64(*lastMod);
-        made->removeMetaData(Source::timeAddedMetaDataKey()); // a read source was added when the document says
+        // A read source was added when its document says, not now.
+        made->removeMetaData(Source::timeAddedMetaDataKey());
         readMetaData(entry, *made);
         project.sourceBin()->insertSource(made, -1);
         return made;
