@@ -15,22 +15,22 @@ bool looksLikeOption(const std::string& word) {
 
 } // namespace
 
-Arguments Arguments::parse(const std::vector<std::string>& words, const ArgumentSpec& spec) {
+Arguments Arguments::parse(const std::vector<std::string>& words, const AcceptedArguments& accepted) {
     Arguments arguments;
     for (const std::string& word : words)
         if (isHelp(word)) {
             arguments.help_ = true;
             return arguments;
         }
-    arguments.take(words, spec);
-    if (arguments.operands_.size() != spec.operands)
-        throw UsageError("expected " + std::to_string(spec.operands) + " operand" +
-                         (spec.operands == 1 ? "" : "s") + ", got " +
+    arguments.take(words, accepted);
+    if (arguments.operands_.size() != accepted.operands)
+        throw UsageError("expected " + std::to_string(accepted.operands) + " operand" +
+                         (accepted.operands == 1 ? "" : "s") + ", got " +
                          std::to_string(arguments.operands_.size()));
     return arguments;
 }
 
-void Arguments::take(const std::vector<std::string>& words, const ArgumentSpec& spec) {
+void Arguments::take(const std::vector<std::string>& words, const AcceptedArguments& accepted) {
     bool optionsEnded = false;
     for (size_t i = 0; i < words.size(); ++i) {
         const std::string& word = words[i];
@@ -38,9 +38,9 @@ void Arguments::take(const std::vector<std::string>& words, const ArgumentSpec& 
             operands_.push_back(word);
         } else if (word == "--") {
             optionsEnded = true;
-        } else if (spec.flags.count(word)) {
+        } else if (accepted.flags.count(word)) {
             flags_.insert(word);
-        } else if (spec.options.count(word)) {
+        } else if (accepted.options.count(word)) {
             if (i + 1 == words.size()) throw UsageError("option " + word + " needs a value");
             options_[word] = words[++i];
         } else {

@@ -65,26 +65,15 @@ void printTrack(std::ostream& out, const std::string& label, const Track& track,
 
 } // namespace
 
-const char* AtCommand::name() const { return "at"; }
-
-const char* AtCommand::summary() const {
-    return "the clips active at a tick, per track, with their media time";
-}
-
-std::string AtCommand::usage() const {
-    return "usage: vela at DOC TICK\n"
-           "  Prints, track by track, the clips active at TICK (ticks of the project's\n"
-           "  edit rate): kind, name, range [start, end) on its track (a clip inside a\n"
-           "  group, stitched or unified clip: in its container's time, indented under\n"
-           "  it) and the clip's media time there. At a cut both touching clips are listed.\n"
-           "  DOC is a project document, or - for standard input.\n";
-}
-
-ArgumentSpec AtCommand::spec() const {
-    ArgumentSpec spec;
-    spec.operands = 2;
-    return spec;
-}
+AtCommand::AtCommand()
+    : Subcommand({"at", "the clips active at a tick, per track, with their media time",
+                  "usage: vela at DOC TICK\n"
+                  "  Prints, track by track, the clips active at TICK (ticks of the project's\n"
+                  "  edit rate): kind, name, range [start, end) on its track (a clip inside a\n"
+                  "  group, stitched or unified clip: in its container's time, indented under\n"
+                  "  it) and the clip's media time there. At a cut both touching clips are listed.\n"
+                  "  DOC is a project document, or - for standard input.\n",
+                  AcceptedArguments{{}, {}, 2}}) {}
 
 int AtCommand::run(const Arguments& arguments, Console& console) const {
     const VelaTime tick = tickOf(arguments.operand(1));

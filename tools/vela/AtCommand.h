@@ -7,10 +7,7 @@ namespace VelaTool {
 /// `vela at DOC TICK`: the clips active at a tick, track by track, with their media time there.
 class AtCommand : public Subcommand {
 public:
-    const char* name() const override;
-    const char* summary() const override;
-    std::string usage() const override;
-    ArgumentSpec spec() const override;
+    AtCommand();
     int run(const Arguments& arguments, Console& console) const override;
 };
 

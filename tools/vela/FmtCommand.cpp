@@ -22,27 +22,16 @@ void writeFile(const std::string& path, const std::string& text) {
 
 } // namespace
 
-const char* FmtCommand::name() const { return "fmt"; }
-
-const char* FmtCommand::summary() const { return "the document rewritten in the library's form"; }
-
-std::string FmtCommand::usage() const {
-    return "usage: vela fmt DOC [-o OUT] [--compact]\n"
-           "  Reads the document and writes it again as the library writes projects:\n"
-           "  its member order, fresh ids counted from 1, two-blank indentation.\n"
-           "  DOC is a project document, or - for standard input.\n"
-           "  -o OUT     write to OUT (only once the document has been read) instead of\n"
-           "             standard output\n"
-           "  --compact  no line breaks and no indentation\n";
-}
-
-ArgumentSpec FmtCommand::spec() const {
-    ArgumentSpec spec;
-    spec.flags = {"--compact"};
-    spec.options = {"-o"};
-    spec.operands = 1;
-    return spec;
-}
+FmtCommand::FmtCommand()
+    : Subcommand({"fmt", "the document rewritten in the library's form",
+                  "usage: vela fmt DOC [-o OUT] [--compact]\n"
+                  "  Reads the document and writes it again as the library writes projects:\n"
+                  "  its member order, fresh ids counted from 1, two-blank indentation.\n"
+                  "  DOC is a project document, or - for standard input.\n"
+                  "  -o OUT     write to OUT (only once the document has been read) instead of\n"
+                  "             standard output\n"
+                  "  --compact  no line breaks and no indentation\n",
+                  AcceptedArguments{{"--compact"}, {"-o"}, 1}}) {}
 
 int FmtCommand::run(const Arguments& arguments, Console& console) const {
     const LoadedDocument document = DocumentLoader(console).load(arguments.operand(0));

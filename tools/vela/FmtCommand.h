@@ -7,10 +7,7 @@ namespace VelaTool {
 /// `vela fmt DOC [-o OUT] [--compact]`: the document rewritten in the library's form.
 class FmtCommand : public Subcommand {
 public:
-    const char* name() const override;
-    const char* summary() const override;
-    std::string usage() const override;
-    ArgumentSpec spec() const override;
+    FmtCommand();
     int run(const Arguments& arguments, Console& console) const override;
 };
 

@@ -7,27 +7,16 @@
 
 namespace VelaTool {
 
-const char* InfoCommand::name() const { return "info"; }
-
-const char* InfoCommand::summary() const {
-    return "edit rate, canvas, duration, tracks, clips by kind, sources";
-}
-
-std::string InfoCommand::usage() const {
-    return "usage: vela info DOC [--json]\n"
+InfoCommand::InfoCommand()
+    : Subcommand(
+          {"info", "edit rate, canvas, duration, tracks, clips by kind, sources",
+           "usage: vela info DOC [--json]\n"
            "  Prints the project's edit rate, canvas size, duration, number of tracks,\n"
            "  clips by kind (at any depth) and sources with their offline status.\n"
            "  DOC is a project document, or - for standard input.\n"
            "  --json  the same as one JSON object: \"editRate\" (\"n/d\"), \"width\", \"height\",\n"
-           "          \"duration\" (ticks), \"tracks\", \"clips\" (counts by \"_type\"), \"sources\"\n";
-}
-
-ArgumentSpec InfoCommand::spec() const {
-    ArgumentSpec spec;
-    spec.flags = {"--json"};
-    spec.operands = 1;
-    return spec;
-}
+           "          \"duration\" (ticks), \"tracks\", \"clips\" (counts by \"_type\"), \"sources\"\n",
+           AcceptedArguments{{"--json"}, {}, 1}}) {}
 
 int InfoCommand::run(const Arguments& arguments, Console& console) const {
     const LoadedDocument document = DocumentLoader(console).load(arguments.operand(0));

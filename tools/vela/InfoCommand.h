@@ -7,10 +7,7 @@ namespace VelaTool {
 /// `vela info DOC [--json]`: what the project holds, as text or one JSON object.
 class InfoCommand : public Subcommand {
 public:
-    const char* name() const override;
-    const char* summary() const override;
-    std::string usage() const override;
-    ArgumentSpec spec() const override;
+    InfoCommand();
     int run(const Arguments& arguments, Console& console) const override;
 };
 

@@ -8,26 +8,15 @@
 
 namespace VelaTool {
 
-const char* RoundtripCommand::name() const { return "roundtrip"; }
-
-const char* RoundtripCommand::summary() const {
-    return "read, write and compare; exit 1 on the first difference";
-}
-
-std::string RoundtripCommand::usage() const {
-    return "usage: vela roundtrip DOC\n"
-           "  Reads the document, writes the project again in the document's own form\n"
-           "  (indented, or compact when the document is) and compares the two texts.\n"
-           "  Exits 0 when they are equal byte for byte; otherwise shows the first\n"
-           "  difference and exits 1. A document `vela fmt` wrote always round-trips.\n"
-           "  DOC is a project document, or - for standard input.\n";
-}
-
-ArgumentSpec RoundtripCommand::spec() const {
-    ArgumentSpec spec;
-    spec.operands = 1;
-    return spec;
-}
+RoundtripCommand::RoundtripCommand()
+    : Subcommand({"roundtrip", "read, write and compare; exit 1 on the first difference",
+                  "usage: vela roundtrip DOC\n"
+                  "  Reads the document, writes the project again in the document's own form\n"
+                  "  (indented, or compact when the document is) and compares the two texts.\n"
+                  "  Exits 0 when they are equal byte for byte; otherwise shows the first\n"
+                  "  difference and exits 1. A document `vela fmt` wrote always round-trips.\n"
+                  "  DOC is a project document, or - for standard input.\n",
+                  AcceptedArguments{{}, {}, 1}}) {}
 
 int RoundtripCommand::run(const Arguments& arguments, Console& console) const {
     const LoadedDocument document = DocumentLoader(console).load(arguments.operand(0));

@@ -7,10 +7,7 @@ namespace VelaTool {
 /// `vela roundtrip DOC`: reads, writes in the same form, and compares; exit 1 on a difference.
 class RoundtripCommand : public Subcommand {
 public:
-    const char* name() const override;
-    const char* summary() const override;
-    std::string usage() const override;
-    ArgumentSpec spec() const override;
+    RoundtripCommand();
     int run(const Arguments& arguments, Console& console) const override;
 };
 

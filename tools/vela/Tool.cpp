@@ -55,7 +55,7 @@ int Tool::runSubcommand(const Subcommand& subcommand, const std::vector<std::str
                         Console& console) const {
     const std::string who = std::string("vela ") + subcommand.name() + ": ";
     try {
-        const Arguments arguments = Arguments::parse(words, subcommand.spec());
+        const Arguments arguments = Arguments::parse(words, subcommand.accepted());
         if (arguments.wantsHelp()) {
             console.out << subcommand.usage();
             return 0;

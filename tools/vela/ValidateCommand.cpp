@@ -7,24 +7,13 @@
 
 namespace VelaTool {
 
-const char* ValidateCommand::name() const { return "validate"; }
-
-const char* ValidateCommand::summary() const {
-    return "exit 0 when the document reads, else its fault and exit 1";
-}
-
-std::string ValidateCommand::usage() const {
-    return "usage: vela validate DOC\n"
-           "  Reads the document as the library does. Prints \"DOC: valid\" and exits 0,\n"
-           "  or prints the reader's message on standard error and exits 1.\n"
-           "  DOC is a project document, or - for standard input.\n";
-}
-
-ArgumentSpec ValidateCommand::spec() const {
-    ArgumentSpec spec;
-    spec.operands = 1;
-    return spec;
-}
+ValidateCommand::ValidateCommand()
+    : Subcommand({"validate", "exit 0 when the document reads, else its fault and exit 1",
+                  "usage: vela validate DOC\n"
+                  "  Reads the document as the library does. Prints \"DOC: valid\" and exits 0,\n"
+                  "  or prints the reader's message on standard error and exits 1.\n"
+                  "  DOC is a project document, or - for standard input.\n",
+                  AcceptedArguments{{}, {}, 1}}) {}
 
 int ValidateCommand::run(const Arguments& arguments, Console& console) const {
     const std::string& document = arguments.operand(0);

@@ -7,10 +7,7 @@ namespace VelaTool {
 /// `vela validate DOC`: exit 0 when the library reads the document, else its message and exit 1.
 class ValidateCommand : public Subcommand {
 public:
-    const char* name() const override;
-    const char* summary() const override;
-    std::string usage() const override;
-    ArgumentSpec spec() const override;
+    ValidateCommand();
     int run(const Arguments& arguments, Console& console) const override;
 };
 
