@@ -9,14 +9,6 @@
 namespace VelaMediaLib {
 namespace {
 
-template <typename T>
-void writeAttribute(XMLOptions& options, int indent, const char* key,
-                    const boost::shared_ptr<Attribute<T>>& attribute) {
-    if (!attribute) return;
-    options.key(key);
-    attribute->writeValue(options, indent);
-}
-
 void writeClient(XMLOptions& options, int indent, const VersionInfo& info) {
     options.key("authoringClientName");
     JSONWriter object(options, indent);
@@ -47,17 +39,17 @@ void writeMetaData(XMLOptions& options, int indent, const std::map<std::string, 
 void InternalProject::toJSON(XMLOptions& options) const {
     JSONWriter root(options, 0);
     const int members = root.memberLevel();
-    writeAttribute(options, members, "title", titleAttribute());
-    writeAttribute(options, members, "description", descriptionAttribute());
-    writeAttribute(options, members, "author", authorAttribute());
-    writeAttribute(options, members, "targetLoudness", targetLoudnessAttribute());
-    writeAttribute(options, members, "shouldApplyLoudnessNormalization",
-                   shouldApplyLoudnessNormalizationAttribute());
-    writeAttribute(options, members, "videoFormatFrameRate", videoFormatFrameRateAttribute());
-    writeAttribute(options, members, "audioFormatSampleRate", audioFormatSampleRateAttribute());
-    writeAttribute(options, members, "allowSubFrameEditing", allowSubFrameEditingAttribute());
-    writeAttribute(options, members, "width", timeline_->attributeWidth());
-    writeAttribute(options, members, "height", timeline_->attributeHeight());
+    writeAttributeMember(options, members, "title", titleAttribute());
+    writeAttributeMember(options, members, "description", descriptionAttribute());
+    writeAttributeMember(options, members, "author", authorAttribute());
+    writeAttributeMember(options, members, "targetLoudness", targetLoudnessAttribute());
+    writeAttributeMember(options, members, "shouldApplyLoudnessNormalization",
+                         shouldApplyLoudnessNormalizationAttribute());
+    writeAttributeMember(options, members, "videoFormatFrameRate", videoFormatFrameRateAttribute());
+    writeAttributeMember(options, members, "audioFormatSampleRate", audioFormatSampleRateAttribute());
+    writeAttributeMember(options, members, "allowSubFrameEditing", allowSubFrameEditingAttribute());
+    writeAttributeMember(options, members, "width", timeline_->attributeWidth());
+    writeAttributeMember(options, members, "height", timeline_->attributeHeight());
     writeJSONMember(options, members, "version", std::string(documentVersion()));
     const boost::rational<unsigned long> rate = editRate();
     options.key("editRate");

@@ -1,11 +1,13 @@
 #pragma once
 // Parsing document text with the limits every parser of the library sets.
 
+#include <VelaMediaLib/document/detail/ReadSupport.h>
 #include <VelaMediaLib/document/format/VersionInfo.h>
 
 #include <json/value.h>
 
 #include <istream>
+#include <string>
 
 namespace VelaMediaLib {
 
@@ -14,27 +16,12 @@ namespace VelaMediaLib {
 Json::Value parseDocument(std::istream& in);
 /// The root's version information ("6.0" without "version").
 VersionInfo documentVersionInfo(const Json::Value& root);
-/// Turns what the step throws into the parsers' one kind of failure.
-template <typename Step>
-auto parsingDocument(const Step& step) -> decltype(step());
 
-} // namespace VelaMediaLib
-
-#include <VelaMediaLib/document/detail/ReadSupport.h>
-
-namespace VelaMediaLib {
-
+/// Turns what the step throws into the parsers' one kind of failure: as
+/// refusingOtherFaults, the text being the exception's own.
 template <typename Step>
 auto parsingDocument(const Step& step) -> decltype(step()) {
-    try {
-        return step();
-    } catch (const ParserException&) {
-        throw;
-    } catch (const std::bad_alloc&) {
-        throw;
-    } catch (const std::exception& e) {
-        refuseDocument(e.what());
-    }
+    return refusingOtherFaults([](const char* what) { return std::string(what); }, step);
 }
 
 } // namespace VelaMediaLib

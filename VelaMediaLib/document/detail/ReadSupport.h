@@ -43,11 +43,11 @@ auto whereText(const Describe& describe) -> decltype(describe()) {
     return describe();
 }
 
-/// Runs the step, turning whatever but a ParserException it throws into
-/// ParserException "Invalid project json - <where>: <what>". `where` is the
-/// text or a function giving it, called only on failure (loads run this per clip).
-template <typename Where, typename Step>
-auto readingWhere(const Where& where, const Step& step) -> decltype(step()) {
+/// Runs the step, turning whatever but a ParserException (or a lack of
+/// memory) it throws into ParserException "Invalid project json - " and the
+/// text `describe` makes of the exception's.
+template <typename Describe, typename Step>
+auto refusingOtherFaults(const Describe& describe, const Step& step) -> decltype(step()) {
     try {
         return step();
     } catch (const ParserException&) {
@@ -55,8 +55,15 @@ auto readingWhere(const Where& where, const Step& step) -> decltype(step()) {
     } catch (const std::bad_alloc&) {
         throw;
     } catch (const std::exception& e) {
-        refuseDocument(whereText(where) + ": " + e.what());
+        refuseDocument(describe(e.what()));
     }
+}
+
+/// As refusingOtherFaults, the text being "<where>: <what>". `where` is the
+/// text or a function giving it, called only on failure (loads run this per clip).
+template <typename Where, typename Step>
+auto readingWhere(const Where& where, const Step& step) -> decltype(step()) {
+    return refusingOtherFaults([&](const char* what) { return whereText(where) + ": " + what; }, step);
 }
 
 /// Counts one level of composite nesting for as long as it lives; refuses

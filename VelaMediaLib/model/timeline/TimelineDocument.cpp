@@ -26,14 +26,6 @@ void writeScene(XMLOptions& options, int indent, const std::string& name, const 
     writeJSONMember(options, scene.memberLevel(), "ident", name);
 }
 
-template <typename T>
-void writeAttribute(XMLOptions& options, int indent, const char* key,
-                    const boost::shared_ptr<Attribute<T>>& attribute) {
-    if (!attribute) return;
-    options.key(key);
-    attribute->writeValue(options, indent);
-}
-
 } // namespace
 
 void Timeline::toJSON(XMLOptions& options, int indent) const {
@@ -65,9 +57,9 @@ void Timeline::toJSON(XMLOptions& options, int indent) const {
     }
     options.key("captionAttributes");
     captionAttributes().toJSON(options, members);
-    writeAttribute(options, members, "backgroundColor", backgroundColor());
-    writeAttribute(options, members, "gain", gain());
-    writeAttribute(options, members, "legacyAttenuateAudioMix", legacyAttenuateAudioMixAttribute());
+    writeAttributeMember(options, members, "backgroundColor", backgroundColor());
+    writeAttributeMember(options, members, "gain", gain());
+    writeAttributeMember(options, members, "legacyAttenuateAudioMix", legacyAttenuateAudioMixAttribute());
     toJSONParameterList(options, members);
     MetaDatable::toJSON(options, members, *this);
 }

@@ -4,6 +4,13 @@
 
 namespace VelaMediaLib {
 
+void writeAttributeMember(XMLOptions& options, int indent, const char* key,
+                          const boost::shared_ptr<const AttributeInterface>& attribute) {
+    if (!attribute) return;
+    options.key(key);
+    attribute->writeValue(options, indent);
+}
+
 Attributable::AttributePtr Attributable::findAttribute(const std::string& name) const {
     ScopedReadLock lock(projectLock());
     return attributes_.find(name);

@@ -27,6 +27,11 @@ public:
     cloneAttribute(const boost::weak_ptr<const ThreadSafe>& token) const = 0;
 };
 
+/// The attribute as the member `key` of the object being written; nothing
+/// for no attribute.
+VELAMEDIALIB_API void writeAttributeMember(XMLOptions& options, int indent, const char* key,
+                                           const boost::shared_ptr<const AttributeInterface>& attribute);
+
 /// A named value that tells its observers when it changes. Reads take the
 /// project's read lock and writes its write lock; setting the value it
 /// already has changes nothing and tells nobody.
