@@ -13,8 +13,7 @@ class Track;
 /// "attributes") of a track and sets it on the clips it names (read before,
 /// by "id"): the right edge of the left clip, the left edge of the right one.
 /// Refused ("Invalid project json - ..."): an id naming no clip ("unknown
-/// media id: N"), a clip of another track, two sides that do not touch, and
-/// a transition longer than a clip it lies on.
+/// media id: N") and a clip of another track.
 class VELAMEDIALIB_API TransitionReader : public JSONReader {
 public:
     TransitionReader(const boost::shared_ptr<ReadContext>& context, const boost::shared_ptr<Track>& track)
@@ -25,7 +24,7 @@ public:
 private:
     boost::shared_ptr<Media> mediaOf(const Json::Value& value, const char* key) const;
 
-    void checkSides(const std::string& name, long long duration, const boost::shared_ptr<Media>& left,
+    void checkSides(const std::string& name, const boost::shared_ptr<Media>& left,
                     const boost::shared_ptr<Media>& right) const;
 
     boost::shared_ptr<Track> track_;

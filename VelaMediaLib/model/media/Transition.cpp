@@ -3,6 +3,7 @@
 #include <VelaMediaLib/document/format/JSONValues.h>
 #include <VelaMediaLib/document/format/JSONWriter.h>
 #include <VelaMediaLib/model/media/Media.h>
+#include <VelaMediaLib/model/timeline/SubTimeline.h>
 
 namespace VelaMediaLib {
 
@@ -20,21 +21,23 @@ void Transition::mergeMediaPairTransitions(
 
 namespace {
 
-// The side's clip by its id in this write; a side without a clip, or whose
-// clip this write has not named, is left out.
-void writeSide(XMLOptions& options, const char* key, const boost::shared_ptr<Media>& media) {
-    const unsigned ident = media ? options.findIdent(media.get()) : 0;
+// The side's clip by its id in this write; a side without a clip, whose
+// clip this write has not named, or that lies off the owner, is left out.
+void writeSide(XMLOptions& options, const char* key, const boost::shared_ptr<Media>& media,
+               const SubTimeline* owner) {
+    if (!media || (owner && media->parent().get() != owner)) return;
+    const unsigned ident = options.findIdent(media.get());
     if (ident) options.key(key) << ident;
 }
 
 } // namespace
 
-void Transition::toJSON(XMLOptions& options, int indent) const {
+void Transition::toJSON(XMLOptions& options, int indent, const SubTimeline* owner) const {
     JSONWriter object(options, indent);
     writeJSONMember(options, object.memberLevel(), "name", name_);
     writeJSONMember(options, object.memberLevel(), "duration", (long long)duration_);
-    writeSide(options, "leftMedia", leftMedia());
-    writeSide(options, "rightMedia", rightMedia());
+    writeSide(options, "leftMedia", leftMedia(), owner);
+    writeSide(options, "rightMedia", rightMedia(), owner);
     if (attributes_.isEmpty()) return;
     options.key("attributes");
     attributes_.write(options, object.memberLevel());

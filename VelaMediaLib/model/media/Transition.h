@@ -14,6 +14,7 @@
 namespace VelaMediaLib {
 
 class Media;
+class SubTimeline;
 class XMLOptions;
 
 /// A transition at a clip's edge, or between two touching clips: its kind by
@@ -36,7 +37,10 @@ public:
     /// The transition's object, closed at indent: "name", "duration",
     /// "leftMedia" and "rightMedia" (the ids the clips have in this write;
     /// a side without a clip is left out), "attributes" (when not empty).
-    void toJSON(XMLOptions& options, int indent) const;
+    /// Written in a track's list (`owner`), only the sides whose clips lie on
+    /// that track are named: a transition whose clips were pulled onto two
+    /// tracks is written as each track's one-sided transition, once each.
+    void toJSON(XMLOptions& options, int indent, const SubTimeline* owner = nullptr) const;
 
     /// Joins the transition that two touching clips share again: when the
     /// earlier clip has a right transition (or else the later one a left one),

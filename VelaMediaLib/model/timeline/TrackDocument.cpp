@@ -42,7 +42,7 @@ void Track::toJSON(XMLOptions& options, int indent, int trackIndex, bool withFla
         JSONWriter array(options, members, JSONWriter::Array);
         for (const TransitionPtr& transition : transitionsOf(clips)) {
             options.element();
-            transition->toJSON(options, array.memberLevel());
+            transition->toJSON(options, array.memberLevel(), this);
         }
     }
     const Effects effects = allEffects();
