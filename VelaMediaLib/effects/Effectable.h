@@ -22,6 +22,8 @@ public:
     /// Returns whether the effect was there.
     virtual bool removeEffect(const EffectPtr& effect) = 0;
     virtual void swapEffectOrder(size_t first, size_t second) = 0;
+    /// The whole list at once (an edit that moves effects and its undo).
+    virtual void replaceAllEffects(const Effects& effects) = 0;
     virtual EffectPtr effectAtIndex(size_t index) const = 0;
     virtual size_t numEffects() const = 0;
     /// A copy of the list, in order.

@@ -11,6 +11,17 @@ boost::shared_ptr<StoredEffect> StoredEffect::create(const Fields& fields) {
 
 boost::shared_ptr<Effect> StoredEffect::cloneEffect() const { return create(fields_); }
 
+bool StoredEffect::isMagnetized() const {
+    return fields_.effectName == "DeviceFrameEffect" || fields_.effectName == "CursorPath";
+}
+
+boost::shared_ptr<Effect> StoredEffect::withTimeRange(const Range<VelaTime>& range) const {
+    Fields fields = fields_;
+    fields.start = range.start();
+    fields.duration = range.duration();
+    return create(fields);
+}
+
 namespace {
 
 void writeTree(XMLOptions& options, int indent, const char* key, const JSONTree& tree) {

@@ -35,6 +35,11 @@ public:
     const Fields& fields() const { return fields_; }
     std::string effectName() const override { return fields_.effectName; }
     boost::shared_ptr<Effect> cloneEffect() const override;
+    /// True for the effects that stay fitted to their clip's edges:
+    /// "DeviceFrameEffect" and "CursorPath".
+    bool isMagnetized() const override;
+    Range<VelaTime> timeRange() const override { return Range<VelaTime>(fields_.start, fields_.duration); }
+    boost::shared_ptr<Effect> withTimeRange(const Range<VelaTime>& range) const override;
     /// "_type", "effectName", "category", "bypassed", "start", "duration",
     /// then "in", "center", "out", "parameters", "metadata" where present.
     void toJSON(XMLOptions& options, int indent) const override;

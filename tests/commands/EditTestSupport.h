@@ -4,6 +4,7 @@
 
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
+#include <VelaMediaLib/document/ProjectDocument.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
@@ -122,6 +123,19 @@ protected:
         EXPECT_EQ(snapshot(), before) << command->name();
         ASSERT_TRUE(project->redo()) << command->name();
         EXPECT_EQ(snapshot(), after) << command->name();
+    }
+    // The whole project as written: what undo must give back byte for byte.
+    std::string document() const { return projectToJSONString(*project, true); }
+    // As expectExactUndo, on the written project.
+    void expectExactDocumentUndo(const CommandPtr& command) {
+        const std::string before = document();
+        ASSERT_TRUE(project->execute(command)) << command->name();
+        const std::string after = document();
+        EXPECT_NE(after, before) << command->name();
+        ASSERT_TRUE(project->undo()) << command->name();
+        EXPECT_EQ(document(), before) << command->name();
+        ASSERT_TRUE(project->redo()) << command->name();
+        EXPECT_EQ(document(), after) << command->name();
     }
     // The command is refused, changes nothing and leaves no step.
     void expectRefused(const CommandPtr& command) {

@@ -5,7 +5,8 @@
 namespace VelaMediaLib {
 
 // One read lock, so that the slots and links taken belong together.
-void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range) {
+void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range,
+                                 bool always) {
     *this = TransitionSlots();
     token_ = track.projectMutex();
     ScopedReadLock lock(token_);
@@ -17,7 +18,7 @@ void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, cons
         addLinks(clips_.back().left);
         addLinks(clips_.back().right);
     }
-    if (links_.empty()) clips_.clear(); // no transition around: nothing to join
+    if (links_.empty() && !always) clips_.clear(); // no transition around: nothing to join
 }
 
 void TransitionSlots::addLinks(const TransitionPtr& transition) {
@@ -46,6 +47,15 @@ void TransitionSlots::restore() const {
 CommandHandler& AtomicEditCmd::need(CommandHandler* handler) {
     if (!handler) throw VelaMediaLibException("no command handler");
     return *handler;
+}
+
+TrackPtr AtomicEditCmd::parentTrackOf(const MediaPtr& media) {
+    TrackPtr track;
+    if (media)
+        media->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
+            track = boost::dynamic_pointer_cast<Track>(parent);
+        });
+    return track;
 }
 
 bool AtomicEditCmd::keep(const CommandHandler::TrackAndMedia& result) {

@@ -16,8 +16,11 @@ namespace VelaMediaLib {
 class TransitionSlots {
 public:
     /// Takes the clip and the clips of the track touching or inside the range
-    /// (where placing the clip joins transitions).
-    void takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range);
+    /// (where placing the clip joins transitions). Unless `always`, clips
+    /// without any transition among them are not kept (placing joins nothing
+    /// there); an edit that sets slots itself keeps them always.
+    void takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range,
+                    bool always = false);
     /// Puts back every slot, then every link, taken.
     void restore() const;
 
@@ -69,6 +72,15 @@ protected:
     void saveState(const Range<VelaTime>& placed);
     /// Gives the clip the timing and transitions it had before the edit.
     bool restoreSavedState(CommandHandler* handler);
+    /// Takes the clip's timing after an edit, so that a redo gives it back
+    /// exactly (and a combined edit can redo both parts in one step).
+    void saveAfter() { after_ = resultMedia_ ? resultMedia_->state() : MediaState(); }
+    /// Gives the clip the timing it had after the edit; false when refused.
+    bool restoreAfter(CommandHandler* handler) {
+        return need(handler).restoreMediaState(resultTrack_, resultMedia_, after_).second != nullptr;
+    }
+    /// The track the clip stands on, or null (off a track, or in a group).
+    static TrackPtr parentTrackOf(const MediaPtr& media);
     /// The handler, or VelaMediaLibException "no command handler".
     static CommandHandler& need(CommandHandler* handler);
 
@@ -78,6 +90,7 @@ protected:
     TrackPtr resultTrack_;
     MediaPtr resultMedia_;
     MediaState saved_;
+    MediaState after_;
     TransitionSlots slots_;
 };
 

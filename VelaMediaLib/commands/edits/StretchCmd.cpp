@@ -22,13 +22,26 @@ boost::shared_ptr<StretchCmd> StretchCmd::create(const MediaPtr& media, double s
 bool StretchCmd::execute(CommandHandler* handler) {
     need(handler);
     if (!media_) return false;
-    track_.reset();
-    media_->parentVisitor([&](const boost::shared_ptr<SubTimeline>& parent) {
-        track_ = boost::dynamic_pointer_cast<Track>(parent);
-    });
+    track_ = parentTrackOf(media_);
     if (!track_) return false;
     saveState();
-    return keep(handler->stretchMedia(track_, media_, scalar_ / saved_.scalar));
+    if (!keep(handler->stretchMedia(track_, media_, scalar_ / saved_.scalar))) return false;
+    saveAfter();
+    return true;
+}
+
+CommandPtr StretchCmd::combine(const CommandPtr& later) {
+    const boost::shared_ptr<StretchCmd> stretch = boost::dynamic_pointer_cast<StretchCmd>(later);
+    if (!stretch || stretch->media_ != resultMedia_ || stretch->track_ != resultTrack_)
+        return Command::combine(later);
+    const boost::shared_ptr<StretchCmd> both(new StretchCmd(media_, stretch->scalar_));
+    both->setName(name());
+    both->track_ = track_;
+    both->resultTrack_ = stretch->resultTrack_;
+    both->resultMedia_ = stretch->resultMedia_;
+    both->saved_ = saved_;
+    both->after_ = stretch->after_;
+    return both;
 }
 
 } // namespace VelaMediaLib

@@ -2,34 +2,67 @@
 
 #include <VelaMediaLib/base/Export.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/MagneticEffects.h>
 
 namespace VelaMediaLib {
 
-/// Moves a clip's start edge by a tick delta (positive shortens it), the
-/// content under the rest staying in place. Undo gives back the exact state.
-class VELAMEDIALIB_API TrimStartCmd : public AtomicEditCmd {
+/// What the two trims share: the effects that follow the trimmed edge move
+/// with it (their other edge stays put on the time line), undo gives back the
+/// clip's exact state and effect list, and redo the exact state and list the
+/// trim gave. Two trims of the same edge of the same clip in a row combine
+/// into one undo step: undone to the first one's state, redone to the
+/// second one's, with the sum as its delta.
+class VELAMEDIALIB_API EdgeTrimCmd : public AtomicEditCmd {
 public:
-    static boost::shared_ptr<TrimStartCmd> create(const TrackPtr& track, const MediaPtr& media,
-                                                  VelaTime delta);
+    const EdgeEffects& edgeEffects() const { return edgeEffects_; }
     bool execute(CommandHandler* handler) override;
-    bool unexecute(CommandHandler* handler) override { return restoreSavedState(handler); }
+    bool unexecute(CommandHandler* handler) override;
+    bool reexecute(CommandHandler* handler) override;
+    CommandPtr combine(const CommandPtr& later) override;
+
+protected:
+    EdgeTrimCmd(const TrackPtr& track, const MediaPtr& media, VelaTime delta, const EdgeEffects& effects,
+                bool startEdge)
+        : AtomicEditCmd(track, media, delta), edgeEffects_(effects), startEdge_(startEdge) {}
+    /// A trim of the same edge, to hold two combined.
+    virtual boost::shared_ptr<EdgeTrimCmd> sameEdge(VelaTime delta) const = 0;
 
 private:
-    TrimStartCmd(const TrackPtr& track, const MediaPtr& media, VelaTime delta)
-        : AtomicEditCmd(track, media, delta) {}
+    EdgeEffects edgeEffects_;
+    bool startEdge_;
+    Effectable::Effects savedEffects_;
+    Effectable::Effects afterEffects_;
+};
+
+/// Moves a clip's start edge by a tick delta (positive shortens it), the
+/// content under the rest staying in place.
+class VELAMEDIALIB_API TrimStartCmd : public EdgeTrimCmd {
+public:
+    /// The effects that follow the edge are usually magneticEffectsForMedia(media).
+    static boost::shared_ptr<TrimStartCmd> create(const TrackPtr& track, const MediaPtr& media,
+                                                  VelaTime delta, const EdgeEffects& effects);
+    /// With the clip's magnetized effects following the edge.
+    static boost::shared_ptr<TrimStartCmd> create(const TrackPtr& track, const MediaPtr& media,
+                                                  VelaTime delta);
+
+private:
+    TrimStartCmd(const TrackPtr& track, const MediaPtr& media, VelaTime delta, const EdgeEffects& effects)
+        : EdgeTrimCmd(track, media, delta, effects, true) {}
+    boost::shared_ptr<EdgeTrimCmd> sameEdge(VelaTime delta) const override;
 };
 
 /// Moves a clip's end edge in by a tick delta (positive shortens it, negative
-/// plays more media). Undo gives back the exact state.
-class VELAMEDIALIB_API TrimEndCmd : public AtomicEditCmd {
+/// plays more media).
+class VELAMEDIALIB_API TrimEndCmd : public EdgeTrimCmd {
 public:
+    static boost::shared_ptr<TrimEndCmd> create(const TrackPtr& track, const MediaPtr& media, VelaTime delta,
+                                                const EdgeEffects& effects);
     static boost::shared_ptr<TrimEndCmd> create(const TrackPtr& track, const MediaPtr& media, VelaTime delta);
-    bool execute(CommandHandler* handler) override;
-    bool unexecute(CommandHandler* handler) override { return restoreSavedState(handler); }
 
 private:
-    TrimEndCmd(const TrackPtr& track, const MediaPtr& media, VelaTime delta)
-        : AtomicEditCmd(track, media, delta) {}
+    TrimEndCmd(const TrackPtr& track, const MediaPtr& media, VelaTime delta, const EdgeEffects& effects)
+        : EdgeTrimCmd(track, media, delta, effects, false) {}
+    boost::shared_ptr<EdgeTrimCmd> sameEdge(VelaTime delta) const override;
 };
 
 } // namespace VelaMediaLib

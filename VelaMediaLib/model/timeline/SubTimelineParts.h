@@ -60,6 +60,10 @@ public:
     void swapEffectOrder(size_t first, size_t second) override {
         if (effects_.swap(first, second)) notify();
     }
+    void replaceAllEffects(const Effects& effects) override {
+        effects_.replaceAll(effects);
+        notify();
+    }
     EffectPtr effectAtIndex(size_t index) const override { return effects_.at(index); }
     size_t numEffects() const override { return effects_.size(); }
     Effects allEffects() const override { return effects_.all(); }

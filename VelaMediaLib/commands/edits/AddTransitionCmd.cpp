@@ -1,0 +1,111 @@
+#include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
+
+#include <algorithm>
+
+namespace VelaMediaLib {
+
+bool TransitionEditCmd::unexecute(CommandHandler*) {
+    slots_.restore();
+    return true;
+}
+
+void TransitionEditCmd::saveSlots(const std::vector<MediaPtr>& clips) {
+    VelaTime from = 0, to = 0;
+    for (size_t i = 0; i < clips.size(); ++i) {
+        const Range<VelaTime> range = clips[i]->trackRange();
+        from = i ? std::min(from, range.start()) : range.start();
+        to = i ? std::max(to, range.end()) : range.end();
+    }
+    slots_.takeAround(*track_, clips.front(), Range<VelaTime>(from, to - from), true);
+}
+
+bool TransitionEditCmd::onTrack(const std::vector<MediaPtr>& clips) const {
+    if (!track_) return false;
+    ScopedReadLock lock(track_->projectLock());
+    return std::all_of(clips.begin(), clips.end(),
+                       [&](const MediaPtr& clip) { return clip && track_->hasMedia(clip); });
+}
+
+bool TransitionEditCmd::roomFor(const Media& clip, const TransitionPtr& in, const TransitionPtr& out) {
+    VelaTime used = in ? in->duration() : 0;
+    if (in && in->duration() < 0) return false;
+    for (const TransitionPtr& held : {clip.leftTransition(), clip.rightTransition()})
+        if (held && held != out && held != in) used += held->duration();
+    return used <= clip.duration();
+}
+
+boost::shared_ptr<AddTransitionCmd> AddTransitionCmd::create(const TrackPtr& track, const MediaPtr& media,
+                                                             const TransitionPtr& transition, Side side) {
+    const boost::shared_ptr<AddTransitionCmd> command(new AddTransitionCmd(track, media, transition, side));
+    command->setName("Add Transition");
+    return command;
+}
+
+namespace {
+
+MediaPtr touchingOn(const MediaPtr& media, TransitionEditCmd::Side side) {
+    return side == TransitionEditCmd::Left ? Track::getTouchingMediaToLeftOfMedia(media)
+                                           : Track::getTouchingMediaToRightOfMedia(media);
+}
+
+TransitionPtr slotOf(const Media& media, TransitionEditCmd::Side side) {
+    return side == TransitionEditCmd::Left ? media.leftTransition() : media.rightTransition();
+}
+
+} // namespace
+
+bool AddTransitionCmd::fits(const Track& track, const MediaPtr& media, const TransitionPtr& transition,
+                            Side side) {
+    ScopedReadLock lock(track.projectLock());
+    if (!media || !transition || !track.hasMedia(media) || transition->leftMedia() ||
+        transition->rightMedia())
+        return false;
+    if (slotOf(*media, side) || !roomFor(*media, transition, TransitionPtr())) return false;
+    const MediaPtr neighbour = touchingOn(media, side);
+    if (!neighbour) return true;
+    const Side facing = side == Left ? Right : Left;
+    return !slotOf(*neighbour, facing) && roomFor(*neighbour, transition, TransitionPtr());
+}
+
+bool AddTransitionCmd::execute(CommandHandler*) {
+    if (!track_ || !fits(*track_, media_, transition_, side_)) return false;
+    const MediaPtr neighbour = touchingOn(media_, side_);
+    std::vector<MediaPtr> clips{media_};
+    if (neighbour) clips.push_back(neighbour);
+    saveSlots(clips);
+    if (side_ == Left) {
+        media_->setLeftTransition(transition_);
+        if (neighbour) neighbour->setRightTransition(transition_);
+    } else {
+        media_->setRightTransition(transition_);
+        if (neighbour) neighbour->setLeftTransition(transition_);
+    }
+    return true;
+}
+
+boost::shared_ptr<AddTransitionToMediasCmd>
+AddTransitionToMediasCmd::create(const TrackPtr& track, const std::vector<MediaPtr>& medias,
+                                 const TransitionPtr& transition) {
+    if (!track || !transition) throw VelaMediaLibException("a transition and a track are needed");
+    const boost::shared_ptr<AddTransitionToMediasCmd> command(
+        new AddTransitionToMediasCmd(track, medias, transition));
+    command->setName("Add Transitions");
+    return command;
+}
+
+bool AddTransitionToMediasCmd::execute(CommandHandler* handler) {
+    return MultiCommand::execute(handler) && numUndoCommands() > 0;
+}
+
+// Each edge is looked at after the ones before took theirs, so two touching
+// clips of the list share one copy.
+void AddTransitionToMediasCmd::executeCommands(const CommandHandler*) {
+    for (const MediaPtr& media : medias_)
+        for (const TransitionEditCmd::Side side : {TransitionEditCmd::Left, TransitionEditCmd::Right}) {
+            const TransitionPtr copy = transition_->clone();
+            if (!AddTransitionCmd::fits(*track_, media, copy, side)) continue;
+            if (!executeRequired(AddTransitionCmd::create(track_, media, copy, side))) return;
+        }
+}
+
+} // namespace VelaMediaLib

@@ -1,0 +1,107 @@
+#include <VelaMediaLib/commands/edits/SplitCmd.h>
+
+#include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/model/media/MediaImpl.h>
+
+#include <algorithm>
+
+namespace VelaMediaLib {
+
+boost::shared_ptr<SplitCmd> SplitCmd::create(const TrackPtr& track, VelaTime time) {
+    if (!track) throw VelaMediaLibException("no track to split on");
+    const boost::shared_ptr<SplitCmd> command(new SplitCmd(track, time));
+    command->setName("Split");
+    return command;
+}
+
+MediaPtr SplitCmd::mediaToSplit(const Track& track, VelaTime time) {
+    const Track::Pair found = track.mediaAtTime(time);
+    const MediaPtr& media = found.second ? found.second : found.first;
+    if (!media || media->startTime() >= time) return MediaPtr();
+    return media;
+}
+
+namespace {
+
+// Keyframes are in the clip's own ticks, counted from its start.
+void shiftKeyframes(Media& copy, VelaTime offset) {
+    for (const std::string& name : copy.parameterNames())
+        if (copy.hasMadeParameter(name))
+            copy.parameter(name)->moveKeyframes(RationalTime(-offset),
+                                                [](const RationalTime&) { return true; });
+}
+
+void shiftAnimations(Media& copy, VelaTime offset) {
+    MediaImpl* const impl = dynamic_cast<MediaImpl*>(&copy);
+    if (!impl) return;
+    for (auto entry : impl->animationTracks()) {
+        std::vector<AnimationTrack::Animation> animations = entry.second.animations();
+        for (AnimationTrack::Animation& animation : animations) {
+            animation.range = Range<long long>(animation.range.start() - offset, animation.range.duration());
+            animation.endTime -= offset;
+        }
+        impl->setAnimationTrack(AnimationTrack(entry.first, animations));
+    }
+}
+
+// Effects wholly before the cut go; one across it keeps what lies after.
+void cutEffects(Media& copy, VelaTime offset) {
+    Effectable::Effects kept;
+    for (const Effectable::EffectPtr& effect : copy.allEffects()) {
+        const Range<VelaTime> range = effect->timeRange();
+        const Effectable::EffectPtr moved = effect->withTimeRange(Range<VelaTime>(0, 0));
+        if (!moved) { // a kind without a place of its own covers the whole clip
+            kept.push_back(effect);
+            continue;
+        }
+        const VelaTime from = std::max<VelaTime>(range.start() - offset, 0);
+        const VelaTime to = range.end() - offset;
+        if (to > from) kept.push_back(effect->withTimeRange(Range<VelaTime>(from, to - from)));
+    }
+    copy.replaceAllEffects(kept);
+}
+
+} // namespace
+
+MediaPtr SplitCmd::rightHandCopy(const Media& media, VelaTime offset) {
+    const MediaPtr copy = media.clone();
+    copy->trimStart(offset); // off a track: the copy's own edit
+    shiftKeyframes(*copy, offset);
+    shiftAnimations(*copy, offset);
+    cutEffects(*copy, offset);
+    // A clone carries no transition; one that did would not belong at the cut.
+    if (copy->leftTransition()) copy->setLeftTransition(TransitionPtr());
+    return copy;
+}
+
+bool SplitCmd::execute(CommandHandler* handler) {
+    created_.clear();
+    if (!MultiCommand::execute(handler) || numUndoCommands() == 0) {
+        created_.clear();
+        return false;
+    }
+    return true;
+}
+
+void SplitCmd::executeCommands(const CommandHandler*) {
+    const MediaPtr media = mediaToSplit(*track_, time_);
+    if (!media) return;
+    const Range<VelaTime> range = media->trackRange();
+    const VelaTime cut = range.end() - time_;
+    const VelaTime offset = time_ - range.start();
+    const MediaPtr copy = rightHandCopy(*media, offset);
+    const TransitionPtr right = media->rightTransition();
+    // The transition goes first: a clip may not be shorter than its transitions.
+    if (right && !executeRequired(RemoveTransitionCmd::create(track_, right))) return;
+    if (!executeRequired(TrimEndCmd::create(track_, media, cut))) return;
+    if (!executeRequired(AddMediaCmd::create(track_, copy, time_))) return;
+    created_.push_back(copy);
+    if (!right || right->duration() <= 0) return;
+    const VelaTime fitted = std::min(right->duration(), copy->duration());
+    if (fitted != right->duration() && !executeRequired(TrimTransitionCmd::create(track_, right, fitted)))
+        return;
+    executeRequired(AddTransitionCmd::create(track_, copy, right, TransitionEditCmd::Right));
+}
+
+} // namespace VelaMediaLib
