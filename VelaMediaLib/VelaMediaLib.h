@@ -18,6 +18,7 @@
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/commands/edits/AddAnimationCmd.h>
+#include <VelaMediaLib/commands/edits/AddEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/AddParameterKeyFrameInterfaceCmd.h>
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ApplySerializedParameterValuesToMediaCmd.h>
@@ -26,6 +27,9 @@
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 #include <VelaMediaLib/commands/edits/CreateGroupCmd.h>
+#include <VelaMediaLib/commands/edits/EdgeModCloneCmd.h>
+#include <VelaMediaLib/commands/edits/EdgeModCmd.h>
+#include <VelaMediaLib/commands/edits/EdgeModCommandHandler.h>
 #include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/InsertTimeCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
@@ -34,9 +38,11 @@
 #include <VelaMediaLib/commands/edits/MagneticEffects.h>
 #include <VelaMediaLib/commands/edits/MergeAnimationsCmd.h>
 #include <VelaMediaLib/commands/edits/MoveAnimationCmd.h>
+#include <VelaMediaLib/commands/edits/MoveEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/MoveParameterKeyFrameCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
+#include <VelaMediaLib/commands/edits/RemoveEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveParameterKeyFrameCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
