@@ -7,6 +7,8 @@
 #include <VelaMediaLib/effects/StoredEffect.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
+#include <boost/make_shared.hpp>
+
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
 
@@ -98,6 +100,22 @@ TEST_F(SplitCommand, RightTransitionMovesToTheRightPartAndUndoRestoresIt) {
     EXPECT_EQ(fade->duration(), 50);
     ASSERT_TRUE(project->redo());
     EXPECT_EQ(document(), after);
+}
+
+TEST_F(SplitCommand, FadesStayAtTheEdgesTheyBelongTo) {
+    const MediaPtr media = place(0, 100);
+    const auto fadeIn = boost::make_shared<EdgeModification>(10, "audioFade", 0.0);
+    const auto fadeOut = boost::make_shared<EdgeModification>(15, "audioFade", 0.0);
+    media->addLeftEdgeModification(fadeIn);
+    media->addRightEdgeModification(fadeOut);
+    const auto split = SplitCmd::create(track, 50);
+    expectExactDocumentUndo(split);
+    const MediaPtr right = split->getCreatedMedias().at(0);
+    EXPECT_EQ(media->leftEdgeModifications(), EdgeModifiable::EdgeModifications{fadeIn});
+    EXPECT_TRUE(media->rightEdgeModifications().empty());
+    EXPECT_TRUE(right->leftEdgeModifications().empty());
+    ASSERT_EQ(right->rightEdgeModifications().size(), 1u);
+    EXPECT_EQ(right->rightEdgeModifications()[0]->duration(), 15);
 }
 
 TEST_F(SplitCommand, NothingToSplitIsRefused) {

@@ -1,5 +1,6 @@
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 
+#include <VelaMediaLib/commands/edits/RemoveEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
@@ -72,6 +73,8 @@ MediaPtr SplitCmd::rightHandCopy(const Media& media, VelaTime offset) {
     cutEffects(*copy, offset);
     // A clone carries no transition; one that did would not belong at the cut.
     if (copy->leftTransition()) copy->setLeftTransition(TransitionPtr());
+    // Nor do the fades in: they stay with the left part's start.
+    copy->setLeftEdgeModificationsUnnotified(EdgeModifiable::EdgeModifications());
     return copy;
 }
 
@@ -95,6 +98,9 @@ void SplitCmd::executeCommands(const CommandHandler*) {
     // The transition goes first: a clip may not be shorter than its transitions.
     if (right && !executeRequired(RemoveTransitionCmd::create(track_, right))) return;
     if (!executeRequired(TrimEndCmd::create(track_, media, cut))) return;
+    // The fades out go with the right part's end (its copies of them).
+    for (const EdgeModificationPtr& fade : media->rightEdgeModifications())
+        if (!executeRequired(RemoveRightEdgeModCmd::create(media, fade))) return;
     if (!executeRequired(AddMediaCmd::create(track_, copy, time_))) return;
     created_.push_back(copy);
     if (!right || right->duration() <= 0) return;
