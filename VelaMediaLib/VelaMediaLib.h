@@ -18,6 +18,7 @@
 #include <VelaMediaLib/base/VelaObject.h>
 #include <VelaMediaLib/base/XMLIdentified.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
@@ -26,9 +27,14 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/LockData.h>
+#include <VelaMediaLib/commands/edits/NewMixerCmd.h>
+#include <VelaMediaLib/commands/edits/NewTrackCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
+#include <VelaMediaLib/commands/edits/ScaleMediaEditRateCmd.h>
+#include <VelaMediaLib/commands/edits/ScaleMixerEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
+#include <VelaMediaLib/commands/edits/SetMediaStateCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
