@@ -23,6 +23,7 @@
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ApplySerializedParameterValuesToMediaCmd.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
@@ -40,6 +41,8 @@
 #include <VelaMediaLib/commands/edits/MoveAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/MoveEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/MoveParameterKeyFrameCmd.h>
+#include <VelaMediaLib/commands/edits/NewMixerCmd.h>
+#include <VelaMediaLib/commands/edits/NewTrackCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveEdgeModCmd.h>
@@ -47,9 +50,12 @@
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
+#include <VelaMediaLib/commands/edits/ScaleMediaEditRateCmd.h>
+#include <VelaMediaLib/commands/edits/ScaleMixerEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/SetAnimationInterpolaterCmd.h>
 #include <VelaMediaLib/commands/edits/SetDoubleParameterValueInRangeCmd.h>
+#include <VelaMediaLib/commands/edits/SetMediaStateCmd.h>
 #include <VelaMediaLib/commands/edits/SplitAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
