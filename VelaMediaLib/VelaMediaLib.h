@@ -20,9 +20,12 @@
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
+#include <VelaMediaLib/commands/edits/CloneAddMediasCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 #include <VelaMediaLib/commands/edits/CreateGroupCmd.h>
+#include <VelaMediaLib/commands/edits/DisplaceMediaOnUnifiedMixerCmd.h>
+#include <VelaMediaLib/commands/edits/DuplicateMediaCmd.h>
 #include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/InsertTimeCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
@@ -30,9 +33,14 @@
 #include <VelaMediaLib/commands/edits/LockData.h>
 #include <VelaMediaLib/commands/edits/MagneticEffects.h>
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
+#include <VelaMediaLib/commands/edits/RemoveLastMediaCmd.h>
+#include <VelaMediaLib/commands/edits/RemoveRangeMediaCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
+#include <VelaMediaLib/commands/edits/RepeatMediaToFillRangeCmd.h>
+#include <VelaMediaLib/commands/edits/ReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
+#include <VelaMediaLib/commands/edits/RippleReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
