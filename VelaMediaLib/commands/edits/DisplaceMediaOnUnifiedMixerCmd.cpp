@@ -14,11 +14,11 @@ DisplaceMediaOnUnifiedMixerCmd::create(const TrackPtr& track, const MediaPtr& me
     return command;
 }
 
-// A clip inside another (a group's, a unified clip's part) is not the
-// track's to place.
+// A clip inside another (a unified clip's part, a group's or a stitched
+// clip's child) is that clip's, not for dragging out.
 bool DisplaceMediaOnUnifiedMixerCmd::execute(CommandHandler* handler) {
     displaced_.clear();
-    if (media_->parent() && !boost::dynamic_pointer_cast<Track>(media_->parent())) return false;
+    if (Track::enclosingClipOf(*media_)) return false;
     if (MultiCommand::execute(handler)) return true;
     displaced_.clear();
     return false;
