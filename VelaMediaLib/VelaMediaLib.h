@@ -23,6 +23,12 @@
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 #include <VelaMediaLib/commands/edits/CreateGroupCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendEffectsCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendFrameCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendMediaAnimationsCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendMediaCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendParametersCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendTracksCmd.h>
 #include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/InsertTimeCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
@@ -36,11 +42,13 @@
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
+#include <VelaMediaLib/commands/edits/StitchingExtendFrameCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/TrimMediasToFrameCmd.h>
 #include <VelaMediaLib/commands/edits/UnGroupCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/UnstitchAllCmd.h>

@@ -18,7 +18,8 @@ std::vector<boost::shared_ptr<ParameterInterface>> KeyframeTimeCmd::parametersTo
         const boost::shared_ptr<ParameterInterface> parameter = media_->parameter(name);
         if (!parameter || parameter->numKeyFrames() < 2) continue;
         bool moves = false;
-        for (const RationalTime& time : *parameter->keyframeTimes()) {
+        const boost::shared_ptr<std::vector<RationalTime>> times = parameter->keyframeTimes();
+        for (const RationalTime& time : *times) {
             if (!extend_ && time >= RationalTime(time_) && time < from)
                 throw KeyFrameException("a keyframe lies in the time being removed", time,
                                         parameter->identifier());
