@@ -34,6 +34,12 @@
 #include <VelaMediaLib/commands/edits/EdgeModCloneCmd.h>
 #include <VelaMediaLib/commands/edits/EdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/EdgeModCommandHandler.h>
+#include <VelaMediaLib/commands/edits/ExtendEffectsCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendFrameCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendMediaAnimationsCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendMediaCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendParametersCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendTracksCmd.h>
 #include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/InsertTimeCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
@@ -67,12 +73,14 @@
 #include <VelaMediaLib/commands/edits/SplitAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
+#include <VelaMediaLib/commands/edits/StitchingExtendFrameCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimAnimationCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/TrimMediasToFrameCmd.h>
 #include <VelaMediaLib/commands/edits/UnGroupCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/commands/edits/UnstitchAllCmd.h>
