@@ -98,6 +98,8 @@
 #include <VelaMediaLib/document/CalloutReader.h>
 #include <VelaMediaLib/document/ChangedFileHandler.h>
 #include <VelaMediaLib/document/ClippingParser.h>
+#include <VelaMediaLib/document/ClippingWriter.h>
+#include <VelaMediaLib/document/CopyRangeClippingCmd.h>
 #include <VelaMediaLib/document/EdgeModReader.h>
 #include <VelaMediaLib/document/FileMediaReader.h>
 #include <VelaMediaLib/document/GroupReader.h>
@@ -108,6 +110,7 @@
 #include <VelaMediaLib/document/MissingFileHandler.h>
 #include <VelaMediaLib/document/MixerReader.h>
 #include <VelaMediaLib/document/ParserInterface.h>
+#include <VelaMediaLib/document/PasteClippingCmd.h>
 #include <VelaMediaLib/document/ProjectAssetParser.h>
 #include <VelaMediaLib/document/ProjectDocument.h>
 #include <VelaMediaLib/document/ProjectReader.h>
