@@ -32,12 +32,16 @@
 #include <VelaMediaLib/commands/edits/RemoveAudioCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
+#include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteMultipleRangesAndCreateDeletionPointCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
 #include <VelaMediaLib/commands/edits/SeparateVideoAudioCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
+#include <VelaMediaLib/commands/edits/TrackCleanupCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
@@ -151,6 +155,7 @@
 #include <VelaMediaLib/model/timeline/ClipBoard.h>
 #include <VelaMediaLib/model/timeline/ClipIndex.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
+#include <VelaMediaLib/model/timeline/DeletionPoint.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>
