@@ -62,6 +62,9 @@
 #include <VelaMediaLib/commands/edits/RepeatMediaToFillRangeCmd.h>
 #include <VelaMediaLib/commands/edits/ReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/ResizeGroupCmd.h>
+#include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteMultipleRangesAndCreateDeletionPointCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
 #include <VelaMediaLib/commands/edits/RippleReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/ScaleMediaEditRateCmd.h>
@@ -76,6 +79,7 @@
 #include <VelaMediaLib/commands/edits/StitchingExtendFrameCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
+#include <VelaMediaLib/commands/edits/TrackCleanupCmd.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizer.h>
 #include <VelaMediaLib/commands/edits/TrackMagnetizerAutoAttacher.h>
 #include <VelaMediaLib/commands/edits/TrimAnimationCmd.h>
@@ -194,6 +198,7 @@
 #include <VelaMediaLib/model/timeline/ClipBoard.h>
 #include <VelaMediaLib/model/timeline/ClipIndex.h>
 #include <VelaMediaLib/model/timeline/CollisionException.h>
+#include <VelaMediaLib/model/timeline/DeletionPoint.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 #include <VelaMediaLib/model/timeline/Mixer.h>

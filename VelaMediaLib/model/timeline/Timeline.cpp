@@ -33,7 +33,8 @@ TransformMatrix view(const Point3d& x, const Point3d& y, const Point3d& z, const
 } // namespace
 
 Timeline::Timeline(const boost::weak_ptr<const ThreadSafe>& token)
-    : SubProject(token), ObjectSubject(token), Parametric(token), Attributable(token) {}
+    : SubProject(token), ObjectSubject(token), Parametric(token), Attributable(token),
+      deletionPoints_(new DeletionPointList(token)) {}
 
 Timeline::~Timeline() {
     for (const auto& entry : mixers_) entry.second->detachAddObserver(this);
