@@ -206,6 +206,24 @@ std::vector<MediaPtr> Timeline::instancesOf(const boost::shared_ptr<const Source
     return Sourceable::clipsOf(allMedias(), source);
 }
 
+namespace {
+
+void collectHeld(const DeletionPoint& point, std::vector<MediaPtr>& held) {
+    for (const DeletionPoint::RemovedClip& clip : point.clips()) {
+        Track::visitWithin(clip.media, [&](const MediaPtr& inner, bool&) { held.push_back(inner); });
+    }
+    for (const DeletionPoint::InnerPoint& inner : point.innerPoints()) collectHeld(*inner.point, held);
+}
+
+} // namespace
+
+bool Timeline::hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
+    if (!instancesOf(source).empty()) return true;
+    std::vector<MediaPtr> held;
+    for (const DeletionPointPtr& point : deletionPoints_->allPoints()) collectHeld(*point, held);
+    return !Sourceable::clipsOf(held, source).empty();
+}
+
 size_t Timeline::swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,
                                              const boost::shared_ptr<const Source>& to) {
     const std::vector<MediaPtr> clips = instancesOf(from);

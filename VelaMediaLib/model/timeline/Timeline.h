@@ -86,9 +86,9 @@ public:
     std::vector<boost::shared_ptr<const Source>> allSources() const;
     /// The clips that play the source.
     std::vector<MediaPtr> instancesOf(const boost::shared_ptr<const Source>& source) const;
-    bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
-        return !instancesOf(source).empty();
-    }
+    /// Whether a clip plays the source: on the timeline, or held by a
+    /// deletion point to be put back (so the source must stay loaded).
+    bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const;
     /// Gives every clip that plays `from` the source `to`; returns how many
     /// changed. Throws, changing no clip, when one cannot play `to` (see
     /// Sourceable::checkSource).
