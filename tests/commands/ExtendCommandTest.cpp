@@ -27,14 +27,6 @@ using namespace VelaMediaLib::testing;
 
 namespace {
 
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
-
 std::vector<Range<VelaTime>> effectRanges(const MediaPtr& media) {
     std::vector<Range<VelaTime>> ranges;
     for (const auto& each : media->allEffects()) ranges.push_back(each->timeRange());
@@ -132,8 +124,8 @@ TEST_F(ExtendCommand, AnimationsGoWithTheirEndKeyframe) {
 
 TEST_F(ExtendCommand, EffectsMoveGrowOrStayByWhereTheyMeetTheTime) {
     const MediaPtr media = place(0, 40);
-    for (const auto& each : {effect("Blur", 0, 10), effect("Glow", 5, 15), effect("Tint", 10, 5),
-                             effect("DeviceFrameEffect", 0, 10)})
+    for (const auto& each : {storedEffect("Blur", 0, 10), storedEffect("Glow", 5, 15),
+                             storedEffect("Tint", 10, 5), storedEffect("DeviceFrameEffect", 0, 10)})
         media->addEffect(each);
     expectRoundTrip(ExtendEffectsCmd::create(media, 10, 5), ReduceEffectsCmd::create(media, 10, 5));
 
@@ -150,8 +142,8 @@ TEST_F(ExtendCommand, EffectsMoveGrowOrStayByWhereTheyMeetTheTime) {
 TEST_F(ExtendCommand, AClipGrowsAtBothEndsWithItsContentInPlace) {
     const MediaPtr media = shot(50, 100, 20);
     keyframes(media, {0, 10});
-    media->addEffect(effect("Blur", 2, 6));
-    media->addEffect(effect("DeviceFrameEffect", 0, 20));
+    media->addEffect(storedEffect("Blur", 2, 6));
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 20));
     expectRoundTrip(ExtendMediaCmd::create(media, 10, 5), ReduceMediaCmd::create(media, 10, 5));
 
     ASSERT_TRUE(project->execute(ExtendMediaCmd::create(media, 10, 5)));
@@ -220,7 +212,7 @@ TEST_F(ExtendCommand, TracksExtendAStillAndSplitAClipAcrossTheTime) {
 TEST_F(ExtendCommand, ReducingTracksGivesBackWhatExtendingOpened) {
     const MediaPtr still = color(0, 30);
     keyframes(still, {0, 25});
-    still->addEffect(effect("Glow", 10, 15));
+    still->addEffect(storedEffect("Glow", 10, 15));
     place(40, 10);
     const auto extend = ExtendTracksCmd::create(20, 10);
     const auto reduce = ReduceTracksCmd::create(20, 10);

@@ -14,14 +14,6 @@ using namespace VelaMediaLib::testing;
 
 namespace {
 
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
-
 class SplitCommand : public EditTest {};
 
 TEST_F(SplitCommand, PartsAddUpAndPlayOnWithoutAJump) {
@@ -56,9 +48,9 @@ TEST_F(SplitCommand, AnimationsShiftAndEffectsAreCutForTheRightPart) {
     animation.endTime = 70;
     animation.duration = 50;
     impl->setAnimationTrack(AnimationTrack("opacity", {animation}));
-    media->addEffect(effect("Blur", 0, 30));               // wholly before the cut: not on the right part
-    media->addEffect(effect("Glow", 30, 40));              // across the cut: cut
-    media->addEffect(effect("DeviceFrameEffect", 0, 100)); // follows the end edge of the left part
+    media->addEffect(storedEffect("Blur", 0, 30));  // wholly before the cut: not on the right part
+    media->addEffect(storedEffect("Glow", 30, 40)); // across the cut: cut
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 100)); // follows the end edge of the left part
     const auto split = SplitCmd::create(track, 40);
     ASSERT_TRUE(project->execute(split));
     const auto right = boost::dynamic_pointer_cast<MediaImpl>(split->getCreatedMedias()[0]);

@@ -11,18 +11,6 @@ namespace {
 
 class TrackCommand : public EditTest {
 protected:
-    std::string document() const { return projectToJSONString(*project, true); }
-    // Undo gives back the document before, redo the one after.
-    void expectExactDocumentUndo(const CommandPtr& command) {
-        const std::string before = document();
-        ASSERT_TRUE(project->execute(command)) << command->name();
-        const std::string after = document();
-        EXPECT_NE(after, before) << command->name();
-        ASSERT_TRUE(project->undo());
-        EXPECT_EQ(document(), before) << command->name();
-        ASSERT_TRUE(project->redo());
-        EXPECT_EQ(document(), after) << command->name();
-    }
     template <typename Exception>
     void expectThrowsUnchanged(const std::function<CommandPtr()>& make) {
         const std::string before = document();

@@ -12,21 +12,13 @@ using namespace VelaMediaLib::testing;
 
 namespace {
 
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
-
 class TrimCommand : public EditTest {};
 
 TEST_F(TrimCommand, MagnetizedEffectsFollowTheTrimmedEdge) {
     const MediaPtr media = place(10, 100);
-    media->addEffect(effect("CursorPath", 0, 100));        // follows both edges
-    media->addEffect(effect("DeviceFrameEffect", 20, 80)); // reaches the end only
-    media->addEffect(effect("Blur", 0, 100));              // not magnetized
+    media->addEffect(storedEffect("CursorPath", 0, 100));        // follows both edges
+    media->addEffect(storedEffect("DeviceFrameEffect", 20, 80)); // reaches the end only
+    media->addEffect(storedEffect("Blur", 0, 100));              // not magnetized
     const EdgeEffects found = magneticEffectsForMedia(media);
     ASSERT_EQ(found.size(), 2u);
     EXPECT_EQ(found[1].range, Range<VelaTime>(30, 80)); // in project ticks
@@ -43,7 +35,7 @@ TEST_F(TrimCommand, MagnetizedEffectsFollowTheTrimmedEdge) {
 
 TEST_F(TrimCommand, AnEffectTheEdgeWouldLeaveWithoutATickKeepsItsRange) {
     const MediaPtr media = place(0, 100);
-    media->addEffect(effect("CursorPath", 90, 10));
+    media->addEffect(storedEffect("CursorPath", 90, 10));
     ASSERT_TRUE(project->execute(TrimEndCmd::create(track, media, 20)));
     EXPECT_EQ(media->allEffects()[0]->timeRange(), Range<VelaTime>(90, 10));
     ASSERT_TRUE(project->execute(TrimEndCmd::create(track, media, -20, EdgeEffects())));
@@ -52,7 +44,7 @@ TEST_F(TrimCommand, AnEffectTheEdgeWouldLeaveWithoutATickKeepsItsRange) {
 
 TEST_F(TrimCommand, TwoMovesOrTrimsOfOneClipFoldIntoOneUndoStep) {
     const MediaPtr media = place(0, 100);
-    media->addEffect(effect("CursorPath", 0, 100));
+    media->addEffect(storedEffect("CursorPath", 0, 100));
     const std::string start = document();
     const size_t before = steps();
     ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 5)));
