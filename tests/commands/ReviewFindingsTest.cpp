@@ -139,6 +139,19 @@ TEST_F(ReviewFindings, ValuesOnAFreshClipUndoTwice) {
     expectTwiceExact(ApplySerializedParameterValuesToMediaCmd::create(media, "{\"opacity\": 0.5}"));
 }
 
+// A fade is one clip's: adding another clip's fade would share one object,
+// so that moving it on one clip would change the other's document too.
+TEST_F(ReviewFindings, AnotherClipsFadeIsNotAdded) {
+    const MediaPtr a = place(0, 60), b = place(100, 60);
+    const EdgeModificationPtr shared = fade(10);
+    ASSERT_TRUE(project->execute(AddRightEdgeModCmd::create(a, shared)));
+    const std::string before = document();
+    const size_t stepsBefore = steps();
+    EXPECT_THROW(project->execute(AddRightEdgeModCmd::create(b, shared)), AddRemoveException);
+    EXPECT_EQ(document(), before);
+    EXPECT_EQ(steps(), stepsBefore);
+}
+
 // A trim of a transition to the length it has changes nothing: no step.
 TEST_F(ReviewFindings, TransitionTrimToItsOwnLengthIsRefused) {
     const MediaPtr a = place(0, 60);
