@@ -208,4 +208,28 @@ TEST_F(ReviewFindings, ExtendAndReduceOfARichClipUndoTwice) {
     expectReadsBack();
 }
 
+TEST_F(ReviewFindings, CombinedStartTrimsAndMovesUndoTwice) {
+    const MediaPtr media = slice(0, 100);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, media, 0)));
+    media->addEffect(effect("DeviceFrameEffect", 0, 100));
+    opacityOf(media)->addKeyFrame(RationalTime(50), 0.5, RationalTime(10));
+    const std::string before = document();
+    ASSERT_TRUE(project->execute(TrimStartCmd::create(track, media, 10)));
+    ASSERT_TRUE(project->execute(TrimStartCmd::create(track, media, 5)));
+    project->combineLastCommands();
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 7)));
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 3)));
+    project->combineLastCommands();
+    project->combineLastCommands();
+    ASSERT_EQ(steps(), 2u); // the placing, and the gesture
+    const std::string after = document();
+    for (int round = 0; round < 2; ++round) {
+        ASSERT_TRUE(project->undo());
+        EXPECT_EQ(document(), before);
+        ASSERT_TRUE(project->redo());
+        EXPECT_EQ(document(), after);
+    }
+    expectReadsBack();
+}
+
 } // namespace
