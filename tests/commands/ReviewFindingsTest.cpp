@@ -232,4 +232,15 @@ TEST_F(ReviewFindings, CombinedStartTrimsAndMovesUndoTwice) {
     expectReadsBack();
 }
 
+// A copied part cut at the range's end keeps its edge-following effects
+// within it, as the left part of a split does.
+TEST_F(ReviewFindings, ACopiedPartKeepsItsFrameWithinIt) {
+    const MediaPtr media = place(0, 90);
+    media->addEffect(effect("DeviceFrameEffect", 0, 90));
+    const MixerPtr clipping = CopyRangeClippingCmd::clippingOf({track}, Range<VelaTime>(30, 40));
+    const MediaPtr copy = clipping->tracks().front()->medias().front();
+    ASSERT_EQ(copy->duration(), 40);
+    EXPECT_EQ(copy->allEffects().front()->timeRange(), Range<VelaTime>(0, 40));
+}
+
 } // namespace
