@@ -1,6 +1,7 @@
 #include <VelaMediaLib/document/CopyRangeClippingCmd.h>
 
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
+#include <VelaMediaLib/commands/edits/MagneticEffects.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/detail/SourceCommandSupport.h>
 #include <VelaMediaLib/document/ClippingWriter.h>
@@ -21,7 +22,15 @@ MediaPtr cutCopy(const Media& media, const Range<VelaTime>& range) {
     const MediaPtr copy = at.start() < range.start()
                               ? SplitCmd::rightHandCopy(media, range.start() - at.start())
                               : media.clone();
-    if (copy->endTime() > range.end()) copy->trimEnd(copy->endTime() - range.end());
+    if (copy->endTime() > range.end()) {
+        // As a split's left part: the effects that follow the end edge end with the copy.
+        const Range<VelaTime> before = copy->trackRange();
+        const EdgeEffects followers = magneticEffectsForMedia(copy);
+        copy->trimEnd(copy->endTime() - range.end());
+        if (const auto moved =
+                effectsFollowingEdge(copy->allEffects(), followers, before, copy->trackRange(), false))
+            copy->replaceAllEffects(*moved);
+    }
     return copy;
 }
 

@@ -1,5 +1,9 @@
 #include <VelaMediaLib/commands/edits/AddEdgeModCmd.h>
 
+#include <VelaMediaLib/commands/edits/CommandHandler.h>
+#include <VelaMediaLib/model/project/Project.h>
+#include <VelaMediaLib/model/timeline/Timeline.h>
+
 #include <algorithm>
 
 namespace VelaMediaLib {
@@ -12,11 +16,24 @@ bool onClip(const Media& media, const EdgeModificationPtr& modification) {
     return false;
 }
 
+// Two clips holding one object would share it: a move or a rate change of
+// one would change the other too (and scale it twice).
+bool onAnotherClip(CommandHandler* handler, const MediaPtr& media, const EdgeModificationPtr& modification) {
+    const boost::shared_ptr<Project> project = handler ? handler->project() : boost::shared_ptr<Project>();
+    const TimelinePtr timeline = project ? project->timeline() : TimelinePtr();
+    if (!timeline) return false;
+    for (const MediaPtr& clip : timeline->allMedias())
+        if (clip != media && onClip(*clip, modification)) return true;
+    return false;
+}
+
 } // namespace
 
 bool AddSideEdgeModCmd::execute(CommandHandler* handler) {
     if (onClip(*media_, modification_))
         throw AddRemoveException("the edge modification is already on the clip");
+    if (onAnotherClip(handler, media_, modification_))
+        throw AddRemoveException("the edge modification is on another clip");
     checkFits(modification_->duration());
     const size_t end = EdgeModCommandHandler::edgeModifications(*media_, edge_).size();
     return edgeHandler(handler).insertEdgeModification(media_, edge_, end, modification_);

@@ -9,9 +9,10 @@ namespace VelaMediaLib {
 /// Appends a modification to one edge of a clip; undone by taking it off
 /// again, which leaves the edge's list as it was. A modification belongs to
 /// one clip: one already on the clip (on either edge) throws
-/// AddRemoveException "the edge modification is already on the clip"; one
-/// longer than the clip or of negative duration throws ValueException<VelaTime>
-/// (EdgeModCmd::checkFits). Another of the same group may stand beside it
+/// AddRemoveException "the edge modification is already on the clip", one on
+/// another clip of the project's timeline "the edge modification is on
+/// another clip" (they would share one object); one longer than the clip or of negative duration throws
+/// ValueException<VelaTime> (EdgeModCmd::checkFits). Another of the same group may stand beside it
 /// (AddEdgeModCmd and EdgeModCloneCmd decide which belong together). To put
 /// the same change on another clip, clone it (EdgeModCloneCmd).
 class VELAMEDIALIB_API AddSideEdgeModCmd : public EdgeModCmd {
