@@ -1,8 +1,6 @@
 #include <VelaMediaLib/commands/edits/ExtendMediaCmd.h>
 
 #include <VelaMediaLib/commands/edits/ExtendEffectsCmd.h>
-#include <VelaMediaLib/commands/edits/ExtendMediaAnimationsCmd.h>
-#include <VelaMediaLib/commands/edits/ExtendParametersCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendTracksCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
@@ -70,18 +68,16 @@ boost::shared_ptr<ExtendMediaCmd> ExtendMediaCmd::create(const MediaPtr& media, 
     return command;
 }
 
-// Trims pass no effects to follow the edges: the content's shift below fits
-// every effect, magnetized ones included, in one step.
+// A start trim keeps the content (keyframes, animations, effects) in place
+// and its magnetized effects grow or shrink with the edge; the end side
+// fits the effects in one step.
 void ExtendMediaCmd::executeCommands(const CommandHandler*) {
     const TrackPtr track = trackOfMedia();
     const Range<VelaTime> range = media_->trackRange();
     if (before_ > 0) {
         if (ripple_ && !otherTracks(range.start(), before_)) return;
         if (ripple_ && !executeRequired(RippleMoveCmd::create(track, media_, before_))) return;
-        if (!executeRequired(TrimStartCmd::create(track, media_, -before_, EdgeEffects()))) return;
-        execute(ExtendParametersCmd::create(media_, KeyframeTimeCmd::earliestTime(), before_));
-        execute(ExtendMediaAnimationsCmd::create(media_, KeyframeTimeCmd::earliestTime(), before_));
-        execute(ExtendEffectsCmd::create(media_, 0, before_));
+        if (!executeRequired(TrimStartCmd::create(track, media_, -before_))) return;
     }
     if (after_ == 0) return;
     const VelaTime duration = media_->duration();
@@ -104,10 +100,7 @@ void ReduceMediaCmd::executeCommands(const CommandHandler*) {
     const TrackPtr track = trackOfMedia();
     const Range<VelaTime> range = media_->trackRange();
     if (before_ > 0) {
-        execute(ReduceParametersCmd::create(media_, KeyframeTimeCmd::earliestTime(), before_));
-        execute(ReduceMediaAnimationsCmd::create(media_, KeyframeTimeCmd::earliestTime(), before_));
-        execute(ReduceEffectsCmd::create(media_, 0, before_));
-        if (!executeRequired(TrimStartCmd::create(track, media_, before_, EdgeEffects()))) return;
+        if (!executeRequired(TrimStartCmd::create(track, media_, before_))) return;
         if (ripple_ && !executeRequired(RippleMoveCmd::create(track, media_, -before_))) return;
         if (ripple_ && !otherTracks(range.start(), -before_)) return;
     }
