@@ -30,6 +30,8 @@ MediaPtr cutCopy(const Media& media, const Range<VelaTime>& range) {
         if (const auto moved =
                 effectsFollowingEdge(copy->allEffects(), followers, before, copy->trackRange(), false))
             copy->replaceAllEffects(*moved);
+        // The fades out stay with the part after the range, as a cut's split leaves them.
+        copy->setRightEdgeModificationsUnnotified(EdgeModifiable::EdgeModifications());
     }
     return copy;
 }

@@ -30,14 +30,6 @@ using namespace VelaMediaLib::testing;
 
 namespace {
 
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
-
 EdgeModificationPtr fade(VelaTime duration) {
     return boost::make_shared<EdgeModification>(duration, "fade", 0);
 }
@@ -76,8 +68,8 @@ protected:
         animation.duration = 20;
         boost::dynamic_pointer_cast<MediaImpl>(media)->setAnimationTrack(
             AnimationTrack("opacity", {animation}));
-        media->addEffect(effect("Glow", 20, 50));
-        media->addEffect(effect("DeviceFrameEffect", 0, 90));
+        media->addEffect(storedEffect("Glow", 20, 50));
+        media->addEffect(storedEffect("DeviceFrameEffect", 0, 90));
         media->addLeftEdgeModification(fade(15));
         media->addRightEdgeModification(fade(12));
         EXPECT_TRUE(
@@ -201,7 +193,7 @@ TEST_F(ReviewFindings, ExtendAndReduceOfARichClipUndoTwice) {
     const MediaPtr media = slice(20, 200);
     ASSERT_TRUE(project->execute(AddMediaCmd::create(track, media, 50)));
     opacityOf(media)->addKeyFrame(RationalTime(10), 0.5, RationalTime(0));
-    media->addEffect(effect("DeviceFrameEffect", 0, 200));
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 200));
     media->addRightEdgeModification(fade(12));
     expectTwiceExact(ReduceMediaCmd::create(media, 10, 15));
     expectTwiceExact(ExtendMediaCmd::create(media, 10, 15));
@@ -211,7 +203,7 @@ TEST_F(ReviewFindings, ExtendAndReduceOfARichClipUndoTwice) {
 TEST_F(ReviewFindings, CombinedStartTrimsAndMovesUndoTwice) {
     const MediaPtr media = slice(0, 100);
     ASSERT_TRUE(project->execute(AddMediaCmd::create(track, media, 0)));
-    media->addEffect(effect("DeviceFrameEffect", 0, 100));
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 100));
     opacityOf(media)->addKeyFrame(RationalTime(50), 0.5, RationalTime(10));
     const std::string before = document();
     ASSERT_TRUE(project->execute(TrimStartCmd::create(track, media, 10)));
@@ -236,11 +228,21 @@ TEST_F(ReviewFindings, CombinedStartTrimsAndMovesUndoTwice) {
 // within it, as the left part of a split does.
 TEST_F(ReviewFindings, ACopiedPartKeepsItsFrameWithinIt) {
     const MediaPtr media = place(0, 90);
-    media->addEffect(effect("DeviceFrameEffect", 0, 90));
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 90));
     const MixerPtr clipping = CopyRangeClippingCmd::clippingOf({track}, Range<VelaTime>(30, 40));
     const MediaPtr copy = clipping->tracks().front()->medias().front();
     ASSERT_EQ(copy->duration(), 40);
     EXPECT_EQ(copy->allEffects().front()->timeRange(), Range<VelaTime>(0, 40));
+}
+
+TEST_F(ReviewFindings, ACopiedPartCutAtTheRangesEndLeavesItsFadeOutBehind) {
+    const MediaPtr media = place(0, 90);
+    media->addLeftEdgeModification(boost::make_shared<EdgeModification>(5, "audioFade", 0.0));
+    media->addRightEdgeModification(boost::make_shared<EdgeModification>(10, "audioFade", 0.0));
+    const MixerPtr clipping = CopyRangeClippingCmd::clippingOf({track}, Range<VelaTime>(0, 40));
+    const MediaPtr copy = clipping->tracks().front()->medias().front();
+    EXPECT_EQ(copy->leftEdgeModifications().size(), 1u); // its start is the clip's
+    EXPECT_TRUE(copy->rightEdgeModifications().empty()); // a cut there leaves it outside
 }
 
 } // namespace
