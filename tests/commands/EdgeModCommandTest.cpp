@@ -170,6 +170,14 @@ TEST_F(EdgeModCommandTest, TwoMovesOfOneModificationCombineIntoOneStep) {
     project->combineLastCommands();
     ASSERT_TRUE(project->undo());
     EXPECT_EQ(document(), after);
+
+    // Moves through another handler are not one move: they stay a group of two.
+    const auto elsewhere = boost::make_shared<EdgeModCommandHandler>();
+    ASSERT_TRUE(project->execute(MoveLeftEdgeModCmd::create(a, in, 2)));
+    ASSERT_TRUE(project->execute(MoveLeftEdgeModCmd::create(a, in, 2, elsewhere)));
+    project->combineLastCommands();
+    EXPECT_FALSE(
+        boost::dynamic_pointer_cast<MoveLeftEdgeModCmd>(project->commandHistory()->undoStack().back()));
 }
 
 // The copies are objects of their own: a move of one leaves the other alone.

@@ -62,6 +62,12 @@ TEST_F(EditUndo, AddsRemovesAndEditsOfAClipElsewhere) {
     expectExactUndo(RemoveMediaCmd::create(track, loose));
     EXPECT_FALSE(track->hasMedia(loose));
     expectRefused(RemoveMediaCmd::create(track, MediaPtr())); // no clip to take off
+    // A removal whose place was taken meanwhile cannot be undone: it says so and stays done.
+    const MediaPtr taken = place(70, 10);
+    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(track, taken)));
+    track->addMedia(clip(10), 72);
+    EXPECT_FALSE(project->undo());
+    EXPECT_FALSE(track->hasMedia(taken));
 }
 
 TEST_F(EditUndo, ClosingGapsMovesInAnOrderWithoutCollisions) {

@@ -56,6 +56,8 @@ TEST_F(KeyFrameCommand, BadArgumentsThrowAndRefusalsChangeNothing) {
         new KeyFrame<std::string>(boost::weak_ptr<const ThreadSafe>(), RationalTime(5), "five"));
     EXPECT_THROW(AddParameterKeyFrameInterfaceCmd::create(opacity, text), TypeException);
     EXPECT_THROW(AddParameterKeyFrameInterfaceCmd::create(opacity, nullptr), VelaMediaLibException);
+    EXPECT_THROW(AddParameterKeyFrameInterfaceCmd::create(nullptr, keyframe(5, 0.1, 0)),
+                 VelaMediaLibException);
     EXPECT_THROW(MoveParameterKeyFrameCmd::create(nullptr, RationalTime(0), RationalTime(1)),
                  VelaMediaLibException);
     expectRefusedDocument(
