@@ -112,6 +112,8 @@ TEST_F(TrimCommand, TwoStretchesFoldAndUndoExactly) {
     const MediaPtr media = slice(0, 30);
     ASSERT_TRUE(project->execute(AddMediaCmd::create(track, media, 0)));
     const std::string before = document();
+    EXPECT_THROW(StretchCmd::create(media, SafeRational(0)), ValueException<double>);
+    EXPECT_THROW(StretchCmd::create(media, 0.0), ValueException<double>);
     ASSERT_TRUE(project->execute(StretchCmd::create(media, SafeRational(2))));
     ASSERT_TRUE(project->execute(StretchCmd::create(media, 0.5)));
     project->commandHistory()->combineLastCommands();
