@@ -113,6 +113,8 @@ TEST(ProjectReaderFailures, MalformedDocumentsNameWhatWasWrong) {
               "Invalid project json - unknown media id: 99");
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, -30) + "]")),
               "Invalid project json - media 3: duration not greater than 0");
+    EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 0) + "]")),
+              "Invalid project json - media 3: duration not greater than 0");
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 0, 30) + ", " + videoClip(4, 20, 30) + "]")),
               "Invalid project json - media 4: Collision exception.");
     EXPECT_EQ(parseFailure(smallDocument("[" + videoClip(3, 4611686018427387904LL, 30) + "]")),
