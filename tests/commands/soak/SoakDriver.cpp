@@ -1,0 +1,221 @@
+// The soak's run: random edits with a check after each, random undo and redo
+// runs in between, and undo and redo of everything at the end.
+#include "SoakDriver.h"
+
+#include <VelaMediaLib/base/VelaMediaLibException.h>
+#include <VelaMediaLib/commands/framework/CommandHistory.h>
+#include <VelaMediaLib/document/ProjectDocument.h>
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace VelaMediaLib {
+namespace soak {
+
+void EditMakerRegistry::add(const std::string& family, int weight, const EditMaker& make) {
+    if (weight < 1) throw std::invalid_argument("an edit maker needs a weight of at least 1");
+    entries_.push_back(Entry{family, weight, make});
+    total_ += weight;
+}
+
+const EditMakerRegistry::Entry& EditMakerRegistry::pick(Random& random) const {
+    if (entries_.empty()) throw std::logic_error("no edit makers registered");
+    long long left = between(random, 1, total_);
+    for (const Entry& entry : entries_)
+        if ((left -= entry.weight) <= 0) return entry;
+    return entries_.back();
+}
+
+namespace {
+
+// A document is remembered by its hash for every depth of the undo stack
+// whose state the run saw; 0 where it did not (before a follow-up ran).
+typedef size_t Digest;
+Digest digestOf(const std::string& document) {
+    return std::max<Digest>(1, std::hash<std::string>()(document));
+}
+
+class Run {
+public:
+    Run(const SoakOptions& options, const EditMakerRegistry& registry)
+        : options_(options), registry_(registry), random_(options.seed), state_(buildSoakProject(random_)),
+          history_(*state_.project->commandHistory()) {}
+
+    SoakResult go() {
+        original_ = current_ = document();
+        digests_.assign(1, digestOf(original_));
+        check("the first project", true);
+        for (step_ = 0; step_ < options_.edits && !full(); ++step_) {
+            edit();
+            if (options_.undoRunEvery > 0 && chance(random_, 100 / options_.undoRunEvery) && !full())
+                undoRun();
+        }
+        result_.edits = step_;
+        if (!full()) finish();
+        return result_;
+    }
+
+private:
+    std::string document() const { return projectToJSONString(*state_.project, true); }
+    size_t depth() const { return history_.undoStack().size(); }
+    bool full() const { return result_.violations.size() >= options_.maxViolations; }
+    void violation(const std::string& what) {
+        result_.violations.push_back(Violation{options_.seed, step_, what});
+    }
+    void check(const std::string& what, bool packed) {
+        const std::string broken = invariantViolations(state_, packed);
+        if (!broken.empty()) violation(what + ": " + broken);
+    }
+
+    // Executes one command of the edit; a refusal must leave the document and history as they were.
+    bool execute(const CommandPtr& command, const std::string& what, const std::string& family) {
+        const size_t before = depth();
+        bool done = false;
+        std::string thrown;
+        try {
+            done = state_.project->execute(command);
+        } catch (const VelaMediaLibException& e) {
+            thrown = e.what();
+            ++result_.thrown;
+        } catch (const std::exception& e) {
+            violation(what + ": threw an exception foreign to the library: " + e.what());
+        }
+        const std::string after = document();
+        if (!done) {
+            ++result_.refused;
+            ++result_.refusedByFamily[family];
+            if (after != current_)
+                violation(what + (thrown.empty() ? " refused" : " threw \"" + thrown + "\"") +
+                          " but changed the document");
+            if (depth() != before) violation(what + " refused but changed the history");
+        } else {
+            if (depth() <= before) violation(what + " took effect but left no undo step");
+            recordDepth(digestOf(after));
+        }
+        current_ = after;
+        return done;
+    }
+
+    void recordDepth(Digest digest) {
+        digests_.resize(depth() + 1, 0);
+        digests_[depth()] = digest;
+    }
+
+    void edit() {
+        const EditMakerRegistry::Entry& maker = registry_.pick(random_);
+        Edit edit;
+        try {
+            edit = maker.make(random_, state_);
+        } catch (const VelaMediaLibException&) { // refused as it was made
+            ++result_.refused;
+            ++result_.refusedByFamily[maker.family];
+            ++result_.thrown;
+            if (document() != current_) violation(maker.family + ": making an edit changed the document");
+            return;
+        } catch (const std::exception& e) {
+            violation(maker.family +
+                      ": making an edit threw an exception foreign to the library: " + e.what());
+            return;
+        }
+        const std::string what = maker.family + ": " + edit.what;
+        bool done = execute(edit.command, what, maker.family);
+        if (done && edit.learn) edit.learn(state_);
+        if (done && edit.second) {
+            const size_t before = depth();
+            done = execute(edit.second, what + " (second)", maker.family);
+            if (done && edit.combine && depth() == before + 1) {
+                history_.combineLastCommands();
+                if (document() != current_) violation(what + ": folding two steps changed the document");
+                recordDepth(digestOf(current_));
+            }
+        }
+        if (done) {
+            ++result_.applied;
+            ++result_.appliedByFamily[maker.family];
+        }
+        check(what, true);
+    }
+
+    // Undoes one step and checks the state it gives back against the one seen at that depth.
+    bool undoOne(const std::string& what) {
+        const size_t from = depth();
+        if (!history_.undo()) {
+            violation(what + ": an undo refused");
+            return false;
+        }
+        ++result_.undone;
+        current_ = document();
+        if (depth() != from - 1)
+            violation(what + ": an undo did not take one step off");
+        else if (digests_[depth()] && digests_[depth()] != digestOf(current_))
+            violation(what + ": undoing step " + std::to_string(from) + " did not give back its document");
+        check(what + ", after undoing step " + std::to_string(from), false);
+        return true;
+    }
+
+    bool redoOne(const std::string& what) {
+        const size_t from = depth();
+        if (!history_.redo()) {
+            violation(what + ": a redo refused");
+            return false;
+        }
+        current_ = document();
+        if (depth() != from + 1)
+            violation(what + ": a redo did not put one step back");
+        else if (digests_[depth()] && digests_[depth()] != digestOf(current_))
+            violation(what + ": redoing step " + std::to_string(depth()) + " did not give its document");
+        check(what + ", after redoing step " + std::to_string(depth()), false);
+        return true;
+    }
+
+    // A few steps back; mostly forward again to the same document, else the
+    // next edit discards them.
+    void undoRun() {
+        const size_t steps = std::min<size_t>(depth(), size_t(between(random_, 1, 6)));
+        const std::string before = current_;
+        size_t undone = 0;
+        while (undone < steps && undoOne("an undo run")) ++undone;
+        if (chance(random_, 25)) { // dropped now, as the next edit would, so redoing everything ends here
+            history_.restoreState(CommandHistoryState{history_.undoStack(), {}});
+            digests_.resize(depth() + 1);
+            return;
+        }
+        for (size_t i = 0; i < undone && redoOne("a redo run"); ++i) {}
+        if (current_ != before) violation("undoing and redoing a run did not give back the document");
+    }
+
+    void finish() {
+        const std::string last = current_;
+        ++step_; // violations of the final undo and redo are reported past the last edit
+        while (depth() > 0 && !full())
+            if (!undoOne("undoing everything")) break;
+        if (current_ != original_) violation("undoing everything did not give back the first document");
+        try {
+            if (!history_.redoAll()) violation("redoing everything refused");
+        } catch (const std::exception& e) {
+            violation(std::string("redoing everything threw: ") + e.what());
+        }
+        current_ = document();
+        if (current_ != last) violation("redoing everything did not give back the last document");
+        check("after redoing everything", true);
+    }
+
+    const SoakOptions& options_;
+    const EditMakerRegistry& registry_;
+    Random random_;
+    SoakState state_;
+    CommandHistory& history_;
+    long long step_ = 0;
+    std::string original_, current_;
+    std::vector<Digest> digests_;
+    SoakResult result_;
+};
+
+} // namespace
+
+SoakResult runSoak(const SoakOptions& options, const EditMakerRegistry& registry) {
+    return Run(options, registry).go();
+}
+
+} // namespace soak
+} // namespace VelaMediaLib
