@@ -337,7 +337,7 @@ Edit makeUnstitch(Random& random, SoakState& state) {
 }
 
 Edit makeTrackFlag(Random& random, SoakState& state) {
-    const TrackPtr track = chance(random, 5) ? TrackPtr() : state.randomTrack(random); // none: throws
+    const TrackPtr track = chance(random, 15) ? TrackPtr() : state.randomTrack(random); // none: throws
     const auto flag = ChangeTrackFlagCmd::Flag(between(random, 0, 2));
     const bool value = chance(random, 50);
     return edit(ChangeTrackFlagCmd::create(track, flag, value), Described(state).track(track)

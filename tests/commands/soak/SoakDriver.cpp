@@ -7,6 +7,8 @@
 #include <VelaMediaLib/document/ProjectDocument.h>
 
 #include <algorithm>
+#include <regex>
+#include <set>
 #include <stdexcept>
 
 namespace VelaMediaLib {
@@ -24,6 +26,12 @@ const EditMakerRegistry::Entry& EditMakerRegistry::pick(Random& random) const {
     for (const Entry& entry : entries_)
         if ((left -= entry.weight) <= 0) return entry;
     return entries_.back();
+}
+
+std::string kindOf(const std::string& broken) {
+    if (broken.find("than its transitions") != std::string::npos) return "room";
+    if (broken.find("transition names another clip") != std::string::npos) return "link";
+    return std::string();
 }
 
 namespace {
@@ -59,12 +67,24 @@ private:
     std::string document() const { return projectToJSONString(*state_.project, true); }
     size_t depth() const { return history_.undoStack().size(); }
     bool full() const { return result_.violations.size() >= options_.maxViolations; }
-    void violation(const std::string& what) {
-        result_.violations.push_back(Violation{options_.seed, step_, what});
+    void violation(const std::string& what, const std::string& kind = std::string()) {
+        const Violation found{options_.seed, step_, what, kind};
+        (options_.tolerated.count(kind) ? result_.tolerated : result_.violations).push_back(found);
     }
+    // A broken invariant is reported as it appears, not again at every step
+    // it stays broken (told apart by what broke where, not the clip's range).
     void check(const std::string& what, bool packed) {
         const std::string broken = invariantViolations(state_, packed);
-        if (!broken.empty()) violation(what + ": " + broken);
+        std::set<std::string> found;
+        std::map<std::string, std::string> fresh; // by kind
+        for (size_t at = 0, end; (end = broken.find("; ", at)) != std::string::npos; at = end + 2) {
+            const std::string one = broken.substr(at, end - at);
+            const std::string key = std::regex_replace(one, std::regex(R"( \[-?\d+, -?\d+\)| \(\d+\))"), "");
+            if (!broken_.count(key)) fresh[kindOf(one)] += one + "; ";
+            found.insert(key);
+        }
+        for (const auto& kind : fresh) violation(what + ": " + kind.second, kind.first);
+        broken_.swap(found);
     }
 
     // Executes one command of the edit; a refusal must leave the document and history as they were.
@@ -117,7 +137,8 @@ private:
                       ": making an edit threw an exception foreign to the library: " + e.what());
             return;
         }
-        const std::string what = maker.family + ": " + edit.what;
+        const std::string what = maker.family + ":" + edit.what;
+        if (options_.trace) *options_.trace << "step " << step_ << " " << what << "\n";
         bool done = execute(edit.command, what, maker.family);
         if (done && edit.learn) edit.learn(state_);
         if (done && edit.second) {
@@ -175,7 +196,11 @@ private:
         const std::string before = current_;
         size_t undone = 0;
         while (undone < steps && undoOne("an undo run")) ++undone;
-        if (chance(random_, 25)) { // dropped now, as the next edit would, so redoing everything ends here
+        if (chance(random_, 25)) {
+            // Back to a state an edit left (not one between an edit and its
+            // magnetizer's follow-up), then the undone steps are dropped now,
+            // as the next edit would drop them, so redoing everything ends here.
+            while (depth() > 0 && !digests_[depth()] && undoOne("an undo run")) {}
             history_.restoreState(CommandHistoryState{history_.undoStack(), {}});
             digests_.resize(depth() + 1);
             return;
@@ -207,6 +232,7 @@ private:
     CommandHistory& history_;
     long long step_ = 0;
     std::string original_, current_;
+    std::set<std::string> broken_; // the invariants broken at the last check
     std::vector<Digest> digests_;
     SoakResult result_;
 };

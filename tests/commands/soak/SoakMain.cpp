@@ -8,6 +8,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <iostream>
+#include <map>
 #include <string>
 
 using namespace VelaMediaLib::soak;
@@ -15,9 +16,10 @@ using namespace VelaMediaLib::soak;
 namespace {
 
 int usage() {
-    std::cerr << "usage: vela_soak [--edits N] [--seed S] [--round R]\n"
+    std::cerr << "usage: vela_soak [--edits N] [--seed S] [--round R] [--trace]\n"
                  "  N edits in all (100000), in rounds of R edits (5000) from fresh projects;\n"
-                 "  round r runs with seed S + r (S: 1). Exits 1 when any violation was found.\n";
+                 "  round r runs with seed S + r (S: 1). With --trace, a line per edit.\n"
+                 "  Exits 1 when any violation was found.\n";
     return 2;
 }
 
@@ -31,7 +33,12 @@ bool number(const char* text, long long& out) {
 
 int main(int argc, char** argv) {
     long long edits = 100000, seed = 1, round = 5000;
+    bool trace = false;
     for (int i = 1; i < argc; ++i) {
+        if (!std::strcmp(argv[i], "--trace")) {
+            trace = true;
+            continue;
+        }
         long long* target = !std::strcmp(argv[i], "--edits")   ? &edits
                             : !std::strcmp(argv[i], "--seed")  ? &seed
                             : !std::strcmp(argv[i], "--round") ? &round
@@ -43,14 +50,19 @@ int main(int argc, char** argv) {
     EditMakerRegistry registry;
     addCoreMakers(registry);
     SoakResult total;
+    std::map<std::string, long long> byKind;
     const auto began = std::chrono::steady_clock::now();
     for (long long r = 0, left = edits; left > 0; ++r, left -= round) {
         SoakOptions options;
         options.seed = uint64_t(seed + r);
         options.edits = std::min(left, round);
+        if (trace) options.trace = &std::cout;
         const SoakResult result = runSoak(options, registry);
-        for (const Violation& v : result.violations)
-            std::cout << "violation: seed " << v.seed << " step " << v.step << ": " << v.what << "\n";
+        for (const Violation& v : result.violations) {
+            std::cout << "violation" << (v.kind.empty() ? "" : " (" + v.kind + ")") << ": seed " << v.seed
+                      << " step " << v.step << ": " << v.what << "\n";
+            ++byKind[v.kind];
+        }
         if (result.violations.size() >= options.maxViolations)
             std::cout << "seed " << options.seed << ": round given up after " << result.violations.size()
                       << " violations\n";
@@ -72,7 +84,10 @@ int main(int argc, char** argv) {
     std::cout << "edits run: " << total.edits << " (applied " << total.applied << ", refused "
               << total.refused << ", of which thrown " << total.thrown << "); steps undone " << total.undone
               << "\n"
-              << "violations found: " << total.violations.size() << "\n"
+              << "violations found: " << total.violations.size()
+              << " (clips left shorter than their transitions: " << byKind["room"]
+              << "; transition slots and links naming different clips: " << byKind["link"]
+              << "; other: " << byKind[""] << ")\n"
               << "time: " << seconds << " s\n";
     return total.violations.empty() ? 0 : 1;
 }
