@@ -294,12 +294,7 @@ Edit makeUngroup(Random& random, SoakState& state) {
         if (Group::asGroup(media.get()) && (media->parent() || chance(random, 5))) groups.push_back(media);
     const MediaPtr group = oneOf(random, groups);
     const auto command = UnGroupCmd::create(boost::dynamic_pointer_cast<Group>(group)); // none: throws
-    Edit e = edit(command, Described(state).clip(group));
-    e.learn = [](SoakState& s) {
-        for (const TrackPtr& track : s.tracks())
-            for (const MediaPtr& media : track->medias()) s.remember(media); // clips trimmed to the group
-    };
-    return e;
+    return edit(command, Described(state).clip(group));
 }
 
 Edit makeStitch(Random& random, SoakState& state) {

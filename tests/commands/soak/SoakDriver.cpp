@@ -141,6 +141,7 @@ private:
         if (options_.trace) *options_.trace << "step " << step_ << " " << what << "\n";
         bool done = execute(edit.command, what, maker.family);
         if (done && edit.learn) edit.learn(state_);
+        if (done) state_.rememberPlaced();
         if (done && edit.second) {
             const size_t before = depth();
             done = execute(edit.second, what + " (second)", maker.family);

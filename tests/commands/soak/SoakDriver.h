@@ -21,6 +21,7 @@
 #include <random>
 #include <set>
 #include <string>
+#include <unordered_set>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -46,6 +47,7 @@ struct SoakState {
     boost::shared_ptr<GenericMixer> mixer;
     std::vector<MediaPtr> clips;            // every clip seen: placed, loose, inside composites
     std::vector<TransitionPtr> transitions; // every transition made
+    std::unordered_set<const Media*> known; // the clips of the pool
 
     /// The mixer's tracks, in order.
     std::vector<TrackPtr> tracks() const;
@@ -62,6 +64,8 @@ struct SoakState {
     TransitionPtr newTransition(VelaTime duration);
     /// Adds the clip to the pool unless it is there.
     void remember(const MediaPtr& media);
+    /// Remembers every clip on the mixer's tracks and the groups' tracks.
+    void rememberPlaced();
     /// The track the clip stands on, or null.
     static TrackPtr trackOf(const MediaPtr& media);
 };
@@ -73,7 +77,8 @@ struct Edit {
     std::string what;
     CommandPtr second;
     bool combine = false;
-    /// Run after the edit took effect: to learn the clips it made.
+    /// Run after the edit took effect: to learn the clips it made that are
+    /// not on a track (every clip on one is learnt anyway).
     std::function<void(SoakState&)> learn;
 };
 

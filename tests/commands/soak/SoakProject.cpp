@@ -76,7 +76,15 @@ TrackPtr SoakState::trackOf(const MediaPtr& media) {
 }
 
 void SoakState::remember(const MediaPtr& media) {
-    if (media && std::find(clips.begin(), clips.end(), media) == clips.end()) clips.push_back(media);
+    if (media && known.insert(media.get()).second) clips.push_back(media);
+}
+
+void SoakState::rememberPlaced() {
+    std::vector<TrackPtr> all = tracks();
+    const std::vector<TrackPtr> inner = groupTracks();
+    all.insert(all.end(), inner.begin(), inner.end());
+    for (const TrackPtr& track : all)
+        for (const MediaPtr& media : track->medias()) remember(media);
 }
 
 TransitionPtr SoakState::newTransition(VelaTime duration) {
@@ -103,7 +111,7 @@ MediaPtr SoakState::newClip(Random& random) {
         clip->setAnimationTrack(AnimationTrack("opacity", {animation}));
     }
     clip->addMetaData("note", "clip " + std::to_string(clips.size()));
-    clips.push_back(clip);
+    remember(clip);
     return clip;
 }
 
@@ -159,6 +167,7 @@ SoakState buildSoakProject(Random& random) {
     state.remember(group->createdGroup());
     state.project->commandHistory()->runFollowUps();
     state.project->commandHistory()->restoreState(CommandHistoryState());
+    state.rememberPlaced();
     return state;
 }
 
