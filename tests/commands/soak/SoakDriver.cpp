@@ -4,6 +4,7 @@
 
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 #include <VelaMediaLib/commands/framework/CommandHistory.h>
+#include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/document/ProjectDocument.h>
 
 #include <algorithm>
@@ -36,6 +37,33 @@ std::string kindOf(const std::string& broken) {
 
 namespace {
 
+// Which sub-command of a composite refused to be redone, at any depth: its
+// sub-commands are redone one by one until one refuses, then undone again.
+std::string refusingPart(const CommandPtr& command, CommandHandler* handler) {
+    const auto composite = boost::dynamic_pointer_cast<MultiCommand>(command);
+    if (!composite) return std::string();
+    CommandHistory& inner = composite->commandHistory();
+    inner.setHandler(handler);
+    std::string found;
+    size_t redone = 0;
+    try {
+        while (!inner.redoStack().empty()) {
+            const CommandPtr next = inner.redoStack().back();
+            if (!inner.redo()) {
+                found = " in sub-command " + std::to_string(redone + 1) + " (" + next->name() + ")" +
+                        refusingPart(next, handler);
+                break;
+            }
+            ++redone;
+        }
+        for (; redone > 0; --redone) inner.undo();
+    } catch (const std::exception& e) {
+        found += std::string(" (looking further threw: ") + e.what() + ")";
+    }
+    inner.setHandler(nullptr);
+    return found;
+}
+
 // A document is remembered by its hash for every depth of the undo stack
 // whose state the run saw; 0 where it did not (before a follow-up ran).
 typedef size_t Digest;
@@ -66,21 +94,28 @@ public:
 private:
     std::string document() const { return projectToJSONString(*state_.project, true); }
     size_t depth() const { return history_.undoStack().size(); }
-    bool full() const { return result_.violations.size() >= options_.maxViolations; }
+    bool full() const { return faults_ >= options_.maxViolations; }
     void violation(const std::string& what, const std::string& kind = std::string()) {
         const Violation found{options_.seed, step_, what, kind};
+        faults_ += kind.empty();
         (options_.tolerated.count(kind) ? result_.tolerated : result_.violations).push_back(found);
     }
     // A broken invariant is reported as it appears, not again at every step
     // it stays broken (told apart by what broke where, not the clip's range).
+    // One of a named kind, an open fault seen again and again as clips come
+    // and go, is reported once a run for each clip.
     void check(const std::string& what, bool packed) {
+        static const std::regex range(R"( \[-?\d+, -?\d+\)| \(\d+\))"), place(R"(^(group )?track \d+ )");
         const std::string broken = invariantViolations(state_, packed);
         std::set<std::string> found;
         std::map<std::string, std::string> fresh; // by kind
         for (size_t at = 0, end; (end = broken.find("; ", at)) != std::string::npos; at = end + 2) {
-            const std::string one = broken.substr(at, end - at);
-            const std::string key = std::regex_replace(one, std::regex(R"( \[-?\d+, -?\d+\)| \(\d+\))"), "");
-            if (!broken_.count(key)) fresh[kindOf(one)] += one + "; ";
+            const std::string one = broken.substr(at, end - at), kind = kindOf(one);
+            const std::string key = std::regex_replace(one, range, "");
+            const bool seen = kind.empty()
+                                  ? broken_.count(key) > 0
+                                  : !reportedNamed_.insert(std::regex_replace(key, place, "")).second;
+            if (!seen) fresh[kind] += one + "; ";
             found.insert(key);
         }
         for (const auto& kind : fresh) violation(what + ": " + kind.second, kind.first);
@@ -142,6 +177,7 @@ private:
         bool done = execute(edit.command, what, maker.family);
         if (done && edit.learn) edit.learn(state_);
         if (done) state_.rememberPlaced();
+        if (done && options_.trace) *options_.trace << "  took effect: undo steps " << depth() << "\n";
         if (done && edit.second) {
             const size_t before = depth();
             done = execute(edit.second, what + " (second)", maker.family);
@@ -158,13 +194,25 @@ private:
         check(what, true);
     }
 
+    // An undo or redo: false, reported, when it refuses or throws.
+    template <typename Step>
+    bool replayed(Step step, const std::string& what) {
+        try {
+            if (step()) return true;
+            violation(what + " refused");
+        } catch (const std::exception& e) {
+            violation(what + " threw: " + e.what());
+        }
+        return false;
+    }
+
     // Undoes one step and checks the state it gives back against the one seen at that depth.
     bool undoOne(const std::string& what) {
         const size_t from = depth();
-        if (!history_.undo()) {
-            violation(what + ": an undo refused");
+        const std::string name = history_.undoStack().back()->name();
+        if (!replayed([&] { return history_.undo(); },
+                      what + ": undoing step " + std::to_string(from) + " (" + name + ")"))
             return false;
-        }
         ++result_.undone;
         current_ = document();
         if (depth() != from - 1)
@@ -177,8 +225,11 @@ private:
 
     bool redoOne(const std::string& what) {
         const size_t from = depth();
-        if (!history_.redo()) {
-            violation(what + ": a redo refused");
+        const std::string name = history_.redoStack().back()->name();
+        const CommandPtr next = history_.redoStack().back();
+        if (!replayed([&] { return history_.redo(); },
+                      what + ": redoing step " + std::to_string(from + 1) + " (" + name + ")")) {
+            result_.violations.back().what += refusingPart(next, history_.handler());
             return false;
         }
         current_ = document();
@@ -217,7 +268,8 @@ private:
             if (!undoOne("undoing everything")) break;
         if (current_ != original_) violation("undoing everything did not give back the first document");
         try {
-            if (!history_.redoAll()) violation("redoing everything refused");
+            while (!history_.redoStack().empty() && !full())
+                if (!redoOne("redoing everything")) break;
         } catch (const std::exception& e) {
             violation(std::string("redoing everything threw: ") + e.what());
         }
@@ -232,8 +284,10 @@ private:
     SoakState state_;
     CommandHistory& history_;
     long long step_ = 0;
+    size_t faults_ = 0; // violations of no named kind: they end the run
     std::string original_, current_;
-    std::set<std::string> broken_; // the invariants broken at the last check
+    std::set<std::string> broken_;        // the invariants broken at the last check
+    std::set<std::string> reportedNamed_; // the named kinds' findings reported in this run
     std::vector<Digest> digests_;
     SoakResult result_;
 };

@@ -139,7 +139,9 @@ struct SoakOptions {
     long long edits = 2000;
     /// A run of random undos (and mostly redos) after about one edit in this many; 0: none.
     int undoRunEvery = 40;
-    /// Give up a run after this many violations (the state may be beyond telling more).
+    /// Give up a run after this many violations of no named kind (the state
+    /// may be beyond telling more); the named kinds are each reported as they
+    /// appear and do not end it.
     size_t maxViolations = 20;
     /// Kinds of broken invariants (see kindOf) kept apart as known findings
     /// rather than counted as violations.

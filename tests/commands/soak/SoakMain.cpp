@@ -63,9 +63,8 @@ int main(int argc, char** argv) {
                       << " step " << v.step << ": " << v.what << "\n";
             ++byKind[v.kind];
         }
-        if (result.violations.size() >= options.maxViolations)
-            std::cout << "seed " << options.seed << ": round given up after " << result.violations.size()
-                      << " violations\n";
+        if (result.edits < options.edits)
+            std::cout << "seed " << options.seed << ": round given up after " << result.edits << " edits\n";
         total.edits += result.edits;
         total.applied += result.applied;
         total.refused += result.refused;
