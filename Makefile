@@ -9,7 +9,7 @@ endif
 CONFIGURE = cmake -G Ninja -S . -DCMAKE_BUILD_TYPE
 SOURCES = $(shell git ls-files --cached --others --exclude-standard '*.h' '*.cpp' 2>/dev/null)
 
-.PHONY: deps demo fuzz test bench sanitize tsan clang header-check layer-check format format-check install-check
+.PHONY: deps demo fuzz soak test bench sanitize tsan clang header-check layer-check format format-check install-check
 
 deps:
 	@scripts/install-deps
@@ -62,6 +62,16 @@ fuzz: deps
 	./build-fuzz/fuzz/vela_parse_fuzzer -max_total_time=$(FUZZ_SECONDS) -timeout=10 -rss_limit_mb=2048 \
 	  -max_len=262144 -dict=fuzz/project.dict -artifact_prefix=build-fuzz/findings/ -print_final_stats=1 \
 	  build-fuzz/corpus examples/projects
+
+# The random-edit soak's long run in a Release build: SOAK_EDITS random edits,
+# in rounds from fresh projects (round r seeded SOAK_SEED + r); prints the
+# edits run and every violation with the seed and step that reproduce it.
+SOAK_EDITS ?= 100000
+SOAK_SEED ?= 1
+soak: deps
+	$(CONFIGURE)=Release -B build-soak -DVELA_BUILD_BENCH=OFF -DVELA_BUILD_EXAMPLES=OFF -DVELA_BUILD_TOOLS=OFF $(CMAKE_FLAGS)
+	cmake --build build-soak --target vela_soak -j $(JOBS)
+	./build-soak/tests/commands/soak/vela_soak --edits $(SOAK_EDITS) --seed $(SOAK_SEED)
 
 # No library file includes a header of a layer above its own.
 layer-check:

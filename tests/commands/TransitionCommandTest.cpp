@@ -55,6 +55,21 @@ TEST_F(TransitionCommand, RemoveReplaceSplitAndTrimUndoExactly) {
     expectRefused(RemoveTransitionCmd::create(track, transition()));
 }
 
+// The copy a split makes is the same on redo, so an edit of it redoes too.
+TEST_F(TransitionCommand, ALaterEditOfASplitsCopyRedoes) {
+    const TransitionPtr fade = transition();
+    ASSERT_TRUE(project->execute(AddTransitionCmd::create(track, a, fade, TransitionEditCmd::Right)));
+    ASSERT_TRUE(project->execute(SplitTransitionCmd::create(track, fade)));
+    const TransitionPtr copy = b->leftTransition();
+    ASSERT_TRUE(project->execute(TrimTransitionCmd::create(track, copy, 5)));
+    const std::string after = document();
+    ASSERT_TRUE(project->undo() && project->undo());
+    ASSERT_TRUE(project->redo());
+    EXPECT_EQ(b->leftTransition(), copy);
+    ASSERT_TRUE(project->redo());
+    EXPECT_EQ(document(), after);
+}
+
 TEST_F(TransitionCommand, AddToMediasTakesEveryFreeEdgeOnce) {
     const TransitionPtr model = transition();
     const std::vector<MediaPtr> all{a, b, c};

@@ -37,8 +37,9 @@ private:
 };
 
 /// Parts a transition two touching clips share: the earlier clip keeps it on
-/// its right edge, the later one takes a copy on its left. Refused (false)
-/// for a transition that is not shared by two clips of the track.
+/// its right edge, the later one takes a copy on its left (the same copy on
+/// every redo, so that later edits of it redo too). Refused (false) for a
+/// transition that is not shared by two clips of the track.
 class VELAMEDIALIB_API SplitTransitionCmd : public TransitionEditCmd {
 public:
     static boost::shared_ptr<SplitTransitionCmd> create(const TrackPtr& track,
@@ -49,6 +50,7 @@ private:
     SplitTransitionCmd(const TrackPtr& track, const TransitionPtr& transition)
         : TransitionEditCmd(track), transition_(transition) {}
     TransitionPtr transition_;
+    TransitionPtr copy_; // made by the first execution
 };
 
 /// Gives a transition a new length. Refused (false) for the length it has

@@ -18,8 +18,8 @@ TrackMagnetizer::~TrackMagnetizer() {
         const std::lock_guard<std::mutex> lock(requestMutex_);
         if (const boost::shared_ptr<CloseGapsOnTrackCmd> waiting = waiting_.lock()) waiting->cancel();
     }
-    for (const boost::weak_ptr<Media>& held : clips_)
-        if (const MediaPtr media = held.lock()) media->detach(this);
+    for (const auto& held : clips_)
+        if (const MediaPtr media = held.second.lock()) media->detach(this);
     flag_->detach(this);
     if (const TrackPtr track = track_.lock()) track->detachAddObserver(this);
 }
@@ -28,7 +28,7 @@ TrackMagnetizer::~TrackMagnetizer() {
 // request, and a clip that nobody else observes is then not held back at all.
 void TrackMagnetizer::observe(const MediaPtr& media) {
     media->attachWithoutNotifyDelay(this);
-    clips_.push_back(media);
+    clips_[media.get()] = media;
 }
 
 void TrackMagnetizer::onTrackAddMedia(Track&, const MediaPtr& media) {
@@ -38,11 +38,7 @@ void TrackMagnetizer::onTrackAddMedia(Track&, const MediaPtr& media) {
 
 void TrackMagnetizer::onTrackRemoveMedia(Track&, const MediaPtr& media) {
     media->detach(this);
-    clips_.erase(std::remove_if(clips_.begin(), clips_.end(),
-                                [&](const boost::weak_ptr<Media>& held) {
-                                    return held.expired() || held.lock() == media;
-                                }),
-                 clips_.end());
+    clips_.erase(media.get());
     requestClosing();
 }
 

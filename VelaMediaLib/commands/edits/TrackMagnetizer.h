@@ -7,6 +7,7 @@
 
 #include <atomic>
 #include <mutex>
+#include <unordered_map>
 
 namespace VelaMediaLib {
 
@@ -45,8 +46,10 @@ private:
     CommandExecutor& executor_;
     boost::shared_ptr<Attribute<bool>> flag_; // the track's "magnetic" attribute
     std::atomic<bool> magnetic_;
-    std::vector<boost::weak_ptr<Media>> clips_; // changed under the write lock only
-    std::mutex requestMutex_;                   // guards waiting_
+    // The clips it observes, by address, so that a clip leaving a track of
+    // thousands is let go at once. Changed under the write lock only.
+    std::unordered_map<const Media*, boost::weak_ptr<Media>> clips_;
+    std::mutex requestMutex_; // guards waiting_
     boost::weak_ptr<CloseGapsOnTrackCmd> waiting_;
 };
 
