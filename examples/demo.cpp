@@ -199,6 +199,18 @@ ProjectPtr project() {
     project->redo();
     project->redo();
     printTracks("redo twice: B gone, gaps closed", *project, tracks);
+    const auto split = SplitCmd::create(tracks[1], 25);
+    project->execute(split);
+    split->getCreatedMedias().front()->setIdentifier("E2");
+    printTracks("split E at 25", *project, tracks);
+    const auto insert = InsertTimeCmd::create(Range<VelaTime>(5, 10));
+    insert->addTrack(tracks[1]);
+    project->execute(insert);
+    printTracks("10 ticks inserted at 5 (D split)", *project, tracks);
+    project->execute(RippleMoveCmd::create(tracks[1], clips[5], -5));
+    printTracks("F rippled 5 left", *project, tracks);
+    for (int step = 0; step < 3; ++step) project->undo();
+    printTracks("undo three times: E whole again", *project, tracks);
     return project;
 }
 

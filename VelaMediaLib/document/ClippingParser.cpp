@@ -36,6 +36,8 @@ ClippingRead readClippings(const Json::Value& root, const boost::shared_ptr<Read
             context->takeId(id);
             const auto stats = SourceBinReader::readStats(entry);
             SourcePtr source = project.sourceBin()->sourceForFile(stats->filename());
+            for (const SourcePtr& added : read.added) // two entries of one file make one source
+                if (!source && added->filename() == stats->filename()) source = added;
             if (!source) {
                 source = Source::create(project.editRateToken(), project.token(), stats);
                 read.added.push_back(source);
@@ -59,16 +61,25 @@ ClippingRead readClippings(const Json::Value& root, const boost::shared_ptr<Read
 
 } // namespace
 
-bool ClippingParser::parse(std::istream& in) {
+bool ClippingParser::read(std::istream& in) {
     const Json::Value root = parseDocument(in);
     const VersionInfo info = parsingDocument([&] { return documentVersionInfo(root); });
     const auto context = boost::make_shared<ReadContext>();
     context->project = project_;
-    const ClippingRead read = parsingDocument([&] { return readClippings(root, context); });
+    ClippingRead read = parsingDocument([&] { return readClippings(root, context); });
+    clippings_ = std::move(read.mixers);
+    newSources_ = std::move(read.added);
+    versionInfo_ = info;
+    return true;
+}
+
+bool ClippingParser::parse(std::istream& in) {
+    ClippingParser reading(project_);
+    reading.read(in);
     // Only now does the project change: the sources first, taken out again if one is refused.
     std::vector<SourcePtr> inserted;
     try {
-        for (const SourcePtr& source : read.added) {
+        for (const SourcePtr& source : reading.newSources()) {
             project_->sourceBin()->insertSource(source, -1);
             inserted.push_back(source);
         }
@@ -76,9 +87,10 @@ bool ClippingParser::parse(std::istream& in) {
         for (const SourcePtr& source : inserted) project_->sourceBin()->removeSource(source);
         refuseDocument(e.what());
     }
-    for (const MixerPtr& mixer : read.mixers) project_->addClipping(mixer);
-    clippings_ = read.mixers;
-    versionInfo_ = info;
+    for (const MixerPtr& mixer : reading.clippings()) project_->addClipping(mixer);
+    clippings_ = reading.clippings();
+    newSources_ = reading.newSources();
+    versionInfo_ = reading.versionInfo();
     return true;
 }
 

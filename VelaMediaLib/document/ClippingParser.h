@@ -11,6 +11,7 @@ namespace VelaMediaLib {
 
 class Mixer;
 class Project;
+class Source;
 
 /// Reads a clipboard document into a project's clipboard. The document is a
 /// root object with "version", "editRate" (the rate its ticks count; it must
@@ -24,13 +25,21 @@ class VELAMEDIALIB_API ClippingParser : public ParserInterface {
 public:
     explicit ClippingParser(const boost::shared_ptr<Project>& project);
     bool parse(std::istream& in);
-    /// The clippings added by the last parse.
+    /// Reads the document as parse does but leaves the project alone: the
+    /// clippings go on no clipboard and the sources the bin lacks (one per
+    /// file, newSources) into no bin; placing them is the caller's (a paste
+    /// does it with undoable commands). Throws as parse.
+    bool read(std::istream& in);
+    /// The clippings of the last parse or read.
     const std::vector<boost::shared_ptr<Mixer>>& clippings() const { return clippings_; }
+    /// The sources the last read made for files the bin lacked, in document order.
+    const std::vector<boost::shared_ptr<Source>>& newSources() const { return newSources_; }
     VersionInfo versionInfo() const override { return versionInfo_; }
 
 private:
     boost::shared_ptr<Project> project_;
     std::vector<boost::shared_ptr<Mixer>> clippings_;
+    std::vector<boost::shared_ptr<Source>> newSources_;
     VersionInfo versionInfo_;
 };
 

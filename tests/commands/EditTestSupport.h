@@ -6,6 +6,7 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/document/ProjectDocument.h>
 #include <VelaMediaLib/document/format/XMLOptions.h>
+#include <VelaMediaLib/effects/StoredEffect.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 
 #include <algorithm>
@@ -27,6 +28,15 @@ inline boost::shared_ptr<GenericTrack> parentOf(const MediaPtr& clip) {
         parent = boost::dynamic_pointer_cast<GenericTrack>(p);
     });
     return parent;
+}
+
+// An effect kept whole, standing on the clip's ticks [start, start + duration).
+inline StoredEffectPtr storedEffect(const std::string& name, VelaTime start, VelaTime duration) {
+    StoredEffect::Fields fields;
+    fields.effectName = name;
+    fields.start = start;
+    fields.duration = duration;
+    return StoredEffect::create(fields);
 }
 
 inline boost::shared_ptr<Parameter<double>> opacityOf(const MediaPtr& clip) {
@@ -136,6 +146,14 @@ protected:
         EXPECT_EQ(document(), before) << command->name();
         ASSERT_TRUE(project->redo()) << command->name();
         EXPECT_EQ(document(), after) << command->name();
+    }
+    // The command is refused: the written project and the history stay as they were.
+    void expectRefusedDocument(const CommandPtr& command) {
+        const std::string before = document();
+        const size_t stepsBefore = steps();
+        EXPECT_FALSE(project->execute(command)) << command->name();
+        EXPECT_EQ(document(), before) << command->name();
+        EXPECT_EQ(steps(), stepsBefore) << command->name();
     }
     // The command is refused, changes nothing and leaves no step.
     void expectRefused(const CommandPtr& command) {

@@ -92,7 +92,7 @@ TEST_F(EditUndo, TwoMovesOfOneClipCombineIntoOneMoveByTheirSum) {
     ASSERT_TRUE(project->execute(first) && project->execute(second));
     const auto both = boost::dynamic_pointer_cast<MoveCmd>(first->combine(second));
     ASSERT_TRUE(both);
-    CommandHandler& handler = project->edgeModCommandHandler();
+    CommandHandler& handler = dynamic_cast<InternalProject&>(*project);
     EXPECT_TRUE(both->unexecute(&handler));
     EXPECT_EQ(a->startTime(), 0);
     EXPECT_TRUE(both->execute(&handler));

@@ -4,6 +4,7 @@
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 #include <VelaMediaLib/commands/edits/LoadSourceCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnloadSourceCmd.h>
 #include <VelaMediaLib/model/media/AMFile.h>
@@ -91,6 +92,18 @@ TEST_F(SourceCommandTest, ASourceOnTheTimelineCannotBeUnloaded) {
     EXPECT_TRUE(project->execute(UnloadSourceCmd::create(a)));
     EXPECT_TRUE(project->sourceBin()->sources().empty());
     EXPECT_EQ(boost::dynamic_pointer_cast<VMFile>(clip)->source(), a); // the clip still plays it
+}
+
+TEST_F(SourceCommandTest, ASourceHeldByADeletionPointCannotBeUnloaded) {
+    const SourcePtr a = load("a.mov");
+    track->addMedia(VMFile::create(a, 0, 0), 0);
+    const auto remove = RippleDeleteRangeAndCreateDeletionPointCmd::create(Range<VelaTime>(0, 1000));
+    remove->addTrack(track);
+    ASSERT_TRUE(project->execute(remove));
+    ASSERT_EQ(track->numMedias(), 0u);
+    // The clip waits in the point to be put back: its source must stay.
+    EXPECT_THROW(project->execute(UnloadSourceCmd::create(a)), VelaMediaLibException);
+    EXPECT_EQ(sources(), SourceBin::Sources{a});
 }
 
 /// Loads the file itself while the command reads it, as another thread might.

@@ -7,18 +7,12 @@
 #include <VelaMediaLib/effects/StoredEffect.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
+#include <boost/make_shared.hpp>
+
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
 
 namespace {
-
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
 
 class SplitCommand : public EditTest {};
 
@@ -54,9 +48,9 @@ TEST_F(SplitCommand, AnimationsShiftAndEffectsAreCutForTheRightPart) {
     animation.endTime = 70;
     animation.duration = 50;
     impl->setAnimationTrack(AnimationTrack("opacity", {animation}));
-    media->addEffect(effect("Blur", 0, 30));               // wholly before the cut: not on the right part
-    media->addEffect(effect("Glow", 30, 40));              // across the cut: cut
-    media->addEffect(effect("DeviceFrameEffect", 0, 100)); // follows the end edge of the left part
+    media->addEffect(storedEffect("Blur", 0, 30));  // wholly before the cut: not on the right part
+    media->addEffect(storedEffect("Glow", 30, 40)); // across the cut: cut
+    media->addEffect(storedEffect("DeviceFrameEffect", 0, 100)); // follows the end edge of the left part
     const auto split = SplitCmd::create(track, 40);
     ASSERT_TRUE(project->execute(split));
     const auto right = boost::dynamic_pointer_cast<MediaImpl>(split->getCreatedMedias()[0]);
@@ -98,6 +92,22 @@ TEST_F(SplitCommand, RightTransitionMovesToTheRightPartAndUndoRestoresIt) {
     EXPECT_EQ(fade->duration(), 50);
     ASSERT_TRUE(project->redo());
     EXPECT_EQ(document(), after);
+}
+
+TEST_F(SplitCommand, FadesStayAtTheEdgesTheyBelongTo) {
+    const MediaPtr media = place(0, 100);
+    const auto fadeIn = boost::make_shared<EdgeModification>(10, "audioFade", 0.0);
+    const auto fadeOut = boost::make_shared<EdgeModification>(15, "audioFade", 0.0);
+    media->addLeftEdgeModification(fadeIn);
+    media->addRightEdgeModification(fadeOut);
+    const auto split = SplitCmd::create(track, 50);
+    expectExactDocumentUndo(split);
+    const MediaPtr right = split->getCreatedMedias().at(0);
+    EXPECT_EQ(media->leftEdgeModifications(), EdgeModifiable::EdgeModifications{fadeIn});
+    EXPECT_TRUE(media->rightEdgeModifications().empty());
+    EXPECT_TRUE(right->leftEdgeModifications().empty());
+    ASSERT_EQ(right->rightEdgeModifications().size(), 1u);
+    EXPECT_EQ(right->rightEdgeModifications()[0]->duration(), 15);
 }
 
 TEST_F(SplitCommand, NothingToSplitIsRefused) {

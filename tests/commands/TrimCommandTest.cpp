@@ -6,27 +6,20 @@
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/effects/StoredEffect.h>
+#include <VelaMediaLib/model/media/MediaImpl.h>
 
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
 
 namespace {
 
-StoredEffectPtr effect(const std::string& name, VelaTime start, VelaTime duration) {
-    StoredEffect::Fields fields;
-    fields.effectName = name;
-    fields.start = start;
-    fields.duration = duration;
-    return StoredEffect::create(fields);
-}
-
 class TrimCommand : public EditTest {};
 
 TEST_F(TrimCommand, MagnetizedEffectsFollowTheTrimmedEdge) {
     const MediaPtr media = place(10, 100);
-    media->addEffect(effect("CursorPath", 0, 100));        // follows both edges
-    media->addEffect(effect("DeviceFrameEffect", 20, 80)); // reaches the end only
-    media->addEffect(effect("Blur", 0, 100));              // not magnetized
+    media->addEffect(storedEffect("CursorPath", 0, 100));        // follows both edges
+    media->addEffect(storedEffect("DeviceFrameEffect", 20, 80)); // reaches the end only
+    media->addEffect(storedEffect("Blur", 0, 100));              // not magnetized
     const EdgeEffects found = magneticEffectsForMedia(media);
     ASSERT_EQ(found.size(), 2u);
     EXPECT_EQ(found[1].range, Range<VelaTime>(30, 80)); // in project ticks
@@ -38,12 +31,44 @@ TEST_F(TrimCommand, MagnetizedEffectsFollowTheTrimmedEdge) {
 
     expectExactDocumentUndo(TrimStartCmd::create(track, media, 10));
     EXPECT_EQ(media->allEffects()[0]->timeRange(), Range<VelaTime>(0, 60));
-    EXPECT_EQ(media->allEffects()[1]->timeRange(), Range<VelaTime>(20, 50)); // did not reach the start
+    // The others stay where they were on the time line: the clip's ticks now count from 20.
+    EXPECT_EQ(media->allEffects()[1]->timeRange(), Range<VelaTime>(10, 50));
+    EXPECT_EQ(media->allEffects()[2]->timeRange(), Range<VelaTime>(-10, 100));
+}
+
+TEST_F(TrimCommand, AStartTrimKeepsKeyframesAndAnimationsWithTheContent) {
+    const MediaPtr media = place(0, 100);
+    const auto opacity = opacityOf(media);
+    opacity->addKeyFrame(RationalTime(40), 0.25, RationalTime(0));
+    opacity->addKeyFrame(RationalTime(80), 1.0, RationalTime(40));
+    const double at60 = opacity->valueAtTime(RationalTime(60));
+    AnimationTrack::Animation animation;
+    animation.range = Range<long long>(50, 20);
+    animation.endTime = 70;
+    animation.duration = 20;
+    boost::dynamic_pointer_cast<MediaImpl>(media)->setAnimationTrack(AnimationTrack("opacity", {animation}));
+    const std::string before = document();
+
+    ASSERT_TRUE(project->execute(TrimStartCmd::create(track, media, 15)));
+    ASSERT_TRUE(project->execute(TrimStartCmd::create(track, media, -5)));
+    project->commandHistory()->combineLastCommands();
+    EXPECT_EQ(opacity->valueAtTime(RationalTime(50)), at60); // the same tick of the time line
+    const auto moved =
+        boost::dynamic_pointer_cast<MediaImpl>(media)->animationTracks().at("opacity").animations().at(0);
+    EXPECT_EQ(moved.range, Range<long long>(40, 20));
+    const std::string after = document();
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(document(), before);
+    ASSERT_TRUE(project->redo());
+    EXPECT_EQ(document(), after);
+    // A trim at the end moves nothing inside.
+    expectExactDocumentUndo(TrimEndCmd::create(track, media, 10));
+    EXPECT_EQ(opacity->valueAtTime(RationalTime(50)), at60);
 }
 
 TEST_F(TrimCommand, AnEffectTheEdgeWouldLeaveWithoutATickKeepsItsRange) {
     const MediaPtr media = place(0, 100);
-    media->addEffect(effect("CursorPath", 90, 10));
+    media->addEffect(storedEffect("CursorPath", 90, 10));
     ASSERT_TRUE(project->execute(TrimEndCmd::create(track, media, 20)));
     EXPECT_EQ(media->allEffects()[0]->timeRange(), Range<VelaTime>(90, 10));
     ASSERT_TRUE(project->execute(TrimEndCmd::create(track, media, -20, EdgeEffects())));
@@ -52,7 +77,7 @@ TEST_F(TrimCommand, AnEffectTheEdgeWouldLeaveWithoutATickKeepsItsRange) {
 
 TEST_F(TrimCommand, TwoMovesOrTrimsOfOneClipFoldIntoOneUndoStep) {
     const MediaPtr media = place(0, 100);
-    media->addEffect(effect("CursorPath", 0, 100));
+    media->addEffect(storedEffect("CursorPath", 0, 100));
     const std::string start = document();
     const size_t before = steps();
     ASSERT_TRUE(project->execute(MoveCmd::create(track, media, 5)));

@@ -1,5 +1,7 @@
 #include <VelaMediaLib/commands/edits/InternalProject.h>
 
+#include <VelaMediaLib/commands/edits/EdgeModCommandHandler.h>
+
 #include <algorithm>
 
 namespace VelaMediaLib {
@@ -111,6 +113,10 @@ bool InternalProject::execute(const CommandPtr& command) {
     }
     commandSubject_->notify();
     return done;
+}
+
+EdgeModCommandHandler& InternalProject::edgeModCommandHandler() {
+    return EdgeModCommandHandler::defaultHandler();
 }
 
 bool InternalProject::undo() {

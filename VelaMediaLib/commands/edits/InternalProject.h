@@ -112,7 +112,8 @@ public:
     void setCommandHandler(CommandHandler* handler) override { history_->setHandler(handler); }
     void attachCommandObserver(Observer* observer) override { commandSubject_->attach(observer); }
     void detachCommandObserver(Observer* observer) override { commandSubject_->detach(observer); }
-    CommandHandler& edgeModCommandHandler() override { return *this; }
+    /// The default one, which edits the clips directly (it keeps nothing).
+    EdgeModCommandHandler& edgeModCommandHandler() override;
 
     /// Root members: the project attributes it has ("title", "description",
     /// "author", "targetLoudness", "shouldApplyLoudnessNormalization",

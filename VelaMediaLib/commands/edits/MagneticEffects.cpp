@@ -23,19 +23,23 @@ bool listed(const EdgeEffects& followers, const Effectable::EffectPtr& effect) {
                        [&](const EdgeEffect& follower) { return follower.effect == effect; });
 }
 
-// The effect's range in the clip's ticks once the edge moved, as it stood
-// before in project ticks; the same range when it does not follow.
-Range<VelaTime> followingRange(const Range<VelaTime>& local, const Range<VelaTime>& before,
-                               const Range<VelaTime>& after, bool startEdge) {
+// The effect's range in the clip's ticks once the edge moved: a follower that
+// reached the edge moves that edge with it; every other effect stays where it
+// was on the time line (its ticks count from the clip's start, which a start
+// trim moves). A follower the move would leave without a tick stays put too.
+Range<VelaTime> movedRange(const Range<VelaTime>& local, bool follows, const Range<VelaTime>& before,
+                           const Range<VelaTime>& after, bool startEdge) {
+    const VelaTime shift = before.start() - after.start();
+    const Range<VelaTime> kept(local.start() + shift, local.duration());
     const Range<VelaTime> placed(before.start() + local.start(), local.duration());
     VelaTime from = placed.start(), to = placed.end();
-    if (startEdge && from <= before.start())
+    if (follows && startEdge && from <= before.start())
         from = after.start();
-    else if (!startEdge && to >= before.end())
+    else if (follows && !startEdge && to >= before.end())
         to = after.end();
     else
-        return local;
-    if (to <= from) return local;
+        return kept;
+    if (to <= from) return kept;
     return Range<VelaTime>(from - after.start(), to - from);
 }
 
@@ -48,12 +52,11 @@ boost::shared_ptr<Effectable::Effects> effectsFollowingEdge(const Effectable::Ef
     boost::shared_ptr<Effectable::Effects> moved;
     for (size_t i = 0; i < effects.size(); ++i) {
         const Effectable::EffectPtr& effect = effects[i];
-        if (!listed(followers, effect)) continue;
         const Range<VelaTime> local = effect->timeRange();
-        const Range<VelaTime> next = followingRange(local, before, after, startEdge);
+        const Range<VelaTime> next = movedRange(local, listed(followers, effect), before, after, startEdge);
         if (next == local) continue;
         const Effectable::EffectPtr replacement = effect->withTimeRange(next);
-        if (!replacement) continue;
+        if (!replacement) continue; // a kind without a place of its own
         if (!moved) moved.reset(new Effectable::Effects(effects));
         (*moved)[i] = replacement;
     }

@@ -21,8 +21,10 @@ VELAMEDIALIB_API EdgeEffects magneticEffectsForMedia(const MediaPtr& media);
 /// The clip's effect list after one of its edges moved from `before` to
 /// `after` (track ranges): each listed effect that reached the moved edge has
 /// its own edge there moved with it, its other edge staying where it was on
-/// the time line. An effect the move would leave without a tick keeps its
-/// range. Null when no effect follows, so the list need not change.
+/// the time line; every other effect stays where it was on the time line
+/// (after a start trim its ticks, counted from the clip's start, shift). A
+/// follower the move would leave without a tick stays put like the others.
+/// Null when no effect changes, so the list need not change.
 VELAMEDIALIB_API boost::shared_ptr<Effectable::Effects>
 effectsFollowingEdge(const Effectable::Effects& effects, const EdgeEffects& followers,
                      const Range<VelaTime>& before, const Range<VelaTime>& after, bool startEdge);

@@ -91,7 +91,7 @@ TrimTransitionCmd::create(const TrackPtr& track, const TransitionPtr& transition
 // A transition's length is read under the project's lock by the clips'
 // queries, so it changes under the write lock; the clips tell of it.
 bool TrimTransitionCmd::execute(CommandHandler*) {
-    if (!transition_ || duration_ < 0) return false;
+    if (!transition_ || duration_ < 0 || duration_ == transition_->duration()) return false; // nothing to do
     const std::vector<MediaPtr> clips = holders(transition_);
     if (!onTrack(clips) || !fitsOn(clips, boost::make_shared<Transition>("", duration_), transition_))
         return false;

@@ -51,10 +51,9 @@ private:
     TransitionPtr transition_;
 };
 
-/// Gives a transition a new length. Refused (false) for a length below zero
-/// or longer than a clip it stands on, or a transition on a clip of another
-/// track; one on no clip takes any length from zero. Undo gives back the
-/// length it had.
+/// Gives a transition a new length. Refused (false) for the length it has
+/// (nothing to do, no step), a length below zero or longer than a clip it stands on, or a transition on a
+/// clip of another track; one on no clip takes any length from zero. Undo gives back the length it had.
 class VELAMEDIALIB_API TrimTransitionCmd : public TransitionEditCmd {
 public:
     static boost::shared_ptr<TrimTransitionCmd> create(const TrackPtr& track, const TransitionPtr& transition,

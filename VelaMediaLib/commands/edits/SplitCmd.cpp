@@ -1,7 +1,9 @@
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 
+#include <VelaMediaLib/commands/edits/RemoveEdgeModCmd.h>
 #include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/detail/ContentShift.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
 #include <algorithm>
@@ -23,27 +25,6 @@ MediaPtr SplitCmd::mediaToSplit(const Track& track, VelaTime time) {
 }
 
 namespace {
-
-// Keyframes are in the clip's own ticks, counted from its start.
-void shiftKeyframes(Media& copy, VelaTime offset) {
-    for (const std::string& name : copy.parameterNames())
-        if (copy.hasMadeParameter(name))
-            copy.parameter(name)->moveKeyframes(RationalTime(-offset),
-                                                [](const RationalTime&) { return true; });
-}
-
-void shiftAnimations(Media& copy, VelaTime offset) {
-    MediaImpl* const impl = dynamic_cast<MediaImpl*>(&copy);
-    if (!impl) return;
-    for (auto entry : impl->animationTracks()) {
-        std::vector<AnimationTrack::Animation> animations = entry.second.animations();
-        for (AnimationTrack::Animation& animation : animations) {
-            animation.range = Range<long long>(animation.range.start() - offset, animation.range.duration());
-            animation.endTime -= offset;
-        }
-        impl->setAnimationTrack(AnimationTrack(entry.first, animations));
-    }
-}
 
 // Effects wholly before the cut go; one across it keeps what lies after.
 void cutEffects(Media& copy, VelaTime offset) {
@@ -67,11 +48,12 @@ void cutEffects(Media& copy, VelaTime offset) {
 MediaPtr SplitCmd::rightHandCopy(const Media& media, VelaTime offset) {
     const MediaPtr copy = media.clone();
     copy->trimStart(offset); // off a track: the copy's own edit
-    shiftKeyframes(*copy, offset);
-    shiftAnimations(*copy, offset);
+    detail::shiftKeyframesAndAnimations(*copy, -offset);
     cutEffects(*copy, offset);
     // A clone carries no transition; one that did would not belong at the cut.
     if (copy->leftTransition()) copy->setLeftTransition(TransitionPtr());
+    // Nor do the fades in: they stay with the left part's start.
+    copy->setLeftEdgeModificationsUnnotified(EdgeModifiable::EdgeModifications());
     return copy;
 }
 
@@ -95,6 +77,9 @@ void SplitCmd::executeCommands(const CommandHandler*) {
     // The transition goes first: a clip may not be shorter than its transitions.
     if (right && !executeRequired(RemoveTransitionCmd::create(track_, right))) return;
     if (!executeRequired(TrimEndCmd::create(track_, media, cut))) return;
+    // The fades out go with the right part's end (its copies of them).
+    for (const EdgeModificationPtr& fade : media->rightEdgeModifications())
+        if (!executeRequired(RemoveRightEdgeModCmd::create(media, fade))) return;
     if (!executeRequired(AddMediaCmd::create(track_, copy, time_))) return;
     created_.push_back(copy);
     if (!right || right->duration() <= 0) return;

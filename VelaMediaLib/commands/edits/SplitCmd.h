@@ -15,6 +15,8 @@ namespace VelaMediaLib {
 /// media start is advanced by the offset in media time, its keyframes and
 /// animations are shifted back by the offset (so every parameter has the
 /// value it had there), and its effects are cut to what lies after the tick.
+/// Edge modifications stay at the edges they belong to: the left part keeps
+/// those of the start, the right part those of the end.
 /// A transition on the clip's right edge moves to the copy's, shortened to
 /// the copy where it is longer (it is taken off before the trim, since a clip
 /// may not be shorter than its transitions). Refused (false, nothing changed) where no

@@ -1,6 +1,13 @@
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 
+#include <VelaMediaLib/commands/edits/detail/ContentShift.h>
+
 namespace VelaMediaLib {
+
+// A start trim moves the origin of the clip's own ticks: keyframes,
+// animations and effects shift back by as much, so they stay with the
+// content under the remaining part.
+VelaTime EdgeTrimCmd::originShift() const { return saved_.start - after_.start; }
 
 bool EdgeTrimCmd::execute(CommandHandler* handler) {
     need(handler);
@@ -14,22 +21,25 @@ bool EdgeTrimCmd::execute(CommandHandler* handler) {
     afterEffects_ = savedEffects_;
     const boost::shared_ptr<Effectable::Effects> moved = effectsFollowingEdge(
         savedEffects_, edgeEffects_, saved_.trackRange(), after_.trackRange(), startEdge_);
-    if (moved) {
-        afterEffects_ = *moved;
-        resultMedia_->replaceAllEffects(afterEffects_);
-    }
+    if (moved) afterEffects_ = *moved;
+    applyContent(afterEffects_, originShift());
     return true;
+}
+
+void EdgeTrimCmd::applyContent(const Effectable::Effects& effects, VelaTime shift) {
+    detail::shiftKeyframesAndAnimations(*resultMedia_, shift);
+    if (afterEffects_ != savedEffects_) resultMedia_->replaceAllEffects(effects);
 }
 
 bool EdgeTrimCmd::unexecute(CommandHandler* handler) {
     if (!restoreSavedState(handler)) return false;
-    if (afterEffects_ != savedEffects_) resultMedia_->replaceAllEffects(savedEffects_);
+    applyContent(savedEffects_, -originShift());
     return true;
 }
 
 bool EdgeTrimCmd::reexecute(CommandHandler* handler) {
     if (!restoreAfter(handler)) return false;
-    if (afterEffects_ != savedEffects_) resultMedia_->replaceAllEffects(afterEffects_);
+    applyContent(afterEffects_, originShift());
     return true;
 }
 

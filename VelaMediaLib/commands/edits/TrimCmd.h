@@ -7,11 +7,13 @@
 namespace VelaMediaLib {
 
 /// What the two trims share: the effects that follow the trimmed edge move
-/// with it (their other edge stays put on the time line), undo gives back the
-/// clip's exact state and effect list, and redo the exact state and list the
-/// trim gave. Two trims of the same edge of the same clip in a row combine
-/// into one undo step: undone to the first one's state, redone to the
-/// second one's, with the sum as its delta.
+/// with it (their other edge stays put on the time line), and everything
+/// else the clip holds in its own ticks (keyframes, animations, the other
+/// effects) stays with the content it was on: a start trim shifts them by
+/// the start's move. Undo gives back the clip's exact state, content and
+/// effect list, and redo the exact ones the trim gave. Two trims of the same edge of the same clip in a row
+/// combine into one undo step: undone to the first one's state, redone to the second one's, with the sum as
+/// its delta.
 class VELAMEDIALIB_API EdgeTrimCmd : public AtomicEditCmd {
 public:
     const EdgeEffects& edgeEffects() const { return edgeEffects_; }
@@ -28,6 +30,11 @@ protected:
     virtual boost::shared_ptr<EdgeTrimCmd> sameEdge(VelaTime delta) const = 0;
 
 private:
+    /// How far the clip's own ticks moved back (0 for an end trim).
+    VelaTime originShift() const;
+    /// Shifts keyframes and animations and gives the clip the effect list.
+    void applyContent(const Effectable::Effects& effects, VelaTime shift);
+
     EdgeEffects edgeEffects_;
     bool startEdge_;
     Effectable::Effects savedEffects_;

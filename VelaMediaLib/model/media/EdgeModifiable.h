@@ -27,6 +27,14 @@ public:
     virtual void setLeftEdgeModificationLength(VelaTime length) = 0;
     virtual void setRightEdgeModificationLength(VelaTime length) = 0;
     virtual std::set<std::string> edgeModGroupNames() const = 0;
+    /// Gives that side exactly the list (the same modifications in the same
+    /// order) under the project's write lock, which the caller may hold
+    /// already, and tells no one: true when the side changed, and the caller
+    /// then notifies the clip once its lock has ended. An edit that checks a
+    /// side and changes it in one locked step uses it. A null entry throws
+    /// AddRemoveException and changes nothing.
+    virtual bool setLeftEdgeModificationsUnnotified(const EdgeModifications& modifications) = 0;
+    virtual bool setRightEdgeModificationsUnnotified(const EdgeModifications& modifications) = 0;
 };
 
 } // namespace VelaMediaLib

@@ -426,6 +426,17 @@ void MediaImpl::setEdgeModificationLength(EdgeModifications& side, VelaTime leng
     if (changed) notify();
 }
 
+bool MediaImpl::setEdgeModificationsUnnotified(EdgeModifications& side,
+                                               const EdgeModifications& modifications) {
+    for (const EdgeModificationPtr& modification : modifications)
+        if (!modification) throw AddRemoveException("no edge modification to add");
+    EdgeModifications next(modifications); // copied before the lock: the swap cannot throw
+    ScopedWriteLock lock(projectMutex());
+    if (side == next) return false;
+    side.swap(next);
+    return true;
+}
+
 void MediaImpl::addLeftEdgeModification(const EdgeModificationPtr& m) { addEdgeModification(leftEdges_, m); }
 void MediaImpl::addRightEdgeModification(const EdgeModificationPtr& m) {
     addEdgeModification(rightEdges_, m);
@@ -441,6 +452,13 @@ void MediaImpl::setLeftEdgeModificationLength(VelaTime length) {
 }
 void MediaImpl::setRightEdgeModificationLength(VelaTime length) {
     setEdgeModificationLength(rightEdges_, length);
+}
+
+bool MediaImpl::setLeftEdgeModificationsUnnotified(const EdgeModifications& m) {
+    return setEdgeModificationsUnnotified(leftEdges_, m);
+}
+bool MediaImpl::setRightEdgeModificationsUnnotified(const EdgeModifications& m) {
+    return setEdgeModificationsUnnotified(rightEdges_, m);
 }
 
 EdgeModifiable::EdgeModifications MediaImpl::leftEdgeModifications() const {

@@ -95,6 +95,8 @@ public:
     void setLeftEdgeModificationLength(VelaTime length) override;
     void setRightEdgeModificationLength(VelaTime length) override;
     std::set<std::string> edgeModGroupNames() const override;
+    bool setLeftEdgeModificationsUnnotified(const EdgeModifications& modifications) override;
+    bool setRightEdgeModificationsUnnotified(const EdgeModifications& modifications) override;
 
     // Time conversion: the clip's parametric time counts from its start.
     SafeRational parentParametricTimeToThisParametricTime(const SafeRational& time) const override;
@@ -156,6 +158,7 @@ protected:
     void addEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     bool removeEdgeModification(EdgeModifications& side, const EdgeModificationPtr& modification);
     void setEdgeModificationLength(EdgeModifications& side, VelaTime length);
+    bool setEdgeModificationsUnnotified(EdgeModifications& side, const EdgeModifications& modifications);
     void setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left);
 
 private:

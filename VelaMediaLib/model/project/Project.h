@@ -13,6 +13,7 @@
 namespace VelaMediaLib {
 
 class CommandHandler;
+class EdgeModCommandHandler;
 class Source;
 class XMLOptions;
 
@@ -138,7 +139,8 @@ public:
     /// Observers told after every execute, undo and redo.
     virtual void attachCommandObserver(Observer* observer) = 0;
     virtual void detachCommandObserver(Observer* observer) = 0;
-    virtual CommandHandler& edgeModCommandHandler() = 0;
+    /// What the edge-modification commands act through when given none.
+    virtual EdgeModCommandHandler& edgeModCommandHandler() = 0;
 
     // Document
     /// Writes the whole project document (see InternalProjectDocument.cpp),

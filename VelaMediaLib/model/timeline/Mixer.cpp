@@ -53,6 +53,18 @@ void Mixer::removeTracks(const Tracks& tracks) {
     for (const TrackPtr& track : tracks) removeTrack(track);
 }
 
+bool Mixer::swapTrackOrder(const TrackPtr& first, const TrackPtr& second) {
+    {
+        ScopedWriteLock lock(projectMutex());
+        const auto a = std::find(tracks_.begin(), tracks_.end(), first);
+        const auto b = std::find(tracks_.begin(), tracks_.end(), second);
+        if (a == tracks_.end() || b == tracks_.end()) return false;
+        std::iter_swap(a, b);
+    }
+    notify();
+    return true;
+}
+
 TrackPtr Mixer::trackAtIndex(unsigned index) const {
     ScopedReadLock lock(projectLock());
     if (index >= tracks_.size())

@@ -41,6 +41,9 @@ public:
     /// Returns whether the mixer held the track.
     bool removeTrack(const TrackPtr& track);
     void removeTracks(const Tracks& tracks);
+    /// Swaps the places of two tracks the mixer holds and notifies; false,
+    /// changing nothing, when it does not hold both.
+    bool swapTrackOrder(const TrackPtr& first, const TrackPtr& second);
     /// Removes the track and says how to put it back; throws AddRemoveException
     /// when the mixer does not hold it.
     RemoveTrackInfo removeTrackImpl(const TrackPtr& track);

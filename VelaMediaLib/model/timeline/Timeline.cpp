@@ -33,7 +33,8 @@ TransformMatrix view(const Point3d& x, const Point3d& y, const Point3d& z, const
 } // namespace
 
 Timeline::Timeline(const boost::weak_ptr<const ThreadSafe>& token)
-    : SubProject(token), ObjectSubject(token), Parametric(token), Attributable(token) {}
+    : SubProject(token), ObjectSubject(token), Parametric(token), Attributable(token),
+      deletionPoints_(new DeletionPointList(token)) {}
 
 Timeline::~Timeline() {
     for (const auto& entry : mixers_) entry.second->detachAddObserver(this);
@@ -203,6 +204,24 @@ std::vector<boost::shared_ptr<const Source>> Timeline::allSources() const {
 
 std::vector<MediaPtr> Timeline::instancesOf(const boost::shared_ptr<const Source>& source) const {
     return Sourceable::clipsOf(allMedias(), source);
+}
+
+namespace {
+
+void collectHeld(const DeletionPoint& point, std::vector<MediaPtr>& held) {
+    for (const DeletionPoint::RemovedClip& clip : point.clips()) {
+        Track::visitWithin(clip.media, [&](const MediaPtr& inner, bool&) { held.push_back(inner); });
+    }
+    for (const DeletionPoint::InnerPoint& inner : point.innerPoints()) collectHeld(*inner.point, held);
+}
+
+} // namespace
+
+bool Timeline::hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
+    if (!instancesOf(source).empty()) return true;
+    std::vector<MediaPtr> held;
+    for (const DeletionPointPtr& point : deletionPoints_->allPoints()) collectHeld(*point, held);
+    return !Sourceable::clipsOf(held, source).empty();
 }
 
 size_t Timeline::swapSourceForTimelineMedias(const boost::shared_ptr<const Source>& from,

@@ -6,6 +6,7 @@
 #include <VelaMediaLib/model/media/IdentityTimeConverter.h>
 #include <VelaMediaLib/base/CaptionAttributes.h>
 #include <VelaMediaLib/model/timeline/GenericMixer.h>
+#include <VelaMediaLib/model/timeline/DeletionPoint.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 #include <VelaMediaLib/model/timeline/TimelineAddObserver.h>
 #include <VelaMediaLib/model/media/Transformer.h>
@@ -85,9 +86,9 @@ public:
     std::vector<boost::shared_ptr<const Source>> allSources() const;
     /// The clips that play the source.
     std::vector<MediaPtr> instancesOf(const boost::shared_ptr<const Source>& source) const;
-    bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const {
-        return !instancesOf(source).empty();
-    }
+    /// Whether a clip plays the source: on the timeline, or held by a
+    /// deletion point to be put back (so the source must stay loaded).
+    bool hasInstanceOf(const boost::shared_ptr<const Source>& source) const;
     /// Gives every clip that plays `from` the source `to`; returns how many
     /// changed. Throws, changing no clip, when one cannot play `to` (see
     /// Sourceable::checkSource).
@@ -100,6 +101,8 @@ public:
     VelaTime duration() const override { return endTime(); }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(0, endTime()); }
     VelaTime endTimeNotIncludingHiddenAndMutedTracks() const;
+    /// What ripple deletes took out of the tracks, to be put back (not written).
+    const boost::shared_ptr<DeletionPointList>& deletionPoints() const { return deletionPoints_; }
 
     // Canvas, camera, markers, sound
     boost::shared_ptr<Attribute<int>> attributeWidth() const { return attribute<int>("width"); }
@@ -183,6 +186,7 @@ private:
     std::map<std::string, MixerPtr> mixers_;
     AddObserverList<TimelineAddObserver> addObservers_;
     CaptionAttributes captions_;
+    boost::shared_ptr<DeletionPointList> deletionPoints_;
 };
 
 typedef boost::shared_ptr<Timeline> TimelinePtr;

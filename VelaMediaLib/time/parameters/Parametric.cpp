@@ -65,6 +65,11 @@ void Parametric::addParameter(const std::string& name,
     parameters_.set(name, parameter);
 }
 
+boost::shared_ptr<ParameterInterface> Parametric::removeParameter(const std::string& name) {
+    ScopedWriteLock lock(projectMutex());
+    return parameters_.erase(name);
+}
+
 bool Parametric::hasMadeParameter(const std::string& name) const { return bool(madeParameter(name)); }
 
 bool Parametric::hasMadeParameters() const {

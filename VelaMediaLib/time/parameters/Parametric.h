@@ -40,6 +40,10 @@ public:
     std::vector<std::string> parameterNames() const;
     /// Adds or replaces a parameter of the name.
     void addParameter(const std::string& name, const boost::shared_ptr<ParameterInterface>& parameter);
+    /// Forgets a made parameter, so that the object answers its default again
+    /// and writes it no more (an undo of the edit that made it); returns it,
+    /// or null when it was not made. Tells nobody, as making it does not.
+    boost::shared_ptr<ParameterInterface> removeParameter(const std::string& name);
     bool hasMadeParameter(const std::string& name) const;
     /// Whether any parameter has been made (one not made holds its default).
     bool hasMadeParameters() const;

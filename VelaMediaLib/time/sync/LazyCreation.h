@@ -47,8 +47,8 @@ private:
 
 /// Named shared values in name order, which readers walk without a lock of
 /// their own while others add to them: entries are linked in with one
-/// compare-and-swap and never unlinked. Callers hold the project's read lock
-/// to read or add, and its write lock to replace a value.
+/// compare-and-swap and unlinked only under the write lock. Callers hold the
+/// project's read lock to read or add, and its write lock to replace or erase.
 template <typename V>
 class NamedEntries {
 public:
@@ -100,6 +100,22 @@ public:
         Node* node = head_.load(std::memory_order_acquire);
         while (node->name != name) node = node->next.load(std::memory_order_acquire);
         node->value = value;
+    }
+
+    /// Unlinks and frees the entry of the name, returning its value (null when
+    /// there is none). Only under the project's write lock, when no one reads.
+    Pointer erase(const std::string& name) {
+        std::atomic<Node*>* link = &head_;
+        Node* at = link->load(std::memory_order_acquire);
+        while (at && at->name < name) {
+            link = &at->next;
+            at = link->load(std::memory_order_acquire);
+        }
+        if (!at || at->name != name) return Pointer();
+        link->store(at->next.load(std::memory_order_acquire), std::memory_order_release);
+        Pointer value = at->value;
+        delete at;
+        return value;
     }
 
     /// Calls `visit(name, value)` for each entry in name order.

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/commands/edits/detail/EditRateScale.h>
+#include <VelaMediaLib/commands/framework/MultiCommand.h>
+#include <VelaMediaLib/model/timeline/Mixer.h>
+
+namespace VelaMediaLib {
+
+/// Carries every track of a mixer over to another edit rate (see
+/// EditRateScale): each track's transitions once, then each clip with
+/// ScaleMediaEditRateCmd, placed by EditRateScale::trackStates. Clips moving
+/// later go first, latest first, then the others, earliest first, so no clip
+/// meets one that has not moved yet. Undo gives back every saved state; a
+/// refusal anywhere undoes the steps before it.
+class VELAMEDIALIB_API ScaleMixerEditRateCmd : public MultiCommand {
+public:
+    /// Throws ValueException<double> for a factor not above zero, and
+    /// AddRemoveException "no mixer to scale" for none.
+    static boost::shared_ptr<ScaleMixerEditRateCmd> create(const MixerPtr& mixer, const SafeRational& factor);
+    static boost::shared_ptr<ScaleMixerEditRateCmd> create(const MixerPtr& mixer,
+                                                           const boost::rational<unsigned long>& from,
+                                                           const boost::rational<unsigned long>& to);
+
+protected:
+    void executeCommands(const CommandHandler* handler) override;
+
+private:
+    ScaleMixerEditRateCmd(const MixerPtr& mixer, const EditRateScale& scale) : mixer_(mixer), scale_(scale) {}
+
+    MixerPtr mixer_;
+    EditRateScale scale_;
+};
+
+/// Issues, through the composite, the steps that carry one track's
+/// transitions and clips over (what ScaleMixerEditRateCmd does per track; a
+/// stitched clip's parts go the same way). Stops at the first refusal.
+VELAMEDIALIB_API void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track,
+                                         const EditRateScale& scale);
+
+} // namespace VelaMediaLib
