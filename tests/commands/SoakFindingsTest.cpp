@@ -2,7 +2,10 @@
 // the smallest edit that showed it.
 #include "EditTestSupport.h"
 
+#include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ReplaceMediaWithMediasCmd.h>
+#include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/model/media/StitchedMedia.h>
 
@@ -24,6 +27,28 @@ TEST_F(SoakFindings, APartInsideAStitchedMediaIsNotTakenOffItsTrack) {
     expectRefusedDocument(RemoveMediaCmd::create(inner, a));
     expectRefusedDocument(ReplaceMediaWithMediasCmd::create(inner, b, {clip(10), clip(5)}));
     EXPECT_EQ(stitch->stitchedMedia()->medias(), (std::vector<MediaPtr>{a, b}));
+}
+
+// A ripple delete cuts a clip; a transition is then given to the cut's left
+// piece; restoring the point joins the cut, and its undo cuts it again. Undoing
+// the transition and then the delete must give back the clip as it was, with
+// no transition it never had.
+TEST_F(SoakFindings, UndoingARestoreLeavesTheDeletesOwnUndoAsItWas) {
+    const MediaPtr before = place(0, 10), cut = place(10, 30);
+    const std::string original = document();
+    const auto del = RippleDeleteRangeAndCreateDeletionPointCmd::create(Range<VelaTime>(20, 5));
+    del->addTrack(track);
+    ASSERT_TRUE(project->execute(del));
+    ASSERT_TRUE(
+        project->execute(AddTransitionCmd::create(track, before, transition(), TransitionEditCmd::Right)));
+    const auto restore = RestoreDeletionPointAtTimeCmd::create(20);
+    restore->addTrack(track);
+    expectExactDocumentUndo(restore);
+    ASSERT_TRUE(project->undo()); // the restore
+    ASSERT_TRUE(project->undo()); // the transition
+    ASSERT_TRUE(project->undo()); // the delete
+    EXPECT_EQ(document(), original);
+    EXPECT_FALSE(cut->leftTransition());
 }
 
 } // namespace
