@@ -3,6 +3,8 @@
 #include "EditTestSupport.h"
 
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
+#include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
+#include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/edits/ReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
 #include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
@@ -49,6 +51,23 @@ TEST_F(SoakFindings, UndoingARestoreLeavesTheDeletesOwnUndoAsItWas) {
     ASSERT_TRUE(project->undo()); // the delete
     EXPECT_EQ(document(), original);
     EXPECT_FALSE(cut->leftTransition());
+}
+
+// A clip's effects scaled by an edit rate change, then replaced by equal
+// copies (a split redone after the change was redone): undoing the change
+// must give back the effects it scaled, not add them beside the copies.
+TEST_F(SoakFindings, UndoingAnEditRateChangeGivesBackEffectsThatWereCopiedSince) {
+    const MediaPtr media = place(0, 40);
+    media->addEffect(storedEffect("CursorPath", 0, 40));
+    media->addEffect(storedEffect("Blur", 5, 10));
+    const std::string original = document();
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
+    ASSERT_TRUE(project->execute(SplitCmd::create(track, 30)));
+    for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->undo());
+    for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->redo());
+    for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->undo());
+    EXPECT_EQ(document(), original);
+    EXPECT_EQ(media->numEffects(), 2u);
 }
 
 } // namespace
