@@ -5,6 +5,7 @@
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
+#include <VelaMediaLib/commands/edits/RemoveTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ReplaceMediaWithMediasCmd.h>
 #include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
 #include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
@@ -68,6 +69,24 @@ TEST_F(SoakFindings, UndoingAnEditRateChangeGivesBackEffectsThatWereCopiedSince)
     for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->undo());
     EXPECT_EQ(document(), original);
     EXPECT_EQ(media->numEffects(), 2u);
+}
+
+// A transition split in two, then an edit of the copy the split made: undone
+// and redone, the split must give the same copy again, or the later edit's
+// redo names a transition no clip holds.
+TEST_F(SoakFindings, RedoingASplitTransitionGivesTheSameCopy) {
+    const MediaPtr left = place(0, 20);
+    place(20, 20);
+    const TransitionPtr joined = transition();
+    ASSERT_TRUE(project->execute(AddTransitionCmd::create(track, left, joined, TransitionEditCmd::Right)));
+    ASSERT_TRUE(project->execute(SplitTransitionCmd::create(track, joined)));
+    const TransitionPtr copy = clips[1]->leftTransition();
+    ASSERT_TRUE(project->execute(TrimTransitionCmd::create(track, copy, 1)));
+    const std::string after = document();
+    for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->undo());
+    for (int i = 0; i < 2; ++i) ASSERT_TRUE(project->redo()) << i;
+    EXPECT_EQ(document(), after);
+    EXPECT_EQ(clips[1]->leftTransition(), copy);
 }
 
 } // namespace

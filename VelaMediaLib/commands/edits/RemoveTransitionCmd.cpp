@@ -77,7 +77,9 @@ bool SplitTransitionCmd::execute(CommandHandler*) {
     if (clips.size() != 2 || !onTrack(clips)) return false;
     if (clips[0]->rightTransition() != transition_ || clips[1]->leftTransition() != transition_) return false;
     saveSlots(clips);
-    clips[1]->setLeftTransition(transition_->clone());
+    // Redo gives the same copy: later edits name it.
+    if (!copy_) copy_ = transition_->clone();
+    clips[1]->setLeftTransition(copy_);
     return true;
 }
 

@@ -18,6 +18,7 @@ private:
     RemoveTransitionCmd(const TrackPtr& track, const TransitionPtr& transition)
         : TransitionEditCmd(track), transition_(transition) {}
     TransitionPtr transition_;
+    TransitionPtr copy_; // made on the first run, given again on redo
 };
 
 /// Puts another transition in every slot the first one holds. Refused
@@ -49,6 +50,7 @@ private:
     SplitTransitionCmd(const TrackPtr& track, const TransitionPtr& transition)
         : TransitionEditCmd(track), transition_(transition) {}
     TransitionPtr transition_;
+    TransitionPtr copy_; // made on the first run, given again on redo
 };
 
 /// Gives a transition a new length. Refused (false) for the length it has
