@@ -51,6 +51,7 @@ EditMaker faulty(bool refuseAfterChanging) {
 TEST(RandomEditSoak, EveryFamilyKeepsTheInvariantsAndUndoesExactly) {
     EditMakerRegistry registry;
     addCoreMakers(registry);
+    addFamilyMakers(registry);
     std::map<std::string, long long> applied, refused;
     for (uint64_t seed = 1; seed <= 4; ++seed) {
         SoakOptions options;

@@ -68,6 +68,9 @@ ProjectIndependentCommandHandler::addMedia(const TrackPtr& track, const MediaPtr
 
 CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::removeMedia(const TrackPtr& track,
                                                                             const MediaPtr& media) {
+    // Only a track that takes clips gives one up: a part taken off a stitched
+    // media's track could not be put back by the undo.
+    if (!boost::dynamic_pointer_cast<GenericTrack>(track)) return TrackAndMedia();
     return attempt(track, media, [&] { track->removeMedia(media); });
 }
 

@@ -22,12 +22,16 @@ private:
     boost::shared_ptr<SplitCmd> split_;
 };
 
-// Both pieces on the track, touching, and as the split left them.
+// Both pieces on the track, touching, and as the split left them, every
+// transition slot included: undoing the split puts back the slots it saw, so
+// joining under a transition given since would drop it, and redoing the split
+// would leave the delete's own undo slots of a later time.
 bool standsAsCut(const Track& track, const DeletionCuts::Cut& cut) {
     ScopedReadLock lock(track.projectLock());
     return track.hasMedia(cut.left) && track.hasMedia(cut.right) && cut.left->state() == cut.leftState &&
            cut.right->state() == cut.rightState && cut.left->rightTransition() == cut.leftRight &&
-           cut.right->leftTransition() == cut.rightLeft;
+           cut.right->leftTransition() == cut.rightLeft && cut.left->leftTransition() == cut.leftLeft &&
+           cut.right->rightTransition() == cut.rightRight;
 }
 
 // The track's points once the point is restored: the later ones move right,

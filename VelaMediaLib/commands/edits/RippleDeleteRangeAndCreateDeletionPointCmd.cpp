@@ -73,7 +73,8 @@ bool RippleDeleteRangeAndCreateDeletionPointCmd::cutAt(const TrackPtr& track, Ve
     if (!executeRequired(split)) return false;
     const MediaPtr right = split->getCreatedMedias().front();
     cuts.cuts.push_back(DeletionCuts::Cut{split, left, right, left->state(), right->state(),
-                                          left->rightTransition(), right->leftTransition()});
+                                          left->rightTransition(), right->leftTransition(),
+                                          left->leftTransition(), right->rightTransition()});
     return true;
 }
 

@@ -20,6 +20,7 @@ struct VELAMEDIALIB_API DeletionCuts : public VelaObject {
         MediaPtr left, right;
         MediaState leftState, rightState;
         TransitionPtr leftRight, rightLeft; // the facing slots
+        TransitionPtr leftLeft, rightRight; // the outer slots, which the split's undo puts back too
     };
     std::vector<Cut> cuts;
 };

@@ -38,13 +38,9 @@ public:
     }
 
 private:
-    struct Replaced {
-        size_t index;
-        Effectable::EffectPtr before, after;
-    };
     struct Saved {
         std::vector<std::pair<EdgeModificationPtr, VelaTime>> edges;
-        std::vector<Replaced> effects;
+        boost::optional<Effectable::Effects> effects; // the list before, when scaled
         MediaImpl::AnimationTracks animations;
         boost::optional<long long> captionMax;
         std::vector<std::pair<boost::shared_ptr<ParameterInterface>, boost::shared_ptr<ParameterInterface>>>
@@ -61,19 +57,24 @@ private:
             edge->setDuration(scale_.tick(edge->duration()));
         }
     }
+    // Effects are values: the list goes back whole, since a later edit undone
+    // or redone may have put equal copies in place of the scaled ones.
     void scaleEffects() {
-        const Effectable::Effects effects = media_->allEffects();
-        for (size_t i = 0; i < effects.size(); ++i) {
-            const auto stored = boost::dynamic_pointer_cast<StoredEffect>(effects[i]);
+        const Effectable::Effects before = media_->allEffects();
+        Effectable::Effects after = before;
+        bool scaled = false;
+        for (Effectable::EffectPtr& effect : after) {
+            const auto stored = boost::dynamic_pointer_cast<StoredEffect>(effect);
             if (!stored || (stored->fields().start == 0 && stored->fields().duration == 0)) continue;
             StoredEffect::Fields fields = stored->fields();
             fields.start = scale_.tick(fields.start);
             fields.duration = scale_.tick(fields.duration);
-            const Effectable::EffectPtr scaled = StoredEffect::create(fields);
-            media_->removeEffect(stored);
-            media_->insertEffect(scaled, i);
-            saved_.effects.push_back(Replaced{i, stored, scaled});
+            effect = StoredEffect::create(fields);
+            scaled = true;
         }
+        if (!scaled) return;
+        media_->replaceAllEffects(after);
+        saved_.effects = before;
     }
     void scaleAnimations() {
         MediaImpl* const impl = dynamic_cast<MediaImpl*>(media_.get());
@@ -116,10 +117,7 @@ private:
         if (saved_.captionMax) dynamic_cast<Caption&>(*media_).setMaxMediaDuration(*saved_.captionMax);
         if (MediaImpl* const impl = dynamic_cast<MediaImpl*>(media_.get()))
             for (const auto& entry : saved_.animations) impl->setAnimationTrack(entry.first, entry.second);
-        for (auto e = saved_.effects.rbegin(); e != saved_.effects.rend(); ++e) {
-            media_->removeEffect(e->after);
-            media_->insertEffect(e->before, e->index);
-        }
+        if (saved_.effects) media_->replaceAllEffects(*saved_.effects);
         {
             ScopedWriteLock lock(media_->projectMutex());
             for (const auto& edge : saved_.edges) edge.first->setDuration(edge.second);

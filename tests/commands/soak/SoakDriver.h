@@ -106,6 +106,8 @@ private:
 /// The families the timeline edit commands of today give: placement, time
 /// structure, ripple edits, transitions, composites, track flags and folding.
 void addCoreMakers(EditMakerRegistry& registry);
+/// Every other family of edit commands (FamilyMakers.cpp).
+void addFamilyMakers(EditMakerRegistry& registry);
 
 /// The project every run starts from: four tracks (the first magnetic), clips
 /// with keyframes, effects (a magnetized "CursorPath" among them) and

@@ -49,6 +49,7 @@ int main(int argc, char** argv) {
 
     EditMakerRegistry registry;
     addCoreMakers(registry);
+    addFamilyMakers(registry);
     SoakResult total;
     std::map<std::string, long long> byKind;
     const auto began = std::chrono::steady_clock::now();
