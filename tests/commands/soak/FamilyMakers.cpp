@@ -103,12 +103,6 @@ Edit edit(const CommandPtr& command, const Described& what) {
     return e;
 }
 
-// A whole number from low to high, both included; low when high is below it
-// (a track may end before 0).
-long long within(Random& random, long long low, long long high) {
-    return between(random, low, std::max(low, high));
-}
-
 VelaTime trackEnd(const TrackPtr& track) { return track ? track->endTime() : 0; }
 
 VelaTime mixerEnd(const SoakState& state) {
@@ -134,8 +128,8 @@ Target target(Random& random, const SoakState& state) {
 
 // A range of ticks: mostly a short one where clips stand, sometimes none long.
 Range<VelaTime> someRange(Random& random, const SoakState& state, VelaTime longest = 60) {
-    const VelaTime start = within(random, -10, mixerEnd(state) + 10);
-    return Range<VelaTime>(start, chance(random, 97) ? within(random, 1, longest) : within(random, -5, 0));
+    const VelaTime start = between(random, -10, mixerEnd(state) + 10);
+    return Range<VelaTime>(start, chance(random, 97) ? between(random, 1, longest) : between(random, -5, 0));
 }
 
 // Some of the mixer's tracks (now and then a group's track too), each named;
@@ -160,8 +154,8 @@ MediaPtr freshClip(Random& random, SoakState& state) {
         if (const auto visual = boost::dynamic_pointer_cast<VisualMediaImpl>(clip)) {
             HotspotInfo hotspot;
             hotspot.action = "jump";
-            hotspot.gotoTime = within(random, 0, 300);
-            hotspot.markerTime = within(random, 0, 60);
+            hotspot.gotoTime = between(random, 0, 300);
+            hotspot.markerTime = between(random, 0, 60);
             visual->setHotspot(hotspot);
         }
     return clip;
@@ -197,7 +191,7 @@ Edit makeRemoveLast(Random& random, SoakState& state) {
 Edit makeDuplicate(Random& random, SoakState& state) {
     std::vector<MediaPtr> chosen;
     if (!chance(random, 2)) // an empty list throws
-        for (long long i = within(random, 1, 3); i > 0; --i) chosen.push_back(state.randomPlaced(random));
+        for (long long i = between(random, 1, 3); i > 0; --i) chosen.push_back(state.randomPlaced(random));
     if (chance(random, 20)) chosen.push_back(state.randomKnown(random));        // loose or inside: refused
     if (chance(random, 3) && !chosen.empty()) chosen.push_back(chosen.front()); // twice: throws
     Described what(state);
@@ -208,13 +202,13 @@ Edit makeDuplicate(Random& random, SoakState& state) {
 Edit makeCloneAdd(Random& random, SoakState& state) {
     std::vector<CloneAddMediasCmd::Placement> placements;
     Described what(state);
-    for (long long i = within(random, 1, 2); i > 0; --i) {
+    for (long long i = between(random, 1, 2); i > 0; --i) {
         CloneAddMediasCmd::Placement placement;
         placement.media = chance(random, 70) ? state.randomPlaced(random) : state.randomKnown(random);
         placement.track = state.randomTrack(random);
         // Mostly where it fits, after the track's end; sometimes onto its clips.
-        placement.time = chance(random, 60) ? trackEnd(placement.track) + within(random, 0, 30)
-                                            : within(random, -5, trackEnd(placement.track));
+        placement.time = chance(random, 60) ? trackEnd(placement.track) + between(random, 0, 30)
+                                            : between(random, -5, trackEnd(placement.track));
         what.clip(placement.media).track(placement.track) << "at" << placement.time;
         placements.push_back(placement);
     }
@@ -227,9 +221,10 @@ Edit makeRepeat(Random& random, SoakState& state) {
     const VelaTime most =
         std::max<VelaTime>(1, std::min<VelaTime>(200, (pattern ? pattern->duration() : 1) * 4));
     const Range<VelaTime> range =
-        chance(random, 60) ? Range<VelaTime>(trackEnd(track) + within(random, 0, 20), within(random, 1, most))
-                           : Range<VelaTime>(within(random, -5, trackEnd(track)),
-                                             within(random, -2, most)); // no length: throws
+        chance(random, 60)
+            ? Range<VelaTime>(trackEnd(track) + between(random, 0, 20), between(random, 1, most))
+            : Range<VelaTime>(between(random, -5, trackEnd(track)),
+                              between(random, -2, most)); // no length: throws
     return edit(RepeatMediaToFillRangeCmd::create(track, pattern, range),
                 Described(state).track(track).clip(pattern)
                     << "over" << range.start() << "for" << range.duration());
@@ -239,7 +234,7 @@ EditMaker makeReplace(bool ripple) {
     return [ripple](Random& random, SoakState& state) {
         const Target t = target(random, state);
         std::vector<MediaPtr> list;
-        for (long long i = chance(random, 60) ? 1 : within(random, 2, 3); i > 0; --i)
+        for (long long i = chance(random, 60) ? 1 : between(random, 2, 3); i > 0; --i)
             list.push_back(freshClip(random, state));
         if (chance(random, 25)) list.push_back(state.randomPlaced(random)); // on a track: refused
         if (chance(random, 3)) list.push_back(t.clip);                      // itself: throws
@@ -254,11 +249,11 @@ EditMaker makeReplace(bool ripple) {
 
 Edit makeDisplace(Random& random, SoakState& state) {
     const TrackPtr track = chance(random, 8) ? TrackPtr() : state.randomTrack(random); // none: throws
-    const long long kind = within(random, 0, 9);
+    const long long kind = between(random, 0, 9);
     const MediaPtr clip = kind < 6   ? freshClip(random, state)
                           : kind < 9 ? state.randomPlaced(random) // dragged from where it stands
                                      : state.randomKnown(random);
-    const VelaTime time = within(random, -3, trackEnd(track) + 20);
+    const VelaTime time = between(random, -3, trackEnd(track) + 20);
     return edit(DisplaceMediaOnUnifiedMixerCmd::create(track, clip, time),
                 Described(state).clip(clip).track(track) << "at" << time);
 }
@@ -268,20 +263,20 @@ Edit makeDisplace(Random& random, SoakState& state) {
 Edit makeTrimToFrame(Random& random, SoakState& state) {
     if (chance(random, 30)) {
         const MixerPtr mixer = state.mixer;
-        const VelaTime time = within(random, -5, mixerEnd(state) + 5);
+        const VelaTime time = between(random, -5, mixerEnd(state) + 5);
         return edit(TrimMediasToFrameCmd::create(mixer, time), Described(state) << "the mixer at" << time);
     }
     const Target t = target(random, state);
     const Range<VelaTime> range = t.clip->trackRange();
-    const VelaTime time = chance(random, 85) ? within(random, range.start() + 1, range.end())
-                                             : within(random, range.start() - 5, range.end() + 5);
+    const VelaTime time = chance(random, 85) ? between(random, range.start() + 1, range.end())
+                                             : between(random, range.start() - 5, range.end() + 5);
     return edit(TrimMediasToFrameCmd::create(t.clip, time), Described(state).clip(t.clip) << "at" << time);
 }
 
 Edit makeMediaLength(Random& random, SoakState& state) {
     const Target t = target(random, state);
-    const VelaTime before = chance(random, 40) ? 0 : within(random, chance(random, 4) ? -3 : 0, 15);
-    const VelaTime after = chance(random, 40) ? 0 : within(random, 0, 15);
+    const VelaTime before = chance(random, 40) ? 0 : between(random, chance(random, 4) ? -3 : 0, 15);
+    const VelaTime after = chance(random, 40) ? 0 : between(random, 0, 15);
     const bool ripple = chance(random, 50), extend = chance(random, 50);
     MultiTrackEditOptions options;
     Described what(state);
@@ -310,16 +305,16 @@ bool gapOf(Random& random, const TrackPtr& track, VelaTime& time, VelaTime& amou
     }
     if (gaps.empty()) return false;
     const auto gap = oneOf(random, gaps);
-    const VelaTime offset = within(random, 0, gap.second - 1);
+    const VelaTime offset = between(random, 0, gap.second - 1);
     time = gap.first + offset;
-    amount = within(random, 1, gap.second - offset);
+    amount = between(random, 1, gap.second - offset);
     return true;
 }
 
 Edit makeTrackTime(Random& random, SoakState& state) {
     const bool extend = chance(random, 50);
-    VelaTime time = within(random, -5, mixerEnd(state) + 5);
-    VelaTime amount = chance(random, 97) ? within(random, 0, 40) : -1; // negative: throws
+    VelaTime time = between(random, -5, mixerEnd(state) + 5);
+    VelaTime amount = chance(random, 97) ? between(random, 0, 40) : -1; // negative: throws
     Described what(state);
     std::vector<TrackPtr> tracks;
     const TrackPtr one = state.randomTrack(random);
@@ -343,13 +338,13 @@ Edit makeTrackTime(Random& random, SoakState& state) {
 Edit makeContentTime(Random& random, SoakState& state) {
     const Target t = target(random, state);
     const VelaTime duration = t.clip->duration();
-    VelaTime time = within(random, -5, duration + 5);
-    const VelaTime amount = chance(random, 97) ? within(random, 0, 20) : -2; // negative: throws
+    VelaTime time = between(random, -5, duration + 5);
+    const VelaTime amount = chance(random, 97) ? between(random, 0, 20) : -2; // negative: throws
     const bool extend = chance(random, 50);
     Described what(state);
     what.clip(t.clip);
     CommandPtr command;
-    switch (within(random, 0, 2)) {
+    switch (between(random, 0, 2)) {
     case 0:
         what << "effects";
         command = extend ? CommandPtr(ExtendEffectsCmd::create(t.clip, time, amount))
@@ -384,7 +379,7 @@ Edit makeRippleDelete(Random& random, SoakState& state) {
     boost::shared_ptr<RippleDeleteRangeAndCreateDeletionPointCmd> command;
     if (chance(random, 30)) {
         std::vector<Range<VelaTime>> ranges;
-        for (long long i = within(random, chance(random, 3) ? 0 : 1, 3); i > 0; --i) {
+        for (long long i = between(random, chance(random, 3) ? 0 : 1, 3); i > 0; --i) {
             ranges.push_back(someRange(random, state, 30)); // overlapping or touching: throws
             what << "[" << ranges.back().start() << "+" << ranges.back().duration() << "]";
         }
@@ -407,7 +402,7 @@ Edit makeRestore(Random& random, SoakState& state) {
         points.insert(points.end(), on.begin(), on.end());
     }
     const DeletionPointPtr point = oneOf(random, points);
-    const VelaTime time = point && chance(random, 85) ? point->time() : within(random, -5, mixerEnd(state));
+    const VelaTime time = point && chance(random, 85) ? point->time() : between(random, -5, mixerEnd(state));
     const auto command = RestoreDeletionPointAtTimeCmd::create(time);
     Described what(state);
     what << "at" << time;
@@ -438,7 +433,7 @@ Edit makeNewTrack(Random& random, SoakState& state) {
     if (chance(random, 10))
         if (const auto inner = someGroupMixer(random, state)) mixer = inner;
     const int count = int(mixer->tracks().size());
-    int index = int(within(random, -1, count));
+    int index = int(between(random, -1, count));
     if (chance(random, 35) || (mixer == state.mixer && count >= 8))
         index = chance(random, 50) ? count + 1 : -2; // throws
     return edit(NewTrackCmd::create(mixer, index), Described(state) << "at" << index << "of" << count);
@@ -475,7 +470,7 @@ Edit makeSwapTracks(Random& random, SoakState& state) {
 
 Edit makeNewMixer(Random& random, SoakState& state) {
     static const char* const names[] = {"extra 1", "extra 2", "main", ""}; // taken or empty: throws
-    const std::string name = names[chance(random, 85) ? within(random, 0, 1) : within(random, 2, 3)];
+    const std::string name = names[chance(random, 85) ? between(random, 0, 1) : between(random, 2, 3)];
     return edit(NewMixerCmd::create(name), Described(state) << "named" << name);
 }
 
@@ -484,7 +479,7 @@ Edit makeNewMixer(Random& random, SoakState& state) {
 SafeRational rateFactor(Random& random) {
     const SafeRational factors[] = {SafeRational(2000, 1001), SafeRational(1001, 2000), SafeRational(2),
                                     SafeRational(1, 2),       SafeRational(4, 5),       SafeRational(0)};
-    return factors[chance(random, 97) ? within(random, 0, 4) : 5]; // 0: throws
+    return factors[chance(random, 97) ? between(random, 0, 4) : 5]; // 0: throws
 }
 
 Edit makeMediaState(Random& random, SoakState& state) {
@@ -495,29 +490,29 @@ Edit makeMediaState(Random& random, SoakState& state) {
     const auto keepRule = [&s] {
         s.duration = RationalUtil::toVelaTime(RationalUtil::Round(s.mediaDuration * s.scalar));
     };
-    switch (within(random, 0, 4)) {
+    switch (between(random, 0, 4)) {
     case 0:
-        s.start += within(random, -40, 40);
+        s.start += between(random, -40, 40);
         what << "start" << s.start;
         break;
     case 1:
-        s.mediaStart += SafeRational(within(random, -10, 10));
+        s.mediaStart += SafeRational(between(random, -10, 10));
         what << "media start" << s.mediaStart;
         break;
     case 2: {
         const SafeRational scalars[] = {1, SafeRational(1, 2), 2, SafeRational(3, 2)};
-        s.scalar = scalars[within(random, 0, 3)];
+        s.scalar = scalars[between(random, 0, 3)];
         keepRule();
         what << "scalar" << s.scalar;
         break;
     }
     case 3:
-        s.mediaDuration -= SafeRational(within(random, -5, 10));
+        s.mediaDuration -= SafeRational(between(random, -5, 10));
         keepRule();
         what << "media duration" << s.mediaDuration;
         break;
     default:
-        s.duration += within(random, -3, 3); // against the duration rule: refused
+        s.duration += between(random, -3, 3); // against the duration rule: refused
         what << "duration" << s.duration;
     }
     if (chance(random, 20)) return edit(SetMediaStateCmd::create(t.clip, s), what);
@@ -542,7 +537,7 @@ Edit makeScaleMedia(Random& random, SoakState& state) {
     Described what(state);
     what.clip(t.clip).track(t.track) << "by" << factor;
     if (chance(random, 30)) {
-        const VelaTime start = within(random, 0, trackEnd(t.track) + 10);
+        const VelaTime start = between(random, 0, trackEnd(t.track) + 10);
         return edit(ScaleMediaEditRateCmd::create(t.track, t.clip, factor, start), what << "to" << start);
     }
     return edit(ScaleMediaEditRateCmd::create(t.track, t.clip, factor), what);
@@ -578,9 +573,9 @@ std::vector<OnClip> edgeModifications(const SoakState& state) {
 
 EdgeModificationPtr newModification(Random& random, const MediaPtr& clip) {
     const VelaTime most = clip ? clip->duration() : 10;
-    const VelaTime duration = chance(random, 92) ? within(random, 0, most) : most + within(random, 1, 5);
+    const VelaTime duration = chance(random, 92) ? between(random, 0, most) : most + between(random, 1, 5);
     return EdgeModificationPtr(new EdgeModification(duration, chance(random, 70) ? "fade" : "duck",
-                                                    double(within(random, 0, 4)) / 4));
+                                                    double(between(random, 0, 4)) / 4));
 }
 
 Edit makeEdgeMod(Random& random, SoakState& state) {
@@ -588,7 +583,7 @@ Edit makeEdgeMod(Random& random, SoakState& state) {
     OnClip known = oneOf(random, all);
     const Target t = target(random, state);
     Described what(state);
-    const long long kind = within(random, 0, 9);
+    const long long kind = between(random, 0, 9);
     if (kind >= 4 && !known.clip) { // nothing to work on yet: add one
         return edit(AddEdgeModCmd::create(t.clip, newModification(random, t.clip), EdgeModificationPtr()),
                     what.clip(t.clip) << "add a left one");
@@ -628,8 +623,8 @@ Edit makeEdgeMod(Random& random, SoakState& state) {
                          : CommandPtr(RemoveRightEdgeModCmd::create(on, known.modification)),
                     what);
     default: {
-        const VelaTime d = chance(random, 90) ? within(random, -10, 10) : within(random, -200, 200);
-        const VelaTime d2 = within(random, -8, 8);
+        const VelaTime d = chance(random, 90) ? between(random, -10, 10) : between(random, -200, 200);
+        const VelaTime d2 = between(random, -8, 8);
         what.clip(on) << "move" << (left ? "left" : "right") << "by" << d;
         const auto make = [&](VelaTime delta) {
             return left ? CommandPtr(MoveLeftEdgeModCmd::create(on, known.modification, delta))
@@ -649,14 +644,14 @@ Edit makeEdgeMod(Random& random, SoakState& state) {
 // ---- Animations and keyframes ----
 
 std::string animatedName(Random& random) {
-    const long long pick = within(random, 1, 100);
+    const long long pick = between(random, 1, 100);
     return pick <= 85 ? "opacity" : pick <= 97 ? "scale" : "loudness"; // none such: throws
 }
 
 std::string someCode(Random& random) {
     static const char* const codes[] = {"linr", "esIn", "esOt", "bnce",
                                         "",     "linr", "nope"}; // unknown: throws
-    return codes[chance(random, 97) ? within(random, 0, 5) : 6];
+    return codes[chance(random, 97) ? between(random, 0, 5) : 6];
 }
 
 Edit makeAnimation(Random& random, SoakState& state) {
@@ -671,25 +666,25 @@ Edit makeAnimation(Random& random, SoakState& state) {
     }
     const VelaTime duration = t.clip->duration();
     const auto anyStart = [&] {
-        return chance(random, 85) && !starts.empty() ? oneOf(random, starts) : within(random, -3, duration);
+        return chance(random, 85) && !starts.empty() ? oneOf(random, starts) : between(random, -3, duration);
     };
     const VelaTime start = anyStart();
     Described what(state);
     what.clip(t.clip) << name << "at" << start;
-    switch (within(random, 0, 11)) {
+    switch (between(random, 0, 11)) {
     case 0: {
         const VelaTime at =
-            chance(random, 60) ? lastEnd + within(random, 0, 10) : within(random, -2, duration);
-        const Range<VelaTime> range(at, within(random, chance(random, 3) ? -2 : 1, 25));
+            chance(random, 60) ? lastEnd + between(random, 0, 10) : between(random, -2, duration);
+        const Range<VelaTime> range(at, between(random, chance(random, 3) ? -2 : 1, 25));
         return edit(AddAnimationCmd::create(t.clip, name, range, someCode(random)),
                     what << "add" << range.start() << range.duration());
     }
     case 1: {
         AnimationTrack::Animation preset;
-        const VelaTime at = lastEnd + within(random, 0, 10), length = within(random, 1, 20);
+        const VelaTime at = lastEnd + between(random, 0, 10), length = between(random, 1, 20);
         preset.range = Range<long long>(at, length);
         preset.endTime = chance(random, 95) ? at + length : at; // another end: throws
-        preset.duration = within(random, 0, length);
+        preset.duration = between(random, 0, length);
         preset.interp = someCode(random);
         return edit(AddAnimationWithDescriptionCmd::create(t.clip, name, preset),
                     what << "add a preset" << at);
@@ -700,7 +695,7 @@ Edit makeAnimation(Random& random, SoakState& state) {
         return edit(RemoveAllAnimationsCmd::create(t.clip, chance(random, 70) ? name : std::string()),
                     what << "remove all");
     case 4: {
-        const VelaTime d = within(random, -20, 20);
+        const VelaTime d = between(random, -20, 20);
         return edit(MoveAnimationCmd::create(t.clip, name, start, d), what << "move by" << d);
     }
     case 5: {
@@ -708,16 +703,16 @@ Edit makeAnimation(Random& random, SoakState& state) {
         for (const VelaTime s : starts)
             if (chance(random, 60)) moved.push_back(s);
         if (chance(random, 10)) moved.push_back(anyStart());
-        const VelaTime d = within(random, -20, 20);
+        const VelaTime d = between(random, -20, 20);
         return edit(MoveAnimationsCmd::create(t.clip, name, moved, d), what << moved.size() << "by" << d);
     }
     case 6: {
-        const VelaTime at = start + within(random, -2, 15);
+        const VelaTime at = start + between(random, -2, 15);
         return edit(SplitAnimationCmd::create(t.clip, name, start, at), what << "split at" << at);
     }
     case 7:
     case 8: {
-        const VelaTime d = within(random, -10, 10);
+        const VelaTime d = between(random, -10, 10);
         const bool atStart = chance(random, 50);
         what << (atStart ? "trim start by" : "trim end by") << d;
         return edit(atStart ? CommandPtr(TrimAnimationStartCmd::create(t.clip, name, start, d))
@@ -743,10 +738,10 @@ Edit makeAnimation(Random& random, SoakState& state) {
 }
 
 boost::shared_ptr<KeyFrameInterface> keyframe(Random& random, VelaTime time) {
-    const VelaTime leadIn = chance(random, 80) ? 0 : within(random, -1, 10);
+    const VelaTime leadIn = chance(random, 80) ? 0 : between(random, -1, 10);
     return boost::shared_ptr<KeyFrame<double>>(
         new KeyFrame<double>(boost::weak_ptr<const ThreadSafe>(), RationalTime(time),
-                             double(within(random, 0, 8)) / 8, RationalTime(leadIn)));
+                             double(between(random, 0, 8)) / 8, RationalTime(leadIn)));
 }
 
 Edit makeKeyframes(Random& random, SoakState& state) {
@@ -761,36 +756,36 @@ Edit makeKeyframes(Random& random, SoakState& state) {
     if (opacity) times = *opacity->keyframeTimes();
     const RationalTime known = chance(random, 85) && !times.empty()
                                    ? oneOf(random, times)
-                                   : RationalTime(within(random, -2, duration));
-    const long long kind = opacity ? within(random, 0, 9) : within(random, 7, 9);
+                                   : RationalTime(between(random, -2, duration));
+    const long long kind = opacity ? between(random, 0, 9) : between(random, 7, 9);
     switch (kind) {
     case 0:
     case 1: {
-        const VelaTime time = within(random, -2, duration + 2);
+        const VelaTime time = between(random, -2, duration + 2);
         return edit(AddParameterKeyFrameInterfaceCmd::create(opacity, keyframe(random, time)),
                     what << "add at" << time);
     }
     case 2:
         return edit(RemoveParameterKeyFrameCmd::create(opacity, known), what << "remove at" << known);
     case 3:
-        return edit(RemoveAllKeyFramesCmd::create(opacity, RationalTime(within(random, 0, duration))),
+        return edit(RemoveAllKeyFramesCmd::create(opacity, RationalTime(between(random, 0, duration))),
                     what << "remove all");
     case 4: {
-        const RationalTime to(within(random, -2, duration + 2));
+        const RationalTime to(between(random, -2, duration + 2));
         return edit(MoveParameterKeyFrameCmd::create(opacity, known, to),
                     what << "move" << known << "to" << to);
     }
     case 5:
     case 6: {
-        const Range<RationalTime> range(RationalTime(within(random, 0, duration)),
-                                        RationalTime(within(random, chance(random, 3) ? -1 : 1, 20)));
-        const double value = chance(random, 98) ? double(within(random, 0, 4)) / 4
+        const Range<RationalTime> range(RationalTime(between(random, 0, duration)),
+                                        RationalTime(between(random, chance(random, 3) ? -1 : 1, 20)));
+        const double value = chance(random, 98) ? double(between(random, 0, 4)) / 4
                                                 : std::numeric_limits<double>::quiet_NaN(); // throws
         return edit(SetDoubleParameterValueInRangeCmd::create(opacity, range, value),
                     what << "hold" << value << "from" << range.start());
     }
     case 7: { // placeholders have no volume: throws
-        const Range<VelaTime> range(within(random, 0, duration), within(random, 1, 20));
+        const Range<VelaTime> range(between(random, 0, duration), between(random, 1, 20));
         return edit(SetVolumeInRangeCmd::create(t.clip, range, 0.5), what << "volume");
     }
     default: {
@@ -802,7 +797,7 @@ Edit makeKeyframes(Random& random, SoakState& state) {
             "{\"opacity\": 0.25, \"rotation\": \"sideways\"}", // of the wrong type: throws as it runs
             "{\"loudness\": 1}",                               // none such: throws
             "[1]"};                                            // no object: throws
-        const long long text = chance(random, 85) ? within(random, 0, 2) : within(random, 3, 5);
+        const long long text = chance(random, 85) ? between(random, 0, 2) : between(random, 3, 5);
         return edit(ApplySerializedParameterValuesToMediaCmd::create(t.clip, texts[text]),
                     what << "apply text" << text);
     }
@@ -823,10 +818,10 @@ Edit makeCut(Random& random, SoakState& state) {
 // The clipping of a range of some tracks, copied as a host copies (no step).
 std::string copied(Random& random, const SoakState& state, Described& what, size_t& count) {
     const std::vector<TrackPtr> all = state.tracks();
-    const size_t first = size_t(within(random, 0, (long long)all.size() - 1));
-    const size_t last = std::min(all.size() - 1, first + size_t(within(random, 0, 2)));
+    const size_t first = size_t(between(random, 0, (long long)all.size() - 1));
+    const size_t last = std::min(all.size() - 1, first + size_t(between(random, 0, 2)));
     const std::vector<TrackPtr> from(all.begin() + first, all.begin() + last + 1);
-    const Range<VelaTime> range(within(random, 0, mixerEnd(state)), within(random, 1, 80));
+    const Range<VelaTime> range(between(random, 0, mixerEnd(state)), between(random, 1, 80));
     what << "copy of" << from.size() << "tracks from" << range.start() << "for" << range.duration();
     count = from.size();
     return CopyRangeClippingCmd::clippingDocument(*state.project, from, range);
@@ -846,12 +841,12 @@ Edit makePaste(Random& random, SoakState& state) {
     const std::vector<TrackPtr> all = state.tracks();
     const long long room =
         chance(random, 90) ? (long long)all.size() - (long long)count : (long long)all.size() - 1;
-    const size_t first = size_t(within(random, 0, std::max(0LL, room)));
+    const size_t first = size_t(between(random, 0, std::max(0LL, room)));
     std::vector<TrackPtr> targets(all.begin() + first, all.end());
     if (targets.size() > count) targets.resize(count);
     VelaTime end = 0;
     for (const TrackPtr& track : targets) end = std::max(end, track->endTime());
-    const VelaTime time = chance(random, 60) ? end + within(random, 0, 20) : within(random, -3, end);
+    const VelaTime time = chance(random, 60) ? end + between(random, 0, 20) : between(random, -3, end);
     what << "onto";
     for (const TrackPtr& track : targets) what.track(track);
     return edit(PasteClippingCmd::create(text, targets, time), what << "at" << time); // negative: throws
@@ -860,11 +855,11 @@ Edit makePaste(Random& random, SoakState& state) {
 Edit makeCopyAndPaste(Random& random, SoakState& state) {
     Described what(state);
     std::vector<TrackPtr> tracks = someTracks(random, state, what);
-    const Range<VelaTime> range(within(random, 0, mixerEnd(state)),
-                                within(random, chance(random, 3) ? 0 : 1, 60));
+    const Range<VelaTime> range(between(random, 0, mixerEnd(state)),
+                                between(random, chance(random, 3) ? 0 : 1, 60));
     VelaTime end = 0;
     for (const TrackPtr& track : tracks) end = std::max(end, track->endTime());
-    const VelaTime time = chance(random, 60) ? end + within(random, 0, 20) : within(random, -3, end);
+    const VelaTime time = chance(random, 60) ? end + between(random, 0, 20) : between(random, -3, end);
     std::vector<TrackPtr> targets;
     if (chance(random, 30))
         for (const TrackPtr& track : state.tracks())

@@ -29,7 +29,7 @@ namespace soak {
 
 typedef std::mt19937_64 Random;
 
-/// A whole number from low to high, both included.
+/// A whole number from low to high, both included (low when high is below it).
 long long between(Random& random, long long low, long long high);
 /// True with the chance percent / 100.
 bool chance(Random& random, int percent);

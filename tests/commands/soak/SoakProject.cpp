@@ -19,6 +19,7 @@ namespace VelaMediaLib {
 namespace soak {
 
 long long between(Random& random, long long low, long long high) {
+    if (high < low) high = low; // a track may end before 0
     return std::uniform_int_distribution<long long>(low, high)(random);
 }
 
