@@ -792,11 +792,11 @@ Edit makeKeyframes(Random& random, SoakState& state) {
         static const char* const texts[] = {
             "{\"opacity\": 0.5}",
             "{\"opacity\": 0.75}",
-            "{\"scale\": {\"type\": \"point\", \"keyframes\": [{\"time\": 0, \"endTime\": 0, "
-            "\"value\": [2.0, 2.0, 1.0], \"duration\": 0}]}}",
-            "{\"opacity\": 0.25, \"rotation\": \"sideways\"}", // of the wrong type: throws as it runs
-            "{\"loudness\": 1}",                               // none such: throws
-            "[1]"};                                            // no object: throws
+            ("{\"scale\": {\"type\": \"point\", \"keyframes\": [{\"time\": 0, \"endTime\": 0, "
+             "\"value\": [2.0, 2.0, 1.0], \"duration\": 0}]}}"), // one text over two lines
+            "{\"opacity\": 0.25, \"rotation\": \"sideways\"}",   // of the wrong type: throws as it runs
+            "{\"loudness\": 1}",                                 // none such: throws
+            "[1]"};                                              // no object: throws
         const long long text = chance(random, 85) ? between(random, 0, 2) : between(random, 3, 5);
         return edit(ApplySerializedParameterValuesToMediaCmd::create(t.clip, texts[text]),
                     what << "apply text" << text);
