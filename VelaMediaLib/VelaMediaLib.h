@@ -25,6 +25,7 @@
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeTrackFlagCmd.h>
+#include <VelaMediaLib/commands/edits/ClipTimeCmd.h>
 #include <VelaMediaLib/commands/edits/CloneAddMediasCmd.h>
 #include <VelaMediaLib/commands/edits/CloseGapsOnTrackCmd.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>

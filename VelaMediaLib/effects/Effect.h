@@ -22,6 +22,9 @@ public:
     /// that edge is trimmed (a device frame around the whole clip stays around
     /// the whole clip).
     virtual bool isMagnetized() const { return false; }
+    /// Whether the effect stands on a range of its clip; a kind without a
+    /// place of its own covers the whole clip and is never moved or cut.
+    virtual bool hasTimeRange() const { return false; }
     /// Where the effect stands on its clip, in the clip's own ticks (0 is the
     /// clip's start); a kind without a place of its own covers nothing.
     virtual Range<VelaTime> timeRange() const { return Range<VelaTime>(0, 0); }

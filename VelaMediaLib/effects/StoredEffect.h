@@ -38,6 +38,7 @@ public:
     /// True for the effects that stay fitted to their clip's edges:
     /// "DeviceFrameEffect" and "CursorPath".
     bool isMagnetized() const override;
+    bool hasTimeRange() const override { return true; }
     Range<VelaTime> timeRange() const override { return Range<VelaTime>(fields_.start, fields_.duration); }
     boost::shared_ptr<Effect> withTimeRange(const Range<VelaTime>& range) const override;
     /// "_type", "effectName", "category", "bypassed", "start", "duration",

@@ -42,11 +42,16 @@ protected:
         ASSERT_TRUE(project->execute(command)) << command->name();
         const std::string after = document();
         EXPECT_NE(after, before);
+        expectUndoRedoTwice(before, after, command->name());
+    }
+    // Undo gives `before` and redo `after`, twice over.
+    void expectUndoRedoTwice(const std::string& before, const std::string& after,
+                             const std::string& what = "") {
         for (int round = 0; round < 2; ++round) {
-            ASSERT_TRUE(project->undo()) << command->name();
-            EXPECT_EQ(document(), before) << command->name() << " undo " << round;
-            ASSERT_TRUE(project->redo()) << command->name();
-            EXPECT_EQ(document(), after) << command->name() << " redo " << round;
+            ASSERT_TRUE(project->undo()) << what;
+            EXPECT_EQ(document(), before) << what << " undo " << round;
+            ASSERT_TRUE(project->redo()) << what;
+            EXPECT_EQ(document(), after) << what << " redo " << round;
         }
     }
     void expectReadsBack() {
@@ -92,12 +97,7 @@ TEST_F(ReviewFindings, SplitThenCombinedTrimsUndoAsOneStep) {
     ASSERT_TRUE(project->execute(TrimEndCmd::create(track, media, 4)));
     project->combineLastCommands();
     const std::string trimmed = document();
-    for (int round = 0; round < 2; ++round) {
-        ASSERT_TRUE(project->undo());
-        EXPECT_EQ(document(), split);
-        ASSERT_TRUE(project->redo());
-        EXPECT_EQ(document(), trimmed);
-    }
+    expectUndoRedoTwice(split, trimmed);
     expectReadsBack();
 }
 
@@ -118,12 +118,7 @@ TEST_F(ReviewFindings, StretchesCombinedUndoAndRedoTwice) {
     ASSERT_TRUE(project->execute(StretchCmd::create(media, SafeRational(1, 2))));
     project->combineLastCommands();
     const std::string after = document();
-    for (int round = 0; round < 2; ++round) {
-        ASSERT_TRUE(project->undo());
-        EXPECT_EQ(document(), before);
-        ASSERT_TRUE(project->redo());
-        EXPECT_EQ(document(), after);
-    }
+    expectUndoRedoTwice(before, after);
 }
 
 TEST_F(ReviewFindings, ValuesOnAFreshClipUndoTwice) {
@@ -215,12 +210,7 @@ TEST_F(ReviewFindings, CombinedStartTrimsAndMovesUndoTwice) {
     project->combineLastCommands();
     ASSERT_EQ(steps(), 2u); // the placing, and the gesture
     const std::string after = document();
-    for (int round = 0; round < 2; ++round) {
-        ASSERT_TRUE(project->undo());
-        EXPECT_EQ(document(), before);
-        ASSERT_TRUE(project->redo());
-        EXPECT_EQ(document(), after);
-    }
+    expectUndoRedoTwice(before, after);
     expectReadsBack();
 }
 

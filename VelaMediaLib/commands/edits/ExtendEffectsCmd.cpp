@@ -3,10 +3,7 @@
 namespace VelaMediaLib {
 
 EffectTimeCmd::EffectTimeCmd(const MediaPtr& media, VelaTime time, VelaTime amount, bool extend)
-    : media_(media), time_(time), amount_(amount), extend_(extend) {
-    if (!media) throw VelaMediaLibException("no clip to fit effects of");
-    if (amount < 0) throw ValueException<long long>("effect time amount must not be negative", amount);
-}
+    : ClipTimeCmd(media, time, amount, extend, "fit effects of", "effect") {}
 
 Range<VelaTime> EffectTimeCmd::extended(const Range<VelaTime>& range, bool magnetized, VelaTime time,
                                         VelaTime amount) {
@@ -34,17 +31,13 @@ bool EffectTimeCmd::execute(CommandHandler*) {
     bool changed = false;
     for (const Effectable::EffectPtr& effect : before_) {
         const Range<VelaTime> range = effect->timeRange();
-        if (range.duration() <= 0) { // covers nothing of its own
+        if (!effect->hasTimeRange() || range.duration() <= 0) { // covers nothing of its own
             after_.push_back(effect);
             continue;
         }
         const Range<VelaTime> next = extend_ ? extended(range, effect->isMagnetized(), time_, amount_)
                                              : reduced(range, time_, amount_);
         const Effectable::EffectPtr moved = next == range ? effect : effect->withTimeRange(next);
-        if (!moved) { // a kind without a place of its own
-            after_.push_back(effect);
-            continue;
-        }
         changed = changed || moved != effect;
         if (next.duration() > 0) after_.push_back(moved);
     }

@@ -1,7 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
-#include <VelaMediaLib/commands/framework/Command.h>
+#include <VelaMediaLib/commands/edits/ClipTimeCmd.h>
 #include <VelaMediaLib/model/media/Media.h>
 
 namespace VelaMediaLib {
@@ -11,7 +11,7 @@ namespace VelaMediaLib {
 /// whole clip) are left alone. Effects are values: the command replaces the
 /// clip's list, undo gives back the list it had (the same effects), redo the
 /// list it made. Reports false when no effect changes.
-class VELAMEDIALIB_API EffectTimeCmd : public Command {
+class VELAMEDIALIB_API EffectTimeCmd : public ClipTimeCmd {
 public:
     bool execute(CommandHandler* handler) override;
     bool unexecute(CommandHandler* handler) override;
@@ -28,10 +28,6 @@ protected:
     EffectTimeCmd(const MediaPtr& media, VelaTime time, VelaTime amount, bool extend);
 
 private:
-    MediaPtr media_;
-    VelaTime time_;
-    VelaTime amount_;
-    bool extend_;
     Effectable::Effects before_;
     Effectable::Effects after_;
 };

@@ -3,10 +3,7 @@
 namespace VelaMediaLib {
 
 AnimationTimeCmd::AnimationTimeCmd(const MediaPtr& media, VelaTime time, VelaTime amount, bool extend)
-    : media_(media), time_(time), amount_(amount), extend_(extend) {
-    if (!media) throw VelaMediaLibException("no clip to move animations of");
-    if (amount < 0) throw ValueException<long long>("animation time amount must not be negative", amount);
-}
+    : ClipTimeCmd(media, time, amount, extend, "move animations of", "animation") {}
 
 MediaImpl::AnimationTracks AnimationTimeCmd::moved(const MediaImpl::AnimationTracks& tracks) const {
     const VelaTime from = extend_ ? time_ : time_ + amount_;

@@ -1,7 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
-#include <VelaMediaLib/commands/framework/Command.h>
+#include <VelaMediaLib/commands/edits/ClipTimeCmd.h>
 #include <VelaMediaLib/model/media/MediaImpl.h>
 
 namespace VelaMediaLib {
@@ -12,7 +12,7 @@ namespace VelaMediaLib {
 /// moves whole, its span and length kept. Undo gives back the animation tracks
 /// as they were; redo those the command made. Reports false when no
 /// animation moves (and for a clip kind without animation tracks).
-class VELAMEDIALIB_API AnimationTimeCmd : public Command {
+class VELAMEDIALIB_API AnimationTimeCmd : public ClipTimeCmd {
 public:
     bool execute(CommandHandler* handler) override;
     bool unexecute(CommandHandler* handler) override;
@@ -28,10 +28,6 @@ private:
     MediaImpl::AnimationTracks moved(const MediaImpl::AnimationTracks& tracks) const;
     void apply(const MediaImpl::AnimationTracks& tracks) const;
 
-    MediaPtr media_;
-    VelaTime time_;
-    VelaTime amount_;
-    bool extend_;
     MediaImpl::AnimationTracks before_;
     MediaImpl::AnimationTracks after_;
 };

@@ -46,8 +46,8 @@ protected:
 
 /// Lengthens a clip by `before` ticks at its start and `after` ticks at its
 /// end, playing more of its media there (a still simply stands longer). The
-/// content keeps its place on the clip: keyframes, animations and effects
-/// move later by `before` (Extend{Parameters,MediaAnimations,Effects}Cmd),
+/// content keeps its place on the media: the start trim (TrimStartCmd) moves
+/// keyframes, animations and effects later by `before` in the clip's ticks,
 /// and magnetized effects that reach an edge grow with it.
 /// Without ripple the clip grows into the time around it (its start earlier
 /// by `before`, its end later by `after`); a neighbour in the way refuses it.
@@ -72,8 +72,9 @@ private:
 
 /// Shortens a clip by `before` ticks at its start and `after` ticks at its
 /// end: the inverse of ExtendMediaCmd with the same arguments. Keyframes,
-/// animations and effects move earlier by `before` (what lay in the removed
-/// start stays before the clip's start, an effect wholly there goes).
+/// animations and effects move earlier by `before` in the clip's ticks (the
+/// start trim carries them; what lay in the removed start stays before the
+/// clip's start).
 /// Without ripple the clip's edges move in, leaving the time free; with
 /// ripple the clip keeps its start and everything after it moves earlier by
 /// before + after (the options' tracks lose the same time, which must be free

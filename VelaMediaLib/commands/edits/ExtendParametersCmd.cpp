@@ -5,10 +5,7 @@
 namespace VelaMediaLib {
 
 KeyframeTimeCmd::KeyframeTimeCmd(const MediaPtr& media, VelaTime time, VelaTime amount, bool extend)
-    : media_(media), time_(time), amount_(amount), extend_(extend) {
-    if (!media) throw VelaMediaLibException("no clip to move keyframes of");
-    if (amount < 0) throw ValueException<long long>("keyframe time amount must not be negative", amount);
-}
+    : ClipTimeCmd(media, time, amount, extend, "move keyframes of", "keyframe") {}
 
 std::vector<boost::shared_ptr<ParameterInterface>> KeyframeTimeCmd::parametersToMove() const {
     std::vector<boost::shared_ptr<ParameterInterface>> found;

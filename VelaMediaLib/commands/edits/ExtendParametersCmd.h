@@ -1,7 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
-#include <VelaMediaLib/commands/framework/Command.h>
+#include <VelaMediaLib/commands/edits/ClipTimeCmd.h>
 #include <VelaMediaLib/model/media/Media.h>
 
 #include <vector>
@@ -15,7 +15,7 @@ namespace VelaMediaLib {
 /// keyframe) those already moved go back and the KeyFrameException goes on,
 /// the clip as it was. Undo moves the same keyframes back by the same
 /// amount, which is exact. Reports false when no keyframe moves.
-class VELAMEDIALIB_API KeyframeTimeCmd : public Command {
+class VELAMEDIALIB_API KeyframeTimeCmd : public ClipTimeCmd {
 public:
     /// A time before every keyframe a clip can hold: from it, every keyframe
     /// moves (the content of a clip whose start is extended).
@@ -37,10 +37,6 @@ private:
     /// time a reduction removes.
     std::vector<boost::shared_ptr<ParameterInterface>> parametersToMove() const;
 
-    MediaPtr media_;
-    VelaTime time_;
-    VelaTime amount_;
-    bool extend_;
     std::vector<boost::shared_ptr<ParameterInterface>> moved_;
 };
 

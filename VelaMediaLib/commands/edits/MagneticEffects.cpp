@@ -52,11 +52,11 @@ boost::shared_ptr<Effectable::Effects> effectsFollowingEdge(const Effectable::Ef
     boost::shared_ptr<Effectable::Effects> moved;
     for (size_t i = 0; i < effects.size(); ++i) {
         const Effectable::EffectPtr& effect = effects[i];
+        if (!effect->hasTimeRange()) continue;
         const Range<VelaTime> local = effect->timeRange();
         const Range<VelaTime> next = movedRange(local, listed(followers, effect), before, after, startEdge);
         if (next == local) continue;
         const Effectable::EffectPtr replacement = effect->withTimeRange(next);
-        if (!replacement) continue; // a kind without a place of its own
         if (!moved) moved.reset(new Effectable::Effects(effects));
         (*moved)[i] = replacement;
     }

@@ -30,12 +30,11 @@ namespace {
 void cutEffects(Media& copy, VelaTime offset) {
     Effectable::Effects kept;
     for (const Effectable::EffectPtr& effect : copy.allEffects()) {
-        const Range<VelaTime> range = effect->timeRange();
-        const Effectable::EffectPtr moved = effect->withTimeRange(Range<VelaTime>(0, 0));
-        if (!moved) { // a kind without a place of its own covers the whole clip
+        if (!effect->hasTimeRange()) { // covers the whole clip
             kept.push_back(effect);
             continue;
         }
+        const Range<VelaTime> range = effect->timeRange();
         const VelaTime from = std::max<VelaTime>(range.start() - offset, 0);
         const VelaTime to = range.end() - offset;
         if (to > from) kept.push_back(effect->withTimeRange(Range<VelaTime>(from, to - from)));
