@@ -26,14 +26,6 @@ bool TransitionEditCmd::onTrack(const std::vector<MediaPtr>& clips) const {
                        [&](const MediaPtr& clip) { return clip && track_->hasMedia(clip); });
 }
 
-bool TransitionEditCmd::roomFor(const Media& clip, const TransitionPtr& in, const TransitionPtr& out) {
-    VelaTime used = in ? in->duration() : 0;
-    if (in && in->duration() < 0) return false;
-    for (const TransitionPtr& held : {clip.leftTransition(), clip.rightTransition()})
-        if (held && held != out && held != in) used += held->duration();
-    return used <= clip.duration();
-}
-
 boost::shared_ptr<AddTransitionCmd> AddTransitionCmd::create(const TrackPtr& track, const MediaPtr& media,
                                                              const TransitionPtr& transition, Side side) {
     const boost::shared_ptr<AddTransitionCmd> command(new AddTransitionCmd(track, media, transition, side));
@@ -60,11 +52,11 @@ bool AddTransitionCmd::fits(const Track& track, const MediaPtr& media, const Tra
     if (!media || !transition || !track.hasMedia(media) || transition->leftMedia() ||
         transition->rightMedia())
         return false;
-    if (slotOf(*media, side) || !roomFor(*media, transition, TransitionPtr())) return false;
+    if (slotOf(*media, side) || !Transition::roomFor(*media, transition, TransitionPtr())) return false;
     const MediaPtr neighbour = touchingOn(media, side);
     if (!neighbour) return true;
     const Side facing = side == Left ? Right : Left;
-    return !slotOf(*neighbour, facing) && roomFor(*neighbour, transition, TransitionPtr());
+    return !slotOf(*neighbour, facing) && Transition::roomFor(*neighbour, transition, TransitionPtr());
 }
 
 bool AddTransitionCmd::execute(CommandHandler*) {

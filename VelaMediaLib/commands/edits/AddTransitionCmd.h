@@ -15,9 +15,6 @@ class VELAMEDIALIB_API TransitionEditCmd : public Command {
 public:
     enum Side { Left, Right };
     bool unexecute(CommandHandler* handler) override;
-    /// Whether the clip, holding the transition `in` in the place of `out`
-    /// (either may be null), is still as long as its transitions together.
-    static bool roomFor(const Media& clip, const TransitionPtr& in, const TransitionPtr& out);
 
 protected:
     explicit TransitionEditCmd(const TrackPtr& track) : track_(track) {}

@@ -1,5 +1,7 @@
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 
+#include <VelaMediaLib/model/media/Transition.h>
+
 #include <algorithm>
 
 namespace VelaMediaLib {
@@ -13,12 +15,24 @@ void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, cons
     std::vector<MediaPtr> clips =
         track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media);
     clips.insert(clips.begin(), media);
-    for (const MediaPtr& clip : clips) {
-        clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
-        addLinks(clips_.back().left);
-        addLinks(clips_.back().right);
-    }
+    for (const MediaPtr& clip : clips) addSlots(clip, true);
+    // A clip elsewhere holding one of these transitions lets go when a clip
+    // here takes it, so its slots are given back too (its other transition's
+    // links are not touched by that).
+    const std::vector<Links> taken = links_;
+    for (const Links& links : taken)
+        for (const boost::weak_ptr<Media>& side : {links.left, links.right}) addSlots(side.lock(), false);
     if (links_.empty() && !always) clips_.clear(); // no transition around: nothing to join
+}
+
+void TransitionSlots::addSlots(const MediaPtr& clip, bool withLinks) {
+    if (!clip) return;
+    for (const Slots& slots : clips_)
+        if (slots.media.lock() == clip) return;
+    clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
+    if (!withLinks) return;
+    addLinks(clips_.back().left);
+    addLinks(clips_.back().right);
 }
 
 void TransitionSlots::addLinks(const TransitionPtr& transition) {
@@ -42,6 +56,20 @@ void TransitionSlots::restore() const {
         links.transition->setLeftMedia(links.left);
         links.transition->setRightMedia(links.right);
     }
+}
+
+bool TransitionSlots::standsAsTaken() const {
+    ScopedReadLock lock(token_);
+    for (const Slots& slots : clips_) {
+        const MediaPtr media = slots.media.lock();
+        if (!media || media->leftTransition() != slots.left || media->rightTransition() != slots.right)
+            return false;
+    }
+    for (const Links& links : links_)
+        if (links.transition->leftMedia() != links.left.lock() ||
+            links.transition->rightMedia() != links.right.lock())
+            return false;
+    return true;
 }
 
 CommandHandler& AtomicEditCmd::need(CommandHandler* handler) {
@@ -115,6 +143,9 @@ boost::shared_ptr<AddMediaCmd> AddMediaCmd::create(const TrackPtr& track, const 
 
 bool AddMediaCmd::execute(CommandHandler* handler) {
     need(handler);
+    // A clip whose transitions were lengthened while it was off the track is
+    // placed only with the room they need (an undo putting a clip back asks not).
+    if (media_ && media_->duration() < Transition::minimumTrackDuration(*media_)) return false;
     saveState(media_ ? Range<VelaTime>(amount_, media_->duration()) : Range<VelaTime>());
     return keep(handler->addMedia(track_, media_, amount_));
 }

@@ -23,6 +23,8 @@ public:
                     bool always = false);
     /// Puts back every slot, then every link, taken.
     void restore() const;
+    /// Whether every slot and link taken is still as it was.
+    bool standsAsTaken() const;
 
 private:
     struct Slots {
@@ -33,6 +35,7 @@ private:
         TransitionPtr transition;
         boost::weak_ptr<Media> left, right;
     };
+    void addSlots(const MediaPtr& clip, bool withLinks);
     void addLinks(const TransitionPtr& transition);
 
     boost::weak_ptr<const ThreadSafe> token_;
@@ -110,7 +113,8 @@ private:
 
 /// Places a clip on a track at a start tick; undone by removing it, the clip
 /// taking back the start it had before and, with its neighbours there, the
-/// transitions they had before placing joined them.
+/// transitions they had before placing joined them. A clip too short for the
+/// transitions it holds is refused (false).
 class VELAMEDIALIB_API AddMediaCmd : public AtomicEditCmd {
 public:
     static boost::shared_ptr<AddMediaCmd> create(const TrackPtr& track, const MediaPtr& media,

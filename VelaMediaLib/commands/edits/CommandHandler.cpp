@@ -1,6 +1,7 @@
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 
+#include <VelaMediaLib/model/media/Transition.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 
 namespace VelaMediaLib {
@@ -50,7 +51,14 @@ ProjectIndependentCommandHandler::trimMediaEnd(const TrackPtr& track, const Medi
 CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::stretchMedia(const TrackPtr& track,
                                                                              const MediaPtr& media,
                                                                              const SafeRational& factor) {
-    return attempt(track, media, [&] { track->stretch(media, factor); });
+    bool roomy = true;
+    const TrackAndMedia done = attempt(track, media, [&] {
+        // The clip's transitions keep their room, as a trim keeps it.
+        const VelaTime duration = media->trackRangeWithRationalStretch(factor).duration();
+        roomy = duration >= Transition::minimumTrackDuration(*media);
+        if (roomy) track->stretch(media, factor);
+    });
+    return roomy ? done : TrackAndMedia();
 }
 
 CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::restoreMediaState(const TrackPtr& track,

@@ -20,7 +20,8 @@ public:
     virtual TrackAndMedia moveMedia(const TrackPtr& track, const MediaPtr& media, VelaTime delta) = 0;
     virtual TrackAndMedia trimMediaStart(const TrackPtr& track, const MediaPtr& media, VelaTime delta) = 0;
     virtual TrackAndMedia trimMediaEnd(const TrackPtr& track, const MediaPtr& media, VelaTime delta) = 0;
-    /// Multiplies the clip's scalar by the factor.
+    /// Multiplies the clip's scalar by the factor; refused where the clip
+    /// would be left shorter than its transitions allow, as a trim is.
     virtual TrackAndMedia stretchMedia(const TrackPtr& track, const MediaPtr& media,
                                        const SafeRational& factor) = 0;
     /// Gives the clip a state it had before, exactly (no tolerance).
@@ -36,8 +37,9 @@ public:
 
 /// The handler for commands that need nothing of a project but its tracks:
 /// it carries the edits out on the tracks and answers a refused one (a
-/// collision, a trim past the limits, a stretch to nothing, a state the clip
-/// does not accept, a clip not on the track) with an empty pair.
+/// collision, a trim past the limits, a stretch to nothing or below the
+/// transitions' room, a state the clip does not accept, a clip not on the
+/// track) with an empty pair.
 class VELAMEDIALIB_API ProjectIndependentCommandHandler : public CommandHandler {
 public:
     TrackAndMedia moveMedia(const TrackPtr& track, const MediaPtr& media, VelaTime delta) override;

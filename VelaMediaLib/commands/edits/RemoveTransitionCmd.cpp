@@ -17,7 +17,7 @@ std::vector<MediaPtr> holders(const TransitionPtr& transition) {
 // Whether each clip has room for `in` standing where `out` stands.
 bool fitsOn(const std::vector<MediaPtr>& clips, const TransitionPtr& in, const TransitionPtr& out) {
     for (const MediaPtr& clip : clips)
-        if (!TransitionEditCmd::roomFor(*clip, in, out)) return false;
+        if (!Transition::roomFor(*clip, in, out)) return false;
     return true;
 }
 

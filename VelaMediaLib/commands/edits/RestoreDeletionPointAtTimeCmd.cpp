@@ -22,16 +22,14 @@ private:
     boost::shared_ptr<SplitCmd> split_;
 };
 
-// Both pieces on the track, touching, and as the split left them, every
-// transition slot included: undoing the split puts back the slots it saw, so
-// joining under a transition given since would drop it, and redoing the split
-// would leave the delete's own undo slots of a later time.
+// Both pieces on the track, touching, and as the split left them, with every
+// transition slot and link around them: undoing the split puts back the slots
+// and links it saw, so joining under a transition given or moved since would
+// drop it or leave a slot naming another clip.
 bool standsAsCut(const Track& track, const DeletionCuts::Cut& cut) {
     ScopedReadLock lock(track.projectLock());
     return track.hasMedia(cut.left) && track.hasMedia(cut.right) && cut.left->state() == cut.leftState &&
-           cut.right->state() == cut.rightState && cut.left->rightTransition() == cut.leftRight &&
-           cut.right->leftTransition() == cut.rightLeft && cut.left->leftTransition() == cut.leftLeft &&
-           cut.right->rightTransition() == cut.rightRight;
+           cut.right->state() == cut.rightState && cut.slots.standsAsTaken();
 }
 
 // The track's points once the point is restored: the later ones move right,

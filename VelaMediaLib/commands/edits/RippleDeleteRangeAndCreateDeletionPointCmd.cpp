@@ -72,9 +72,10 @@ bool RippleDeleteRangeAndCreateDeletionPointCmd::cutAt(const TrackPtr& track, Ve
     const boost::shared_ptr<SplitCmd> split = SplitCmd::create(track, time);
     if (!executeRequired(split)) return false;
     const MediaPtr right = split->getCreatedMedias().front();
-    cuts.cuts.push_back(DeletionCuts::Cut{split, left, right, left->state(), right->state(),
-                                          left->rightTransition(), right->leftTransition(),
-                                          left->leftTransition(), right->rightTransition()});
+    DeletionCuts::Cut cut{split, left, right, left->state(), right->state(), TransitionSlots()};
+    cut.slots.takeAround(*track, left,
+                         Range<VelaTime>(left->startTime(), right->endTime() - left->startTime()), true);
+    cuts.cuts.push_back(cut);
     return true;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <VelaMediaLib/base/Export.h>
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/framework/MultiCommand.h>
 #include <VelaMediaLib/model/timeline/DeletionPoint.h>
@@ -19,8 +20,9 @@ struct VELAMEDIALIB_API DeletionCuts : public VelaObject {
         boost::shared_ptr<SplitCmd> split;
         MediaPtr left, right;
         MediaState leftState, rightState;
-        TransitionPtr leftRight, rightLeft; // the facing slots
-        TransitionPtr leftLeft, rightRight; // the outer slots, which the split's undo puts back too
+        /// The slots and links around both pieces, which the split's undo
+        /// puts back as it saw them before the split.
+        TransitionSlots slots;
     };
     std::vector<Cut> cuts;
 };

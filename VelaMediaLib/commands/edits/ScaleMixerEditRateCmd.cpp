@@ -3,6 +3,8 @@
 #include <VelaMediaLib/commands/edits/ScaleMediaEditRateCmd.h>
 #include <VelaMediaLib/model/media/Transition.h>
 
+#include <algorithm>
+
 namespace VelaMediaLib {
 namespace {
 
@@ -15,6 +17,7 @@ public:
         saved_.clear();
         ScopedWriteLock lock(track_->projectMutex());
         for (const TransitionPtr& transition : track_->transitions()) {
+            if (!scaledHere(*transition)) continue;
             saved_.emplace_back(transition, transition->duration());
             transition->setDuration(scale_.tick(transition->duration()));
         }
@@ -27,8 +30,62 @@ public:
     }
 
 private:
+    // A transition whose clips were pulled onto two tracks is held on both:
+    // the track of its left clip scales it, so that it is scaled once.
+    bool scaledHere(const Transition& transition) const {
+        const MediaPtr left = transition.leftMedia();
+        const boost::shared_ptr<SubTimeline> parent =
+            left ? left->parent() : boost::shared_ptr<SubTimeline>();
+        return !parent || parent.get() == static_cast<const SubTimeline*>(track_.get());
+    }
+
     TrackPtr track_;
     EditRateScale scale_;
+    std::vector<std::pair<TransitionPtr, VelaTime>> saved_;
+};
+
+/// After the clips and their transitions were rounded to ticks each on their
+/// own, a clip that had room for its transitions may be a tick short of it:
+/// the longer one gives up the ticks missing. Going to the finer rate and back
+/// rounds the shortened transition to its old length again (one tick is less
+/// than half of the two a tick becomes there). A clip that had no room before
+/// (as a document may give it) is left as it is.
+class FitTransitionsStep : public Command {
+public:
+    /// Made before the change, to know which clips have room.
+    explicit FitTransitionsStep(const TrackPtr& track) : track_(track) {
+        for (const MediaPtr& clip : track->medias())
+            if (clip->duration() >= Transition::minimumTrackDuration(*clip)) roomy_.push_back(clip);
+    }
+
+    bool execute(CommandHandler*) override {
+        saved_.clear();
+        ScopedWriteLock lock(track_->projectMutex());
+        for (const MediaPtr& clip : roomy_) fit(*clip);
+        return true;
+    }
+    bool unexecute(CommandHandler*) override {
+        ScopedWriteLock lock(track_->projectMutex());
+        for (auto entry = saved_.rbegin(); entry != saved_.rend(); ++entry)
+            entry->first->setDuration(entry->second);
+        return true;
+    }
+
+private:
+    void fit(const Media& clip) {
+        for (VelaTime missing = Transition::minimumTrackDuration(clip) - clip.duration(); missing > 0;) {
+            const TransitionPtr left = clip.leftTransition(), right = clip.rightTransition();
+            const TransitionPtr longer =
+                !right || (left && left->duration() >= right->duration()) ? left : right;
+            const VelaTime taken = std::min(missing, longer->duration());
+            saved_.emplace_back(longer, longer->duration());
+            longer->setDuration(longer->duration() - taken);
+            missing -= taken;
+        }
+    }
+
+    TrackPtr track_;
+    std::vector<MediaPtr> roomy_;
     std::vector<std::pair<TransitionPtr, VelaTime>> saved_;
 };
 
@@ -38,6 +95,7 @@ void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRat
     if (!track || scale.isIdentity()) return;
     const std::vector<MediaPtr> clips = track->medias();
     const std::vector<MediaState> states = scale.trackStates(clips);
+    const CommandPtr fit(new FitTransitionsStep(track));
     std::vector<bool> later;
     for (size_t i = 0; i < clips.size(); ++i) later.push_back(states[i].start > clips[i]->startTime());
     into.execute(CommandPtr(new ScaleTransitionsStep(track, scale)));
@@ -49,6 +107,7 @@ void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRat
         if (later[i]) scaleClip(i);
     for (size_t i = 0; i < clips.size(); ++i)
         if (!later[i]) scaleClip(i);
+    into.execute(fit);
 }
 
 boost::shared_ptr<ScaleMixerEditRateCmd> ScaleMixerEditRateCmd::create(const MixerPtr& mixer,

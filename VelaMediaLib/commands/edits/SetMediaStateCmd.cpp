@@ -1,5 +1,7 @@
 #include <VelaMediaLib/commands/edits/SetMediaStateCmd.h>
 
+#include <VelaMediaLib/model/media/Transition.h>
+
 namespace VelaMediaLib {
 
 boost::shared_ptr<SetMediaStateCmd> SetMediaStateCmd::create(const MediaPtr& media, const MediaState& state) {
@@ -13,6 +15,13 @@ boost::shared_ptr<SetMediaStateCmd> SetMediaStateCmd::create(const TrackPtr& tra
     return command;
 }
 
+boost::shared_ptr<SetMediaStateCmd>
+SetMediaStateCmd::createRounded(const TrackPtr& track, const MediaPtr& media, const MediaState& state) {
+    const boost::shared_ptr<SetMediaStateCmd> command = create(track, media, state);
+    command->keepRoom_ = false;
+    return command;
+}
+
 bool SetMediaStateCmd::execute(CommandHandler* handler) {
     need(handler);
     if (!media_) return false;
@@ -22,7 +31,7 @@ bool SetMediaStateCmd::execute(CommandHandler* handler) {
             track_ = boost::dynamic_pointer_cast<Track>(parent);
         });
     }
-    if (!track_) return false;
+    if (!track_ || (keepRoom_ && state_.duration < Transition::minimumTrackDuration(*media_))) return false;
     saveState();
     return keep(handler->restoreMediaState(track_, media_, state_));
 }

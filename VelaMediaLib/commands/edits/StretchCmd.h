@@ -7,10 +7,11 @@ namespace VelaMediaLib {
 
 /// Gives a clip a new scalar on the track it stands on: the same media range
 /// plays faster or slower, the duration following. Undo gives back the exact
-/// state; a clip on no track, or one the stretch would leave without a tick,
-/// refuses (false). Redo gives back the exact state the stretch gave. Two
-/// stretches of the same clip in a row combine into one undo step: undone
-/// to the first one's state, redone to the second one's, with its scalar.
+/// state; a clip on no track, or one the stretch would leave without a tick
+/// or shorter than its transitions allow, refuses (false). Redo gives back
+/// the exact state the stretch gave. Two stretches of the same clip in a row
+/// combine into one undo step: undone to the first one's state, redone to
+/// the second one's, with its scalar.
 class VELAMEDIALIB_API StretchCmd : public AtomicEditCmd {
 public:
     /// Throws ValueException<double> "a clip's scalar must be above zero".

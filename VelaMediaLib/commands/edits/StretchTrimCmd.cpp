@@ -1,5 +1,7 @@
 #include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
 
+#include <VelaMediaLib/model/media/Transition.h>
+
 namespace VelaMediaLib {
 
 // The slice stays; the new scalar is the new length over the slice's, so the
@@ -13,6 +15,7 @@ bool StretchTrimCmd::execute(CommandHandler* handler) {
     if (amount_ >= saved_.duration || amount_ < -kLongest || saved_.mediaDuration <= SafeRational(0))
         return false;
     const VelaTime duration = saved_.duration - amount_;
+    if (duration < Transition::minimumTrackDuration(*media_)) return false; // as a trim keeps it
     MediaState next = saved_;
     next.duration = duration;
     next.scalar = SafeRational(duration) / saved_.mediaDuration;

@@ -9,8 +9,9 @@ namespace VelaMediaLib {
 /// slice of media: the scalar changes so that the slice fills the new length
 /// exactly, and the other edge stays where it is. A positive delta shortens
 /// the clip (it plays faster). Refused (false) for a clip on no track, one
-/// the delta would leave without a tick, a collision, or a clip whose limits
-/// do not take the new state. Undo and redo give back the exact states.
+/// the delta would leave without a tick or shorter than its transitions
+/// allow, a collision, or a clip whose limits do not take the new state.
+/// Undo and redo give back the exact states.
 class VELAMEDIALIB_API StretchTrimCmd : public AtomicEditCmd {
 public:
     bool execute(CommandHandler* handler) override;

@@ -1,6 +1,7 @@
 #include <VelaMediaLib/model/media/RationalMediaEditor.h>
 
 #include <VelaMediaLib/model/media/MediaImpl.h>
+#include <VelaMediaLib/model/media/Transition.h>
 #include <VelaMediaLib/time/rational/RationalUtil.h>
 #include <VelaMediaLib/base/VelaMediaLibException.h>
 
@@ -12,11 +13,7 @@ SafeRational RationalMediaEditor::snap(const SafeRational& x, const SafeRational
     return abs(x - b) < SafeRational(1, 10000) ? b : x;
 }
 
-VelaTime RationalMediaEditor::minimumTrackDuration() const {
-    const TransitionPtr left = clip_.leftTransition(), right = clip_.rightTransition();
-    const VelaTime sum = (left ? left->duration() : 0) + (right ? right->duration() : 0);
-    return sum - 1 > 0 ? sum - 1 : 0;
-}
+VelaTime RationalMediaEditor::minimumTrackDuration() const { return Transition::minimumTrackDuration(clip_); }
 
 MediaState RationalMediaEditor::move(const MediaState& state, VelaTime offset) const {
     MediaState moved = state;

@@ -14,9 +14,25 @@ void Transition::mergeMediaPairTransitions(
     if (!earlier || !later || earlier->endTime() != later->startTime()) return;
     const TransitionPtr shared =
         earlier->rightTransition() ? earlier->rightTransition() : later->leftTransition();
-    if (!shared) return;
+    if (!shared || !roomFor(*earlier, shared, earlier->rightTransition()) ||
+        !roomFor(*later, shared, later->leftTransition()))
+        return;
     earlier->setRightTransition(shared);
     later->setLeftTransition(shared);
+}
+
+bool Transition::roomFor(const Media& clip, const TransitionPtr& in, const TransitionPtr& out) {
+    if (in && in->duration() < 0) return false;
+    VelaTime used = in ? in->duration() : 0;
+    for (const TransitionPtr& held : {clip.leftTransition(), clip.rightTransition()})
+        if (held && held != out && held != in) used += held->duration();
+    return used <= clip.duration();
+}
+
+VelaTime Transition::minimumTrackDuration(const Media& clip) {
+    const TransitionPtr left = clip.leftTransition(), right = clip.rightTransition();
+    const VelaTime sum = (left ? left->duration() : 0) + (right ? right->duration() : 0);
+    return sum - 1 > 0 ? sum - 1 : 0;
 }
 
 namespace {

@@ -44,9 +44,22 @@ public:
 
     /// Joins the transition that two touching clips share again: when the
     /// earlier clip has a right transition (or else the later one a left one),
-    /// both clips take it. A pair that does not touch is left alone.
+    /// both clips take it, and a clip that held it on that side elsewhere lets
+    /// go. A pair that does not touch is left alone, and so is one where either
+    /// clip would be left shorter than its transitions together.
     static void
     mergeMediaPairTransitions(const std::pair<boost::shared_ptr<Media>, boost::shared_ptr<Media>>& pair);
+
+    /// Whether the clip, holding the transition `in` in the place of `out`
+    /// (either may be null), is still as long as its transitions together.
+    /// Every edit that puts a transition on a clip asks this; a trim may
+    /// later take one tick more (the temporal editor's minimum).
+    static bool roomFor(const Media& clip, const boost::shared_ptr<Transition>& in,
+                        const boost::shared_ptr<Transition>& out);
+    /// The shortest track duration the clip's transitions allow: both lengths
+    /// together less one tick, never negative. Trims, stretches and states
+    /// set on a clip keep at least this.
+    static VelaTime minimumTrackDuration(const Media& clip);
 
     boost::shared_ptr<Transition> clone() const {
         const boost::shared_ptr<Transition> copy(new Transition(name_, duration_));

@@ -98,7 +98,7 @@ private:
     void violation(const std::string& what, const std::string& kind = std::string()) {
         const Violation found{options_.seed, step_, what, kind};
         faults_ += kind.empty();
-        (options_.tolerated.count(kind) ? result_.tolerated : result_.violations).push_back(found);
+        result_.violations.push_back(found);
     }
     // A broken invariant is reported as it appears, not again at every step
     // it stays broken (told apart by what broke where, not the clip's range).

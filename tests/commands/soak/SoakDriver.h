@@ -119,13 +119,14 @@ SoakState buildSoakProject(Random& random);
 /// track (the mixer's and the groups', at any depth) clips in start order,
 /// not overlapping, each with the track as its parent, the time queries
 /// agreeing with the clips; every transition slot and its transition's link
-/// naming each other; a clip at least as long as its transitions together;
+/// naming each other; a clip at least as long as its transitions together
+/// less the one tick a trim may take;
 /// every clip's media inside its limits. With `packed`, a magnetic track of
 /// the mixer has no gap (after an edit; an undo of one step may leave one).
 std::string invariantViolations(const SoakState& state, bool packed);
 
 /// The kind of a broken invariant, by what the checker says: "room" (a clip
-/// shorter than its transitions), "link" (a transition slot and its
+/// too short for its transitions), "link" (a transition slot and its
 /// transition's link naming different clips), or "" for every other rule.
 std::string kindOf(const std::string& broken);
 
@@ -145,9 +146,6 @@ struct SoakOptions {
     /// may be beyond telling more); the named kinds are each reported as they
     /// appear and do not end it.
     size_t maxViolations = 20;
-    /// Kinds of broken invariants (see kindOf) kept apart as known findings
-    /// rather than counted as violations.
-    std::set<std::string> tolerated;
     /// Where to write a line for each edit, if anywhere.
     std::ostream* trace = nullptr;
 };
@@ -156,7 +154,6 @@ struct SoakResult {
     long long edits = 0, applied = 0, refused = 0, thrown = 0, undone = 0;
     std::map<std::string, long long> appliedByFamily, refusedByFamily;
     std::vector<Violation> violations;
-    std::vector<Violation> tolerated; // of the kinds the options tolerate
 };
 
 /// Runs the edits from a fresh project, then undoes everything and redoes it.

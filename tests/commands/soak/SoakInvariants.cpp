@@ -83,8 +83,9 @@ private:
             out_ << what << ": its left transition names another clip; ";
         if (right && right->leftMedia().get() != &clip)
             out_ << what << ": its right transition names another clip; ";
+        // A trim may leave a clip one tick shorter than its transitions together.
         const VelaTime together = (left ? left->duration() : 0) + (right ? right->duration() : 0);
-        if (together > clip.duration())
+        if (together - 1 > clip.duration())
             out_ << what << ": shorter (" << clip.duration() << ") than its transitions (" << together
                  << "); ";
         if ((left && left->duration() < 0) || (right && right->duration() < 0))

@@ -84,6 +84,21 @@ bool StitchPartsCmd::unexecute(CommandHandler*) {
     return true;
 }
 
+namespace {
+
+VelaTime lengthOf(const TransitionPtr& transition) { return transition ? transition->duration() : 0; }
+
+// Whether the end parts, placed, keep the room the stitched clip's transitions
+// need (a tick less than their length, as a trimmed clip keeps).
+bool endsHaveRoom(const MediaPtr& first, const MediaPtr& last, const TransitionPtr& left,
+                  const TransitionPtr& right) {
+    if (first == last) return lengthOf(left) + lengthOf(right) - 1 <= first->duration();
+    return lengthOf(left) + lengthOf(first->rightTransition()) - 1 <= first->duration() &&
+           lengthOf(last->leftTransition()) + lengthOf(right) - 1 <= last->duration();
+}
+
+} // namespace
+
 bool UnstitchPartsCmd::execute(CommandHandler*) {
     placements_ = stitched_->placementsWherePlayed();
     if (placements_.empty())
@@ -99,6 +114,10 @@ bool UnstitchPartsCmd::execute(CommandHandler*) {
     try {
         for (const StitchedMedia::Placement& placement : placements_)
             restoreExactly(placement.media, placement.state);
+        if (!endsHaveRoom(placements_.front().media, placements_.back().media, left, right)) {
+            putBack();
+            return false;
+        }
         stitched_->setLeftTransition(TransitionPtr());
         stitched_->setRightTransition(TransitionPtr());
         placements_.front().media->setLeftTransition(left);

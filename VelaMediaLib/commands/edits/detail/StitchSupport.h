@@ -56,7 +56,9 @@ private:
 /// Takes the parts out of a stitched media taken off its track, each part it
 /// plays given the state that plays on that track what the stitched media
 /// played of it (the stitched media's edge transitions go to the first and
-/// last of them). Undone, the parts are back inside as they were.
+/// last of them). Refused (false, nothing changed) where an end part would be
+/// too short for the transition it takes. Undone, the parts are back inside
+/// as they were.
 class UnstitchPartsCmd : public Command {
 public:
     explicit UnstitchPartsCmd(const boost::shared_ptr<StitchedMedia>& stitched) : stitched_(stitched) {}

@@ -1,0 +1,125 @@
+// The two rules every edit keeps for transitions: a transition has one clip on
+// each side, and that clip holds it (its link and the clip's slot name each
+// other); a clip keeps room for its transitions, at least their lengths
+// together less one tick.
+#include "EditTestSupport.h"
+
+#include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
+#include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
+#include <VelaMediaLib/commands/edits/SetMediaStateCmd.h>
+#include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
+#include <VelaMediaLib/commands/edits/StretchCmd.h>
+#include <VelaMediaLib/commands/edits/StretchTrimCmd.h>
+#include <VelaMediaLib/commands/edits/TrimCmd.h>
+#include <VelaMediaLib/commands/edits/UnstitchMediaCmd.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
+
+using namespace VelaMediaLib;
+using namespace VelaMediaLib::testing;
+
+namespace {
+
+class TransitionRoom : public EditTest {
+protected:
+    TransitionPtr put(const MediaPtr& media, VelaTime length, TransitionEditCmd::Side side) {
+        const TransitionPtr made = transition();
+        made->setDuration(length);
+        EXPECT_TRUE(project->execute(AddTransitionCmd::create(track, media, made, side)));
+        return made;
+    }
+};
+
+// b is pulled away from a, both keeping their shared transition; c placed
+// against a takes it over, and b lets go. Undo gives b its slot back.
+TEST_F(TransitionRoom, AClipTakingAHeldTransitionOverLeavesNoSlotBehind) {
+    const MediaPtr a = place(0, 10), b = place(10, 10);
+    const TransitionPtr shared = put(a, 4, TransitionEditCmd::Right);
+    ASSERT_EQ(b->leftTransition(), shared);
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, b, 10)));
+    ASSERT_EQ(b->leftTransition(), shared); // pulled apart, both hold it
+
+    const MediaPtr c = clip(10);
+    expectExactDocumentUndo(AddMediaCmd::create(track, c, 10));
+    EXPECT_EQ(c->leftTransition(), shared);
+    EXPECT_EQ(shared->rightMedia(), c);
+    EXPECT_FALSE(b->leftTransition());
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(b->leftTransition(), shared);
+    EXPECT_EQ(shared->rightMedia(), b);
+    EXPECT_EQ(shared->leftMedia(), a);
+}
+
+// Placing a clip too short for the transition of its neighbour leaves both
+// as they were; a clip holding transitions longer than it allows is refused.
+TEST_F(TransitionRoom, PlacingJoinsOnlyWhereBothClipsHaveRoom) {
+    const MediaPtr a = place(0, 20);
+    const TransitionPtr fade = put(a, 8, TransitionEditCmd::Right);
+    const MediaPtr shortOne = place(20, 5);
+    EXPECT_FALSE(shortOne->leftTransition());
+    EXPECT_EQ(fade->leftMedia(), a);
+    EXPECT_FALSE(fade->rightMedia());
+
+    const MediaPtr loose = clip(4);
+    loose->setLeftTransition(TransitionPtr(new Transition("long", 6)));
+    expectRefusedDocument(AddMediaCmd::create(track, loose, 40));
+}
+
+// A clip with 6-tick transitions on both edges keeps 11 ticks: a trim may
+// leave that much, and no stretch, stretch trim or set state leaves less.
+TEST_F(TransitionRoom, StretchesAndStatesKeepTheRoomATrimKeeps) {
+    const MediaPtr a = place(0, 20);
+    put(a, 6, TransitionEditCmd::Left);
+    put(a, 6, TransitionEditCmd::Right);
+    expectRefusedDocument(StretchCmd::create(a, SafeRational(1, 2)));
+    expectRefusedDocument(StretchTrimEndCmd::create(a, 10));
+    expectRefusedDocument(StretchTrimStartCmd::create(a, 10));
+    MediaState tooShort = a->state();
+    tooShort.duration = 10;
+    tooShort.mediaDuration = SafeRational(10);
+    expectRefusedDocument(SetMediaStateCmd::create(a, tooShort));
+    expectRefusedDocument(TrimEndCmd::create(track, a, 10));
+    expectExactDocumentUndo(StretchTrimEndCmd::create(a, 9));
+    ASSERT_TRUE(project->undo());
+    expectExactDocumentUndo(TrimEndCmd::create(track, a, 9));
+    EXPECT_EQ(a->duration(), 11);
+}
+
+// The trim left the clip at its least: the finer rate rounds each length on
+// its own, and the longer transition gives the missing tick back; the way
+// back lands on the same ticks.
+TEST_F(TransitionRoom, AnEditRateChangeFitsTheTransitionsAndGoesBackExactly) {
+    const MediaPtr a = place(0, 20);
+    const TransitionPtr left = put(a, 6, TransitionEditCmd::Left),
+                        right = put(a, 6, TransitionEditCmd::Right);
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, a, 9)));
+    const std::string atThirty = document();
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
+    EXPECT_EQ(a->duration(), 22);
+    EXPECT_EQ(left->duration() + right->duration(), 23);
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(30, 1)));
+    EXPECT_EQ(document(), atThirty);
+}
+
+// A transition whose clips stand on two tracks is held on both: a rate
+// change scales it once.
+TEST_F(TransitionRoom, ATransitionOnTwoTracksIsScaledOnce) {
+    const MediaPtr a = place(0, 20);
+    const TransitionPtr fade = put(a, 6, TransitionEditCmd::Right);
+    const MediaPtr b = clip(20);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(newTrack(), b, 20)));
+    b->setLeftTransition(fade);
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60, 1)));
+    EXPECT_EQ(fade->duration(), 12);
+}
+
+// The stitched clip's transitions go to its end parts only where they fit.
+TEST_F(TransitionRoom, UnstitchingRefusesAnEndPartTooShortForItsTransition) {
+    const MediaPtr a = place(0, 10), b = place(10, 10);
+    const auto stitch = StitchMediaCmd::create(track, {a, b});
+    ASSERT_TRUE(project->execute(stitch));
+    const MediaPtr stitched = stitch->stitchedMedia();
+    put(stitched, 15, TransitionEditCmd::Left);
+    expectRefusedDocument(UnstitchMediaCmd::create(track, stitched));
+}
+
+} // namespace
