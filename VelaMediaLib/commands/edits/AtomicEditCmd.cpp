@@ -15,14 +15,26 @@ void TransitionSlots::takeAround(const Track& track, const MediaPtr& media, cons
     std::vector<MediaPtr> clips =
         track.mediasIntersectingRange(Range<VelaTime>(range.start() - 1, range.duration() + 2), media);
     clips.insert(clips.begin(), media);
+    takeLocked(clips);
+    if (links_.empty() && !always) clips_.clear(); // no transition around: nothing to join
+}
+
+void TransitionSlots::take(const std::vector<MediaPtr>& clips) {
+    *this = TransitionSlots();
+    if (clips.empty()) return;
+    token_ = clips.front()->projectMutex();
+    ScopedReadLock lock(token_);
+    takeLocked(clips);
+}
+
+// A clip elsewhere holding one of these transitions lets go when a clip here
+// takes it, so its slots are given back too (its other transition's links
+// are not touched by that).
+void TransitionSlots::takeLocked(const std::vector<MediaPtr>& clips) {
     for (const MediaPtr& clip : clips) addSlots(clip, true);
-    // A clip elsewhere holding one of these transitions lets go when a clip
-    // here takes it, so its slots are given back too (its other transition's
-    // links are not touched by that).
     const std::vector<Links> taken = links_;
     for (const Links& links : taken)
         for (const boost::weak_ptr<Media>& side : {links.left, links.right}) addSlots(side.lock(), false);
-    if (links_.empty() && !always) clips_.clear(); // no transition around: nothing to join
 }
 
 void TransitionSlots::addSlots(const MediaPtr& clip, bool withLinks) {

@@ -21,6 +21,8 @@ public:
     /// there); an edit that sets slots itself keeps them always.
     void takeAround(const Track& track, const MediaPtr& media, const Range<VelaTime>& range,
                     bool always = false);
+    /// Takes the given clips (all of one project), whatever they hold.
+    void take(const std::vector<MediaPtr>& clips);
     /// Puts back every slot, then every link, taken.
     void restore() const;
     /// Whether every slot and link taken is still as it was.
@@ -35,6 +37,7 @@ private:
         TransitionPtr transition;
         boost::weak_ptr<Media> left, right;
     };
+    void takeLocked(const std::vector<MediaPtr>& clips);
     void addSlots(const MediaPtr& clip, bool withLinks);
     void addLinks(const TransitionPtr& transition);
 

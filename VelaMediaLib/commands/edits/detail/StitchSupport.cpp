@@ -12,41 +12,6 @@ void restoreExactly(const MediaPtr& media, const MediaState& state) {
                                         state.duration));
 }
 
-void SlotRecord::take(const std::vector<MediaPtr>& clips) {
-    *this = SlotRecord();
-    for (const MediaPtr& clip : clips) {
-        clips_.push_back(Slots{clip, clip->leftTransition(), clip->rightTransition()});
-        addLinks(clips_.back().left);
-        addLinks(clips_.back().right);
-    }
-}
-
-void SlotRecord::addLinks(const TransitionPtr& transition) {
-    if (!transition) return;
-    for (const Links& links : links_)
-        if (links.transition == transition) return;
-    links_.push_back(Links{transition, transition->leftMedia(), transition->rightMedia()});
-}
-
-void SlotRecord::restore() const {
-    for (const Slots& slots : clips_) {
-        if (slots.media->leftTransition() != slots.left) slots.media->setLeftTransition(slots.left);
-        if (slots.media->rightTransition() != slots.right) slots.media->setRightTransition(slots.right);
-    }
-    if (clips_.empty()) return;
-    ScopedWriteLock lock(clips_.front().media->projectMutex());
-    for (const Links& links : links_) {
-        links.transition->setLeftMedia(links.left);
-        links.transition->setRightMedia(links.right);
-    }
-}
-
-} // namespace detail
-} // namespace VelaMediaLib
-
-namespace VelaMediaLib {
-namespace detail {
-
 bool StitchPartsCmd::execute(CommandHandler*) {
     partStates_.clear();
     for (const MediaPtr& part : parts_) partStates_.push_back(part->state());

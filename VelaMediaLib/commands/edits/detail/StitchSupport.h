@@ -3,6 +3,7 @@
 // stitched media: they act on the stitched media directly (its internal track
 // is no track of the project) and undo by giving back exact states.
 
+#include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/framework/Command.h>
 #include <VelaMediaLib/model/media/StitchedMedia.h>
 
@@ -10,28 +11,6 @@
 
 namespace VelaMediaLib {
 namespace detail {
-
-/// The transition slots of some clips and the links of their transitions, as
-/// they were: setting a slot moves links, so links go back last.
-class SlotRecord {
-public:
-    void take(const std::vector<MediaPtr>& clips);
-    void restore() const;
-
-private:
-    struct Slots {
-        MediaPtr media;
-        TransitionPtr left, right;
-    };
-    struct Links {
-        TransitionPtr transition;
-        MediaPtr left, right;
-    };
-    void addLinks(const TransitionPtr& transition);
-
-    std::vector<Slots> clips_;
-    std::vector<Links> links_;
-};
 
 /// Gives clips taken off their track to the stitched media as its parts; the
 /// first part's left and the last part's right transition go to the
@@ -50,7 +29,7 @@ private:
     std::vector<MediaPtr> parts_;
     std::vector<MediaState> partStates_;
     MediaState stitchedState_;
-    SlotRecord slots_;
+    TransitionSlots slots_;
 };
 
 /// Takes the parts out of a stitched media taken off its track, each part it
@@ -74,7 +53,7 @@ private:
     std::vector<MediaPtr> parts_;
     std::vector<MediaState> partStates_;
     std::vector<StitchedMedia::Placement> placements_;
-    SlotRecord slots_;
+    TransitionSlots slots_;
 };
 
 /// A restore that allows the rounding the state already has.
