@@ -6,6 +6,8 @@
 
 #include <VelaMediaLib/commands/edits/AddTransitionCmd.h>
 #include <VelaMediaLib/commands/edits/ChangeProjectEditRateCmd.h>
+#include <VelaMediaLib/commands/edits/RestoreDeletionPointAtTimeCmd.h>
+#include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 #include <VelaMediaLib/commands/edits/SetMediaStateCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
 #include <VelaMediaLib/commands/edits/StretchCmd.h>
@@ -110,6 +112,63 @@ TEST_F(TransitionRoom, ATransitionOnTwoTracksIsScaledOnce) {
     b->setLeftTransition(fade);
     ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60, 1)));
     EXPECT_EQ(fade->duration(), 12);
+}
+
+// The transition's right clip stands on the first track, its left clip on
+// the second: it is scaled once, and only then fitted.
+TEST_F(TransitionRoom, ATransitionOnTwoTracksIsFittedAfterItIsScaled) {
+    const auto upper = newTrack();
+    const MediaPtr l = clip(20), r = clip(20), n = clip(20);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, l, 0)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, r, 20)));
+    const TransitionPtr cross = transition();
+    cross->setDuration(6);
+    ASSERT_TRUE(project->execute(AddTransitionCmd::create(upper, l, cross, TransitionEditCmd::Right)));
+    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(upper, r)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, r, 20)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, n, 40)));
+    const TransitionPtr local = put(r, 6, TransitionEditCmd::Right);
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, r, 9)));
+    const std::string atThirty = document();
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
+    EXPECT_EQ(r->duration(), 22);
+    EXPECT_EQ(cross->duration() + local->duration(), 23);
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(15, 1)));
+    EXPECT_EQ(cross->duration(), 3); // 6 → 12 → 11 (fitted) → 3: halved once
+    ASSERT_TRUE(project->undo());
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(document(), atThirty);
+}
+
+// A cut whose pieces stand as the delete left them is joined again; a clip
+// between a transition's pulled-apart clips keeps the transition it was
+// given since, and the restore's undo needs no room the trims gave up.
+TEST_F(TransitionRoom, RestoringADeletionPointLeavesOtherClipsTransitionsAlone) {
+    const MediaPtr p = place(0, 20), n = place(20, 10);
+    const TransitionPtr t = put(p, 4, TransitionEditCmd::Right);
+    ASSERT_TRUE(project->execute(MoveCmd::create(track, n, 20))); // both keep t
+    const MediaPtr m = place(25, 10);
+    const auto cut = RippleDeleteRangeAndCreateDeletionPointCmd::create(Range<VelaTime>(5, 3));
+    cut->addTrack(track);
+    ASSERT_TRUE(project->execute(cut));
+    const TransitionPtr x = put(m, 2, TransitionEditCmd::Left);
+    const auto restore = RestoreDeletionPointAtTimeCmd::create(5);
+    restore->addTrack(track);
+    expectExactDocumentUndo(restore);
+    EXPECT_EQ(m->leftTransition(), x);
+    EXPECT_EQ(n->leftTransition(), t);
+}
+
+TEST_F(TransitionRoom, UndoingARestoreAsksForNoRoom) {
+    const MediaPtr p = place(0, 20), n = place(20, 10);
+    put(p, 4, TransitionEditCmd::Right);
+    const auto cut = RippleDeleteRangeAndCreateDeletionPointCmd::create(Range<VelaTime>(5, 3));
+    cut->addTrack(track);
+    ASSERT_TRUE(project->execute(cut));
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, n, 7))); // 3 ticks for 4: a trim allows it
+    const auto restore = RestoreDeletionPointAtTimeCmd::create(5);
+    restore->addTrack(track);
+    expectExactDocumentUndo(restore);
 }
 
 // The stitched clip's transitions go to its end parts only where they fit.

@@ -9,14 +9,19 @@ bool TransitionEditCmd::unexecute(CommandHandler*) {
     return true;
 }
 
+bool TransitionEditCmd::reexecute(CommandHandler*) {
+    after_.restore();
+    return true;
+}
+
 void TransitionEditCmd::saveSlots(const std::vector<MediaPtr>& clips) {
-    VelaTime from = 0, to = 0;
-    for (size_t i = 0; i < clips.size(); ++i) {
-        const Range<VelaTime> range = clips[i]->trackRange();
-        from = i ? std::min(from, range.start()) : range.start();
-        to = i ? std::max(to, range.end()) : range.end();
-    }
-    slots_.takeAround(*track_, clips.front(), Range<VelaTime>(from, to - from), true);
+    saved_ = clips;
+    slots_.take(clips);
+}
+
+bool TransitionEditCmd::done() {
+    after_.take(saved_);
+    return true;
 }
 
 bool TransitionEditCmd::onTrack(const std::vector<MediaPtr>& clips) const {
@@ -72,7 +77,7 @@ bool AddTransitionCmd::execute(CommandHandler*) {
         media_->setRightTransition(transition_);
         if (neighbour) neighbour->setLeftTransition(transition_);
     }
-    return true;
+    return done();
 }
 
 boost::shared_ptr<AddTransitionToMediasCmd>

@@ -15,17 +15,23 @@ class VELAMEDIALIB_API TransitionEditCmd : public Command {
 public:
     enum Side { Left, Right };
     bool unexecute(CommandHandler* handler) override;
+    /// Puts back the slots and links the edit gave, exactly and asking for
+    /// no room: a redo follows the undo of the same edit.
+    bool reexecute(CommandHandler* handler) override;
 
 protected:
     explicit TransitionEditCmd(const TrackPtr& track) : track_(track) {}
-    /// Takes the slots of the clips touching the range the clips span.
+    /// Takes the slots of the clips (and of the clips their transitions name).
     void saveSlots(const std::vector<MediaPtr>& clips);
+    /// Takes the same slots as the edit left them, for the redo; true.
+    bool done();
     /// Whether every clip is on the track (held under one read lock).
     bool onTrack(const std::vector<MediaPtr>& clips) const;
     TrackPtr track_;
 
 private:
-    TransitionSlots slots_;
+    std::vector<MediaPtr> saved_;
+    TransitionSlots slots_, after_;
 };
 
 /// Puts a transition on one edge of a clip of the track. Where a clip

@@ -43,7 +43,7 @@ bool RemoveTransitionCmd::execute(CommandHandler*) {
     if (clips.empty() || !onTrack(clips)) return false;
     saveSlots(clips);
     replaceIn(clips, transition_, TransitionPtr());
-    return true;
+    return done();
 }
 
 boost::shared_ptr<ReplaceTransitionCmd> ReplaceTransitionCmd::create(const TrackPtr& track,
@@ -62,7 +62,7 @@ bool ReplaceTransitionCmd::execute(CommandHandler*) {
         return false;
     saveSlots(clips);
     replaceIn(clips, transition_, replacement_);
-    return true;
+    return done();
 }
 
 boost::shared_ptr<SplitTransitionCmd> SplitTransitionCmd::create(const TrackPtr& track,
@@ -79,7 +79,7 @@ bool SplitTransitionCmd::execute(CommandHandler*) {
     saveSlots(clips);
     if (!copy_) copy_ = transition_->clone();
     clips[1]->setLeftTransition(copy_);
-    return true;
+    return done();
 }
 
 boost::shared_ptr<TrimTransitionCmd>
@@ -91,27 +91,31 @@ TrimTransitionCmd::create(const TrackPtr& track, const TransitionPtr& transition
 
 // A transition's length is read under the project's lock by the clips'
 // queries, so it changes under the write lock; the clips tell of it.
-bool TrimTransitionCmd::execute(CommandHandler*) {
+bool TrimTransitionCmd::execute(CommandHandler* handler) {
     if (!transition_ || duration_ < 0 || duration_ == transition_->duration()) return false; // nothing to do
     const std::vector<MediaPtr> clips = holders(transition_);
     if (!onTrack(clips) || !fitsOn(clips, boost::make_shared<Transition>("", duration_), transition_))
         return false;
-    {
-        ScopedWriteLock lock(track_->projectMutex());
-        saved_ = transition_->duration();
-        transition_->setDuration(duration_);
-    }
-    for (const MediaPtr& clip : clips) clip->notify();
-    return true;
+    saved_ = transition_->duration();
+    return reexecute(handler);
 }
 
 bool TrimTransitionCmd::unexecute(CommandHandler*) {
+    setLength(saved_);
+    return true;
+}
+
+bool TrimTransitionCmd::reexecute(CommandHandler*) {
+    setLength(duration_);
+    return true;
+}
+
+void TrimTransitionCmd::setLength(VelaTime duration) {
     {
         ScopedWriteLock lock(track_->projectMutex());
-        transition_->setDuration(saved_);
+        transition_->setDuration(duration);
     }
     for (const MediaPtr& clip : holders(transition_)) clip->notify();
-    return true;
 }
 
 } // namespace VelaMediaLib

@@ -62,8 +62,11 @@ public:
                                                        VelaTime duration);
     bool execute(CommandHandler* handler) override;
     bool unexecute(CommandHandler* handler) override;
+    /// Gives the length again, asking for no room (it follows the undo).
+    bool reexecute(CommandHandler* handler) override;
 
 private:
+    void setLength(VelaTime duration);
     TrimTransitionCmd(const TrackPtr& track, const TransitionPtr& transition, VelaTime duration)
         : TransitionEditCmd(track), transition_(transition), duration_(duration) {}
     TransitionPtr transition_;

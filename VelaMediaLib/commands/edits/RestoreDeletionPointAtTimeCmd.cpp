@@ -22,14 +22,16 @@ private:
     boost::shared_ptr<SplitCmd> split_;
 };
 
-// Both pieces on the track, touching, and as the split left them, with every
-// transition slot and link around them: undoing the split puts back the slots
-// and links it saw, so joining under a transition given or moved since would
-// drop it or leave a slot naming another clip.
+// Both pieces on the track, touching, and as the split left them, all they
+// hold and every transition slot and link around them: undoing the split
+// puts back what it saw, so joining after an effect, a keyframe or a
+// transition was changed since would drop the change, and the join's undo
+// could not give it back.
 bool standsAsCut(const Track& track, const DeletionCuts::Cut& cut) {
     ScopedReadLock lock(track.projectLock());
-    return track.hasMedia(cut.left) && track.hasMedia(cut.right) && cut.left->state() == cut.leftState &&
-           cut.right->state() == cut.rightState && cut.slots.standsAsTaken();
+    return track.hasMedia(cut.left) && track.hasMedia(cut.right) &&
+           DeletionCuts::textOf(*cut.left) == cut.leftText &&
+           DeletionCuts::textOf(*cut.right) == cut.rightText && cut.slots.standsAsTaken();
 }
 
 // The track's points once the point is restored: the later ones move right,

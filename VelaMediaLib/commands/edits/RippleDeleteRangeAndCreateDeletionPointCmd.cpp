@@ -1,5 +1,9 @@
 #include <VelaMediaLib/commands/edits/RippleDeleteRangeAndCreateDeletionPointCmd.h>
 
+#include <VelaMediaLib/document/format/XMLOptions.h>
+
+#include <sstream>
+
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/RippleMoveCmd.h>
 
@@ -65,6 +69,13 @@ void RippleDeleteRangeAndCreateDeletionPointCmd::executeCommands(const CommandHa
             if (!deleteRange(track, range)) return;
 }
 
+std::string DeletionCuts::textOf(const Media& media) {
+    std::ostringstream out;
+    XMLOptions options(out);
+    media.toJSON(options, 0);
+    return out.str();
+}
+
 bool RippleDeleteRangeAndCreateDeletionPointCmd::cutAt(const TrackPtr& track, VelaTime time,
                                                        DeletionCuts& cuts) {
     const MediaPtr left = SplitCmd::mediaToSplit(*track, time);
@@ -72,7 +83,8 @@ bool RippleDeleteRangeAndCreateDeletionPointCmd::cutAt(const TrackPtr& track, Ve
     const boost::shared_ptr<SplitCmd> split = SplitCmd::create(track, time);
     if (!executeRequired(split)) return false;
     const MediaPtr right = split->getCreatedMedias().front();
-    DeletionCuts::Cut cut{split, left, right, left->state(), right->state(), TransitionSlots()};
+    DeletionCuts::Cut cut{
+        split, left, right, DeletionCuts::textOf(*left), DeletionCuts::textOf(*right), TransitionSlots()};
     cut.slots.takeAround(*track, left,
                          Range<VelaTime>(left->startTime(), right->endTime() - left->startTime()), true);
     cuts.cuts.push_back(cut);

@@ -7,6 +7,7 @@
 #include <VelaMediaLib/model/timeline/DeletionPoint.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
+#include <string>
 #include <vector>
 
 namespace VelaMediaLib {
@@ -19,12 +20,17 @@ struct VELAMEDIALIB_API DeletionCuts : public VelaObject {
     struct Cut {
         boost::shared_ptr<SplitCmd> split;
         MediaPtr left, right;
-        MediaState leftState, rightState;
+        /// Each piece as written right after the split: its timing and
+        /// everything it holds (effects, keyframes, animations, edge
+        /// modifications), which the split's undo puts back as it saw them.
+        std::string leftText, rightText;
         /// The slots and links around both pieces, which the split's undo
         /// puts back as it saw them before the split.
         TransitionSlots slots;
     };
     std::vector<Cut> cuts;
+    /// A clip as written on its own, to tell whether anything of it changed.
+    static std::string textOf(const Media& media);
 };
 
 /// Gives one track of a timeline a new list of deletion points; undone by

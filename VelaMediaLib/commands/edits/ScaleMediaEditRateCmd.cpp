@@ -156,8 +156,9 @@ void ScaleMediaEditRateCmd::executeCommands(const CommandHandler*) {
     if (!media_ || scale_.isIdentity()) return;
     const MediaState state = media_->state();
     const VelaTime start = start_ ? *start_ : scale_.tick(state.start);
-    if (!executeRequired(
-            SetMediaStateCmd::createRounded(track_, media_, scale_.clipState(*media_, state, start))))
+    const MediaState scaled = scale_.clipState(*media_, state, start);
+    if (!executeRequired(partOfTrack_ ? SetMediaStateCmd::createRounded(track_, media_, scaled)
+                                      : SetMediaStateCmd::create(track_, media_, scaled)))
         return;
     execute(CommandPtr(new ScaleClipContentStep(media_, scale_)));
     if (const auto visual = boost::dynamic_pointer_cast<VisualMediaImpl>(media_))

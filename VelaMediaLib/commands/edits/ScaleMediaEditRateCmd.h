@@ -26,6 +26,12 @@ public:
     /// The clip is placed at the given tick (a track keeps touching clips touching).
     static boost::shared_ptr<ScaleMediaEditRateCmd> create(const TrackPtr& track, const MediaPtr& media,
                                                            const SafeRational& factor, VelaTime start);
+    /// Marks the command as a step of a whole track's change, whose
+    /// transitions are scaled before and fitted after (ScaleMixerEditRateCmd):
+    /// the clip's new timing then does not ask for its transitions' room.
+    /// Alone, the transitions stay as they are, and a clip the change would
+    /// leave too short for them refuses it.
+    void partOfTrackChange() { partOfTrack_ = true; }
 
 protected:
     void executeCommands(const CommandHandler* handler) override;
@@ -39,6 +45,7 @@ private:
     MediaPtr media_;
     EditRateScale scale_;
     boost::optional<VelaTime> start_;
+    bool partOfTrack_ = false;
 };
 
 /// Carries a visual clip's hotspot over to another edit rate: its go-to,

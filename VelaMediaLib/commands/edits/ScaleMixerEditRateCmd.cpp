@@ -89,24 +89,30 @@ private:
     std::vector<std::pair<TransitionPtr, VelaTime>> saved_;
 };
 
-} // namespace
-
-void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRateScale& scale) {
-    if (!track || scale.isIdentity()) return;
+// The track's transitions (each once) and clips, without fitting them.
+void scaleTrackContents(MultiCommand& into, const TrackPtr& track, const EditRateScale& scale) {
     const std::vector<MediaPtr> clips = track->medias();
     const std::vector<MediaState> states = scale.trackStates(clips);
-    const CommandPtr fit(new FitTransitionsStep(track));
     std::vector<bool> later;
     for (size_t i = 0; i < clips.size(); ++i) later.push_back(states[i].start > clips[i]->startTime());
     into.execute(CommandPtr(new ScaleTransitionsStep(track, scale)));
     const auto scaleClip = [&](size_t i) {
-        if (!into.execute(ScaleMediaEditRateCmd::create(track, clips[i], scale.factor(), states[i].start)))
-            throw VelaMediaLibException("a clip refused the edit rate change");
+        const auto step = ScaleMediaEditRateCmd::create(track, clips[i], scale.factor(), states[i].start);
+        step->partOfTrackChange();
+        if (!into.execute(step)) throw VelaMediaLibException("a clip refused the edit rate change");
     };
     for (size_t i = clips.size(); i-- > 0;)
         if (later[i]) scaleClip(i);
     for (size_t i = 0; i < clips.size(); ++i)
         if (!later[i]) scaleClip(i);
+}
+
+} // namespace
+
+void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRateScale& scale) {
+    if (!track || scale.isIdentity()) return;
+    const CommandPtr fit(new FitTransitionsStep(track));
+    scaleTrackContents(into, track, scale);
     into.execute(fit);
 }
 
@@ -126,7 +132,14 @@ ScaleMixerEditRateCmd::create(const MixerPtr& mixer, const boost::rational<unsig
 }
 
 void ScaleMixerEditRateCmd::executeCommands(const CommandHandler*) {
-    for (const TrackPtr& track : mixer_->tracks()) scaleTrackEditRate(*this, track, scale_);
+    // Which clips have room is seen before anything is scaled, and the fits
+    // come after every track's transitions are: one on two tracks is scaled
+    // with its left clip's track.
+    if (scale_.isIdentity()) return;
+    std::vector<CommandPtr> fits;
+    for (const TrackPtr& track : mixer_->tracks()) fits.emplace_back(new FitTransitionsStep(track));
+    for (const TrackPtr& track : mixer_->tracks()) scaleTrackContents(*this, track, scale_);
+    for (const CommandPtr& fit : fits) execute(fit);
 }
 
 } // namespace VelaMediaLib

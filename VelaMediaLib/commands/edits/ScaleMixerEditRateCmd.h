@@ -34,7 +34,9 @@ private:
 
 /// Issues, through the composite, the steps that carry one track's
 /// transitions and clips over (what ScaleMixerEditRateCmd does per track; a
-/// stitched clip's parts go the same way). Stops at the first refusal.
+/// stitched clip's parts go the same way), then gives the clips that had room
+/// for their transitions the ticks rounding took from it. Stops at the first
+/// refusal.
 VELAMEDIALIB_API void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track,
                                          const EditRateScale& scale);
 

@@ -24,7 +24,7 @@ public:
             media_->setLeftTransition(TransitionPtr());
         else
             media_->setRightTransition(TransitionPtr());
-        return true;
+        return done();
     }
 
 private:

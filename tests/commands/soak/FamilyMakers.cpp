@@ -19,7 +19,9 @@
 #include <VelaMediaLib/commands/edits/EdgeModCloneCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendEffectsCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendMediaAnimationsCmd.h>
+#include <VelaMediaLib/commands/edits/ExtendFrameCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendMediaCmd.h>
+#include <VelaMediaLib/commands/edits/StitchingExtendFrameCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendParametersCmd.h>
 #include <VelaMediaLib/commands/edits/ExtendTracksCmd.h>
 #include <VelaMediaLib/commands/edits/MergeAnimationsCmd.h>
@@ -271,6 +273,32 @@ Edit makeTrimToFrame(Random& random, SoakState& state) {
     const VelaTime time = chance(random, 85) ? between(random, range.start() + 1, range.end())
                                              : between(random, range.start() - 5, range.end() + 5);
     return edit(TrimMediasToFrameCmd::create(t.clip, time), Described(state).clip(t.clip) << "at" << time);
+}
+
+// A frame held for a while, inserted or over what follows, or held and
+// stitched into one clip. Only clips of the source give a still (groups of
+// them too); the others throw, which counts as a refusal.
+Edit makeExtendFrame(Random& random, SoakState& state) {
+    const Target t = target(random, state);
+    const Range<VelaTime> range = t.clip->trackRange();
+    const VelaTime time = chance(random, 90) ? between(random, range.start(), range.end() - 1)
+                                             : between(random, range.start() - 3, range.end() + 3);
+    const VelaTime duration = chance(random, 95) ? between(random, 1, 20) : between(random, -2, 0);
+    Described what(state);
+    what.clip(t.clip) << "at" << time << "for" << duration;
+    if (chance(random, 30)) {
+        const VelaTime trim = between(random, 0, 10);
+        const SafeRational scalar =
+            chance(random, 70) ? SafeRational(1) : SafeRational(between(random, 1, 3), 2);
+        const bool others = chance(random, 30);
+        what << "stitched, trim" << trim << "scalar" << scalar << (others ? "on every track" : "");
+        return edit(
+            StitchingExtendFrameCmd::create(t.clip, "Hold Frame", time, duration, trim, scalar, others),
+            what);
+    }
+    const bool ripple = chance(random, 60), others = ripple && chance(random, 30);
+    what << (ripple ? "inserting" : "overwriting") << (others ? "on every track" : "");
+    return edit(ExtendFrameCmd::create(t.clip, time, duration, ripple, others), what);
 }
 
 Edit makeMediaLength(Random& random, SoakState& state) {
@@ -881,6 +909,7 @@ void addFamilyMakers(EditMakerRegistry& registry) {
     registry.add("DisplaceMediaOnUnifiedMixerCmd", 3, makeDisplace);
     registry.add("TrimMediasToFrameCmd", 2, makeTrimToFrame);
     registry.add("ExtendMediaCmd/ReduceMediaCmd", 4, makeMediaLength);
+    registry.add("ExtendFrameCmd/StitchingExtendFrameCmd", 3, makeExtendFrame);
     registry.add("ExtendTracksCmd/ReduceTracksCmd", 3, makeTrackTime);
     registry.add("Extend/Reduce{Effects,MediaAnimations,Parameters}Cmd", 3, makeContentTime);
     registry.add("TrackCleanupCmd", 2, makeCleanup);

@@ -48,6 +48,8 @@ struct SoakState {
     std::vector<MediaPtr> clips;            // every clip seen: placed, loose, inside composites
     std::vector<TransitionPtr> transitions; // every transition made
     std::unordered_set<const Media*> known; // the clips of the pool
+    boost::shared_ptr<const Source> source; // a video with a still beside it, for held frames
+    boost::shared_ptr<void> sourceStats;    // answers for that file while the run lasts
 
     /// The mixer's tracks, in order.
     std::vector<TrackPtr> tracks() const;
@@ -59,8 +61,10 @@ struct SoakState {
     MediaPtr randomPlaced(Random& random, TrackPtr* on = nullptr) const;
     /// A clip of the pool, wherever it is.
     MediaPtr randomKnown(Random& random) const { return oneOf(random, clips); }
-    /// A fresh placeholder clip (with keyframes, effects and an animation), in the pool.
-    MediaPtr newClip(Random& random);
+    /// A fresh clip (with keyframes, effects and an animation), in the pool:
+    /// mostly a placeholder, now and then (unless `placeholder`) a slice of
+    /// the source's video.
+    MediaPtr newClip(Random& random, bool placeholder = false);
     TransitionPtr newTransition(VelaTime duration);
     /// Adds the clip to the pool unless it is there.
     void remember(const MediaPtr& media);

@@ -1,6 +1,8 @@
 // The soak's project and what a run knows of it.
 #include "SoakDriver.h"
 
+#include "../../model/SourceTestSupport.h"
+
 #include <VelaMediaLib/commands/edits/AtomicEditCmd.h>
 #include <VelaMediaLib/commands/edits/GroupCmd.h>
 #include <VelaMediaLib/commands/edits/StitchMediaCmd.h>
@@ -10,6 +12,9 @@
 #include <VelaMediaLib/model/media/MediaImpl.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
 #include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/model/media/VMFile.h>
+#include <VelaMediaLib/model/project/SourceBin.h>
+#include <VelaMediaLib/model/source/Source.h>
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
 #include <algorithm>
@@ -93,12 +98,16 @@ TransitionPtr SoakState::newTransition(VelaTime duration) {
     return transitions.back();
 }
 
-MediaPtr SoakState::newClip(Random& random) {
+MediaPtr SoakState::newClip(Random& random, bool placeholder) {
     const SafeRational scalars[] = {1, 1, SafeRational(3, 2), SafeRational(2, 3), SafeRational(1, 3), 2};
     const SafeRational scalar = scalars[between(random, 0, 5)];
-    const auto clip =
-        PlaceholderMedia::createFromMediaRange(project->token(), project->editRateToken(), 0,
-                                               between(random, 0, 40), between(random, 20, 90), scalar);
+    const SafeRational mediaStart = between(random, 0, 40), mediaDuration = between(random, 20, 90);
+    const boost::shared_ptr<VisualMediaImpl> clip =
+        source && !placeholder && chance(random, 20)
+            ? boost::shared_ptr<VisualMediaImpl>(
+                  VMFile::create(source, 0, 0, mediaStart, mediaDuration, scalar))
+            : PlaceholderMedia::createFromMediaRange(project->token(), project->editRateToken(), 0,
+                                                     mediaStart, mediaDuration, scalar);
     const VelaTime duration = clip->duration();
     clip->opacity()->addKeyFrame(RationalTime(between(random, 0, 10)), 0.25, RationalTime(0));
     clip->opacity()->addKeyFrame(RationalTime(between(random, 11, 30)), 1.0, RationalTime(0));
@@ -120,16 +129,30 @@ namespace {
 
 // Placed directly, before the history starts: the track joins transitions
 // set on touching edges.
-void lineUp(SoakState& state, Random& random, GenericTrack& track, int count, bool gaps) {
+void lineUp(SoakState& state, Random& random, GenericTrack& track, int count, bool gaps, bool placeholders) {
     VelaTime end = 0;
     for (int i = 0; i < count; ++i) {
-        const MediaPtr clip = state.newClip(random);
+        const MediaPtr clip = state.newClip(random, placeholders);
         if (chance(random, 30)) clip->setRightTransition(state.newTransition(between(random, 0, 8)));
         if (chance(random, 20)) clip->setLeftTransition(state.newTransition(between(random, 0, 8)));
         if (gaps && chance(random, 40)) end += between(random, 1, 30);
         track.addMedia(clip, end);
         end += clip->duration();
     }
+}
+
+// The file's stats come from a table registered for the run, ahead of the
+// loaders that would look for it on disk.
+void loadSource(SoakState& state) {
+    const char* path = "/soak/screen.mov";
+    const auto loader = boost::make_shared<testing::RegisteredTableLoader>();
+    (*loader)->set(
+        path, {testing::stream(TrackType::Video, 0, 6000, 30), testing::stream(TrackType::Image, 0, 1, 30)});
+    const auto files = boost::make_shared<testing::FakeFileSystem>();
+    files->present.insert(path);
+    state.project->sourceBin()->setFileSystem(files);
+    state.source = state.project->sourceBin()->loadFile(path);
+    state.sourceStats = loader;
 }
 
 void must(bool done, const char* what) {
@@ -141,11 +164,12 @@ void must(bool done, const char* what) {
 SoakState buildSoakProject(Random& random) {
     SoakState state;
     state.project = Project::create(30, 1);
+    loadSource(state);
     state.mixer = state.project->newMixer("main");
     for (int t = 0; t < 4; ++t) {
         const auto track = state.project->timeline()->newTrack();
         state.project->timeline()->addTrack(state.mixer, track);
-        lineUp(state, random, *track, 6, t > 0);
+        lineUp(state, random, *track, 6, t > 0, t == 3); // the last track's are stitched below
     }
     const std::vector<TrackPtr> tracks = state.tracks();
     tracks[0]->magneticAttribute()->setValue(true);
