@@ -57,6 +57,7 @@ boost::shared_ptr<Effectable::Effects> effectsFollowingEdge(const Effectable::Ef
         const Range<VelaTime> next = movedRange(local, listed(followers, effect), before, after, startEdge);
         if (next == local) continue;
         const Effectable::EffectPtr replacement = effect->withTimeRange(next);
+        if (!replacement) continue; // a kind that says it has a place but cannot be moved stays
         if (!moved) moved.reset(new Effectable::Effects(effects));
         (*moved)[i] = replacement;
     }

@@ -241,24 +241,14 @@ TransitionPtr MediaImpl::rightTransition() const {
     return right_;
 }
 
-namespace {
-
-// The former holder's slot is emptied without touching the link, which now
-// names the new holder.
-void letGo(Media& former, const TransitionPtr& transition, bool left) {
-    if (left && former.leftTransition() == transition) former.setLeftTransition(TransitionPtr());
-    if (!left && former.rightTransition() == transition) former.setRightTransition(TransitionPtr());
-}
-
-} // namespace
-
 // The old transition lets go of the clip; the new one holds it on the side
 // facing it. A transition has one clip on each side: a clip that held it on
-// this side lets go, so no slot is left naming a transition that names
-// another clip. Setting the transition the slot already holds changes nothing.
+// this side lets go under the same lock, so no reader sees two holders and no
+// slot is left naming a transition that names another clip. Setting the
+// transition the slot already holds changes nothing.
 void MediaImpl::setTransition(TransitionPtr& slot, const TransitionPtr& transition, bool left) {
     const MediaPtr self = shared_from_this();
-    MediaPtr former;
+    boost::shared_ptr<MediaImpl> former;
     {
         ScopedWriteLock lock(projectMutex());
         if (slot == transition) return;
@@ -266,13 +256,24 @@ void MediaImpl::setTransition(TransitionPtr& slot, const TransitionPtr& transiti
         slot = transition;
         if (old && left && old->rightMedia() == self) old->setRightMedia(boost::weak_ptr<Media>());
         if (old && !left && old->leftMedia() == self) old->setLeftMedia(boost::weak_ptr<Media>());
-        if (transition) former = left ? transition->rightMedia() : transition->leftMedia();
-        if (transition && left) transition->setRightMedia(self);
-        if (transition && !left) transition->setLeftMedia(self);
+        if (transition) {
+            former = boost::dynamic_pointer_cast<MediaImpl>(left ? transition->rightMedia()
+                                                                 : transition->leftMedia());
+            if (former && former != self && (left ? former->left_ : former->right_) == transition)
+                (left ? former->left_ : former->right_).reset();
+            else
+                former.reset();
+            if (left)
+                transition->setRightMedia(self);
+            else
+                transition->setLeftMedia(self);
+        }
     }
-    if (former && former != self) letGo(*former, transition, left);
-    transitionSubject_.notify();
-    notify();
+    for (MediaImpl* told : {this, former.get()}) {
+        if (!told) continue;
+        told->transitionSubject_.notify();
+        told->notify();
+    }
 }
 
 void MediaImpl::setLeftTransition(const TransitionPtr& transition) { setTransition(left_, transition, true); }

@@ -53,13 +53,15 @@ namespace {
 
 VelaTime lengthOf(const TransitionPtr& transition) { return transition ? transition->duration() : 0; }
 
-// Whether the end parts, placed, keep the room the stitched clip's transitions
-// need (a tick less than their length, as a trimmed clip keeps).
-bool endsHaveRoom(const MediaPtr& first, const MediaPtr& last, const TransitionPtr& left,
+// Whether the end parts, placed as they will be, keep the room the stitched
+// clip's transitions need (a tick less than their length, as a trimmed clip
+// keeps); asked before anything is taken out.
+bool endsHaveRoom(const std::vector<StitchedMedia::Placement>& placements, const TransitionPtr& left,
                   const TransitionPtr& right) {
-    if (first == last) return lengthOf(left) + lengthOf(right) - 1 <= first->duration();
-    return lengthOf(left) + lengthOf(first->rightTransition()) - 1 <= first->duration() &&
-           lengthOf(last->leftTransition()) + lengthOf(right) - 1 <= last->duration();
+    const StitchedMedia::Placement &first = placements.front(), &last = placements.back();
+    if (first.media == last.media) return lengthOf(left) + lengthOf(right) - 1 <= first.state.duration;
+    return lengthOf(left) + lengthOf(first.media->rightTransition()) - 1 <= first.state.duration &&
+           lengthOf(last.media->leftTransition()) + lengthOf(right) - 1 <= last.state.duration;
 }
 
 } // namespace
@@ -75,14 +77,11 @@ bool UnstitchPartsCmd::execute(CommandHandler*) {
     touched.push_back(stitched_);
     slots_.take(touched);
     const TransitionPtr left = stitched_->leftTransition(), right = stitched_->rightTransition();
+    if (!endsHaveRoom(placements_, left, right)) return false;
     stitched_->removeAllMedias();
     try {
         for (const StitchedMedia::Placement& placement : placements_)
             restoreExactly(placement.media, placement.state);
-        if (!endsHaveRoom(placements_.front().media, placements_.back().media, left, right)) {
-            putBack();
-            return false;
-        }
         stitched_->setLeftTransition(TransitionPtr());
         stitched_->setRightTransition(TransitionPtr());
         placements_.front().media->setLeftTransition(left);
