@@ -10,6 +10,7 @@
 #include <VelaMediaLib/commands/edits/SplitCmd.h>
 #include <VelaMediaLib/commands/framework/CommandHistory.h>
 #include <VelaMediaLib/model/media/PlaceholderMedia.h>
+#include <VelaMediaLib/model/media/Transition.h>
 
 #include <atomic>
 #include <benchmark/benchmark.h>
@@ -26,12 +27,15 @@ struct MagneticProject {
     boost::shared_ptr<GenericTrack> track;
     std::vector<MediaPtr> clips;
 
-    explicit MagneticProject(int count, bool magnetic) {
+    // With `transitions`, every two touching clips share a 4-tick one.
+    explicit MagneticProject(int count, bool magnetic, bool transitions = false) {
         const auto mixer = project->newMixer("main");
         track = project->timeline()->newTrack();
         project->timeline()->addTrack(mixer, track);
         for (int i = 0; i < count; ++i) {
             clips.push_back(PlaceholderMedia::create(project->token(), project->editRateToken(), 0, 30));
+            if (transitions && i + 1 < count)
+                clips.back()->setRightTransition(TransitionPtr(new Transition("t", 4)));
             track->addMedia(clips.back(), i * 30LL);
         }
         track->magneticAttribute()->setValue(magnetic);
@@ -48,8 +52,9 @@ double millisecondsOf(const std::function<void()>& step) {
 // mediaAtTime queries on the same track (taking turns at going first), so
 // that "edit / mediaAtTime" tells the edit's cost in queries on a noisy
 // machine: the median over the iterations of edit time over one query's.
-void editAgainstQueries(benchmark::State& state, const std::function<CommandPtr(MagneticProject&)>& make) {
-    MagneticProject setup(10000, false);
+void editAgainstQueries(benchmark::State& state, const std::function<CommandPtr(MagneticProject&)>& make,
+                        bool transitions = false) {
+    MagneticProject setup(10000, false, transitions);
     const std::vector<VelaTime> ticks = [] {
         std::mt19937_64 random(11);
         std::uniform_int_distribution<VelaTime> spread(0, 10000 * 30);
@@ -99,6 +104,13 @@ void BM_SplitInTheMiddleOfTenThousand(benchmark::State& state) {
     editAgainstQueries(state, [](MagneticProject& setup) {
         return SplitCmd::create(setup.track, 5000 * 30 + 15); // inside the 5,001st clip
     });
+}
+
+// The same on a track where every edge has a transition: the edits record
+// the slots of the clips around them, so this must cost what the above does.
+void BM_SplitInTheMiddleOfTenThousandWithTransitions(benchmark::State& state) {
+    editAgainstQueries(
+        state, [](MagneticProject& setup) { return SplitCmd::create(setup.track, 5000 * 30 + 15); }, true);
 }
 
 // Each moves 10,000 clips. Target: 20 ms each.
@@ -182,6 +194,7 @@ void BM_MediaAtTimeTwoReaders_WriterMovingAndUndoing(benchmark::State& state) {
 } // namespace
 
 BENCHMARK(BM_SplitInTheMiddleOfTenThousand)->Iterations(200)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_SplitInTheMiddleOfTenThousandWithTransitions)->Iterations(200)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_RippleMoveFirstOfTenThousand)->Iterations(15)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_InsertTimeAtStartOfTenThousand)->Iterations(15)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_RemoveFirstOfTenThousandOnMagneticTrack)->Iterations(3)->Unit(benchmark::kMillisecond);
