@@ -140,6 +140,32 @@ TEST_F(TransitionRoom, ATransitionOnTwoTracksIsFittedAfterItIsScaled) {
     EXPECT_EQ(document(), atThirty);
 }
 
+// The same with the two tracks in two mixers: the project's change fits
+// once every mixer is scaled.
+TEST_F(TransitionRoom, ATransitionOnTwoMixersIsFittedAfterItIsScaled) {
+    const auto second = project->newMixer("second");
+    tracks.push_back(project->timeline()->newTrack());
+    project->timeline()->addTrack(second, tracks.back());
+    const auto upper = tracks.back();
+    const MediaPtr l = clip(20), r = clip(20), n = clip(20);
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, l, 0)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, r, 20)));
+    const TransitionPtr cross = transition();
+    cross->setDuration(6);
+    ASSERT_TRUE(project->execute(AddTransitionCmd::create(upper, l, cross, TransitionEditCmd::Right)));
+    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(upper, r)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, r, 20)));
+    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, n, 40)));
+    const TransitionPtr local = put(r, 6, TransitionEditCmd::Right);
+    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, r, 9)));
+    const std::string atThirty = document();
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
+    EXPECT_EQ(r->duration(), 22);
+    EXPECT_EQ(cross->duration() + local->duration(), 23);
+    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(30, 1)));
+    EXPECT_EQ(document(), atThirty);
+}
+
 // A cut whose pieces stand as the delete left them is joined again; a clip
 // between a transition's pulled-apart clips keeps the transition it was
 // given since, and the restore's undo needs no room the trims gave up.

@@ -103,8 +103,18 @@ void ChangeProjectEditRateCmd::executeCommands(const CommandHandler*) {
     const boost::shared_ptr<Project> project = projectOf(handler());
     const EditRateScale scale = EditRateScale::between(project->editRate(), rate_);
     const TimelinePtr timeline = project->timeline();
+    // One fit for every mixer, once all are scaled: a transition's clips
+    // may stand in two of them.
+    std::vector<TrackPtr> tracks;
     for (const MixerPtr& mixer : timeline->mixers())
-        if (!executeRequired(ScaleMixerEditRateCmd::create(mixer, scale.factor()))) return;
+        for (const TrackPtr& track : mixer->tracks()) tracks.push_back(track);
+    const CommandPtr fit = fitTransitionsStep(tracks);
+    for (const MixerPtr& mixer : timeline->mixers()) {
+        const auto scaling = ScaleMixerEditRateCmd::create(mixer, scale.factor());
+        scaling->withoutFits();
+        if (!executeRequired(scaling)) return;
+    }
+    execute(fit);
     for (const MixerPtr& clipping : project->clipBoard()->clippings())
         if (!executeRequired(ScaleMixerEditRateCmd::create(clipping, scale.factor()))) return;
     execute(CommandPtr(new ScaleTimelineKeyframesStep(timeline, scale)));

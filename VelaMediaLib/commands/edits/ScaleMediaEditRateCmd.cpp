@@ -165,11 +165,13 @@ void ScaleMediaEditRateCmd::executeCommands(const CommandHandler*) {
         if (visual->hotspot() && !executeRequired(ScaleHotspotEditRateCmd::create(media_, scale_.factor())))
             return;
     if (const auto group = boost::dynamic_pointer_cast<Group>(media_)) {
-        executeRequired(ScaleMixerEditRateCmd::create(group->mixer(), scale_.factor()));
+        const auto inner = ScaleMixerEditRateCmd::create(group->mixer(), scale_.factor());
+        if (partOfTrack_) inner->withoutFits(); // the track's change fits its groups too
+        executeRequired(inner);
         return;
     }
     if (const auto stitched = boost::dynamic_pointer_cast<StitchedMedia>(media_))
-        scaleTrackEditRate(*this, stitched->track(), scale_);
+        scaleTrackEditRate(*this, stitched->track(), scale_, !partOfTrack_);
 }
 
 boost::shared_ptr<ScaleHotspotEditRateCmd> ScaleHotspotEditRateCmd::create(const MediaPtr& media,

@@ -1,6 +1,8 @@
 #include <VelaMediaLib/commands/edits/ScaleMixerEditRateCmd.h>
 
 #include <VelaMediaLib/commands/edits/ScaleMediaEditRateCmd.h>
+#include <VelaMediaLib/model/media/Group.h>
+#include <VelaMediaLib/model/media/StitchedMedia.h>
 #include <VelaMediaLib/model/media/Transition.h>
 
 #include <algorithm>
@@ -52,26 +54,37 @@ private:
 /// (as a document may give it) is left as it is.
 class FitTransitionsStep : public Command {
 public:
-    /// Made before the change, to know which clips have room.
-    explicit FitTransitionsStep(const TrackPtr& track) : track_(track) {
-        for (const MediaPtr& clip : track->medias())
-            if (clip->duration() >= Transition::minimumTrackDuration(*clip)) roomy_.push_back(clip);
+    /// Made before the change, to know which clips have room: those of the
+    /// tracks and of the groups and stitched clips on them, at any depth.
+    explicit FitTransitionsStep(const std::vector<TrackPtr>& tracks) {
+        for (const TrackPtr& track : tracks) take(*track);
     }
 
     bool execute(CommandHandler*) override {
         saved_.clear();
-        ScopedWriteLock lock(track_->projectMutex());
+        if (roomy_.empty()) return true;
+        ScopedWriteLock lock(roomy_.front()->projectMutex());
         for (const MediaPtr& clip : roomy_) fit(*clip);
         return true;
     }
     bool unexecute(CommandHandler*) override {
-        ScopedWriteLock lock(track_->projectMutex());
+        if (roomy_.empty()) return true;
+        ScopedWriteLock lock(roomy_.front()->projectMutex());
         for (auto entry = saved_.rbegin(); entry != saved_.rend(); ++entry)
             entry->first->setDuration(entry->second);
         return true;
     }
 
 private:
+    void take(const Track& track) {
+        for (const MediaPtr& clip : track.medias()) {
+            if (clip->duration() >= Transition::minimumTrackDuration(*clip)) roomy_.push_back(clip);
+            if (const Group* group = Group::asGroup(clip.get()))
+                for (const TrackPtr& inner : group->mixer()->tracks()) take(*inner);
+            if (const auto* stitched = dynamic_cast<const StitchedMedia*>(clip.get()))
+                take(*stitched->track());
+        }
+    }
     void fit(const Media& clip) {
         for (VelaTime missing = Transition::minimumTrackDuration(clip) - clip.duration(); missing > 0;) {
             const TransitionPtr left = clip.leftTransition(), right = clip.rightTransition();
@@ -84,7 +97,6 @@ private:
         }
     }
 
-    TrackPtr track_;
     std::vector<MediaPtr> roomy_;
     std::vector<std::pair<TransitionPtr, VelaTime>> saved_;
 };
@@ -109,11 +121,15 @@ void scaleTrackContents(MultiCommand& into, const TrackPtr& track, const EditRat
 
 } // namespace
 
-void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRateScale& scale) {
+CommandPtr fitTransitionsStep(const std::vector<TrackPtr>& tracks) {
+    return CommandPtr(new FitTransitionsStep(tracks));
+}
+
+void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track, const EditRateScale& scale, bool fit) {
     if (!track || scale.isIdentity()) return;
-    const CommandPtr fit(new FitTransitionsStep(track));
+    const CommandPtr fitting = fit ? fitTransitionsStep({track}) : CommandPtr();
     scaleTrackContents(into, track, scale);
-    into.execute(fit);
+    if (fitting) into.execute(fitting);
 }
 
 boost::shared_ptr<ScaleMixerEditRateCmd> ScaleMixerEditRateCmd::create(const MixerPtr& mixer,
@@ -131,15 +147,14 @@ ScaleMixerEditRateCmd::create(const MixerPtr& mixer, const boost::rational<unsig
     return create(mixer, EditRateScale::between(from, to).factor());
 }
 
+// Which clips have room is seen before anything is scaled, and the fit
+// comes after every track's transitions are: one on two tracks is scaled
+// with its left clip's track.
 void ScaleMixerEditRateCmd::executeCommands(const CommandHandler*) {
-    // Which clips have room is seen before anything is scaled, and the fits
-    // come after every track's transitions are: one on two tracks is scaled
-    // with its left clip's track.
     if (scale_.isIdentity()) return;
-    std::vector<CommandPtr> fits;
-    for (const TrackPtr& track : mixer_->tracks()) fits.emplace_back(new FitTransitionsStep(track));
+    const CommandPtr fit = fits_ ? fitTransitionsStep(mixer_->tracks()) : CommandPtr();
     for (const TrackPtr& track : mixer_->tracks()) scaleTrackContents(*this, track, scale_);
-    for (const CommandPtr& fit : fits) execute(fit);
+    if (fit) execute(fit);
 }
 
 } // namespace VelaMediaLib

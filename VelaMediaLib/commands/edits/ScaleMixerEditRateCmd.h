@@ -22,6 +22,11 @@ public:
                                                            const boost::rational<unsigned long>& from,
                                                            const boost::rational<unsigned long>& to);
 
+    /// Leaves fitting the transitions to the change this is part of (a
+    /// project's change, or the clip change a group's mixer is scaled in),
+    /// which fits once every track is scaled (fitTransitionsStep).
+    void withoutFits() { fits_ = false; }
+
 protected:
     void executeCommands(const CommandHandler* handler) override;
 
@@ -30,14 +35,19 @@ private:
 
     MixerPtr mixer_;
     EditRateScale scale_;
+    bool fits_ = true;
 };
 
 /// Issues, through the composite, the steps that carry one track's
 /// transitions and clips over (what ScaleMixerEditRateCmd does per track; a
-/// stitched clip's parts go the same way), then gives the clips that had room
-/// for their transitions the ticks rounding took from it. Stops at the first
-/// refusal.
+/// stitched clip's parts go the same way), then, with `fit`, the track's
+/// fitTransitionsStep. Stops at the first refusal.
 VELAMEDIALIB_API void scaleTrackEditRate(MultiCommand& into, const TrackPtr& track,
-                                         const EditRateScale& scale);
+                                         const EditRateScale& scale, bool fit = true);
+/// Made before a change of edit rate and executed after it: a clip of the
+/// tracks (or of groups and stitched clips on them, at any depth) that had room for its
+/// transitions, and that rounding each length on its own left a tick short,
+/// takes the missing ticks from its longer transition. Undone exactly.
+VELAMEDIALIB_API CommandPtr fitTransitionsStep(const std::vector<TrackPtr>& tracks);
 
 } // namespace VelaMediaLib

@@ -11,6 +11,24 @@ SafeRational RationalTemporalEditor::mediaDurationFor(const MediaState& state, V
     return snap(SafeRational(duration) / state.scalar, state.fullMediaLength());
 }
 
+namespace {
+
+// Where a value's denominator outgrew the exact arithmetic (many edit-rate
+// changes multiply them) it is rounded, and the slice could then reach a
+// hair past its media: the start gives way, so the slice stays inside. A
+// slice truly past its media is left for the checks to refuse.
+void keepInside(MediaState& next) {
+    const SafeRational hair(1, 10000);
+    if (!next.maxUnbounded() && next.mediaEnd() > next.maxMediaEnd &&
+        next.mediaEnd() - next.maxMediaEnd < hair)
+        next.mediaStart = next.maxMediaEnd - next.mediaDuration;
+    if (!next.minUnbounded() && next.mediaStart < next.minMediaStart &&
+        next.minMediaStart - next.mediaStart < hair)
+        next.mediaStart = next.minMediaStart;
+}
+
+} // namespace
+
 MediaState RationalTemporalEditor::trimmedStart(const MediaState& state, VelaTime offset) {
     MediaState next = state;
     next.start += offset;
@@ -18,6 +36,7 @@ MediaState RationalTemporalEditor::trimmedStart(const MediaState& state, VelaTim
     next.mediaDuration = mediaDurationFor(state, next.duration);
     next.mediaStart =
         snap(state.mediaStart + (state.mediaDuration - next.mediaDuration), state.minMediaStart);
+    keepInside(next);
     return next;
 }
 
@@ -59,6 +78,7 @@ MediaState RationalTemporalEditor::trimEnd(const MediaState& state, VelaTime off
     MediaState next = state;
     next.duration -= offset;
     next.mediaDuration = mediaDurationFor(state, next.duration);
+    keepInside(next);
     return next;
 }
 
