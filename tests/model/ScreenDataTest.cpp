@@ -39,6 +39,22 @@ TEST(ScreenData, CursorMovesStraightBetweenSamplesAndStaysBeyondThem) {
     EXPECT_EQ(data.recordingRect(), Rect<int>(0, 0, 1920, 1080));
 }
 
+// Copies compare equal; the rectangle and each kind of sample count.
+TEST(ScreenData, EqualityTakesEveryPartIntoAccount) {
+    ScreenRecordingData data(Rect<int>(0, 0, 1920, 1080));
+    data.addCursorSample(RationalTime(20), Point3d(10, 0, 0));
+    const ScreenRecordingData copy = data;
+    EXPECT_TRUE(copy == data);
+    EXPECT_FALSE(copy != data);
+    ScreenRecordingData moved = data;
+    moved.addCursorSample(RationalTime(30), Point3d(1, 0, 0));
+    EXPECT_FALSE(moved == data);
+    ScreenRecordingData other(Rect<int>(0, 0, 1280, 720));
+    other.addCursorSample(RationalTime(20), Point3d(10, 0, 0));
+    EXPECT_FALSE(other == data);
+    EXPECT_TRUE(other != data);
+}
+
 TEST(ScreenData, RangesHoldTheirStartButNotTheirEnd) {
     ScreenRecordingData data;
     data.addClick(RationalTime(30), ScreenClick::Left);
