@@ -114,56 +114,60 @@ TEST_F(TransitionRoom, ATransitionOnTwoTracksIsScaledOnce) {
     EXPECT_EQ(fade->duration(), 12);
 }
 
+// A clip r on the fixture's track, trimmed to its least, holding a 6-tick
+// transition it shares with a clip on `upper` (pulled there from beside it)
+// and a 6-tick one with the clip after it.
+struct SharedAcross {
+    MediaPtr r;
+    TransitionPtr cross, local;
+};
+
+class TransitionAcross : public TransitionRoom {
+protected:
+    SharedAcross build(const boost::shared_ptr<GenericTrack>& upper) {
+        SharedAcross made;
+        const MediaPtr l = clip(20), n = clip(20);
+        made.r = clip(20);
+        made.cross = transition();
+        made.cross->setDuration(6);
+        EXPECT_TRUE(project->execute(AddMediaCmd::create(upper, l, 0)));
+        EXPECT_TRUE(project->execute(AddMediaCmd::create(upper, made.r, 20)));
+        EXPECT_TRUE(
+            project->execute(AddTransitionCmd::create(upper, l, made.cross, TransitionEditCmd::Right)));
+        EXPECT_TRUE(project->execute(RemoveMediaCmd::create(upper, made.r)));
+        EXPECT_TRUE(project->execute(AddMediaCmd::create(track, made.r, 20)));
+        EXPECT_TRUE(project->execute(AddMediaCmd::create(track, n, 40)));
+        made.local = put(made.r, 6, TransitionEditCmd::Right);
+        EXPECT_TRUE(project->execute(TrimEndCmd::create(track, made.r, 9)));
+        return made;
+    }
+    // To the finer rate, where the clip is fitted, and back to 30.
+    void expectFittedAndBack(const SharedAcross& made) {
+        const std::string atThirty = document();
+        ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
+        EXPECT_EQ(made.r->duration(), 22);
+        EXPECT_EQ(made.cross->duration() + made.local->duration(), 23);
+        ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(30, 1)));
+        EXPECT_EQ(document(), atThirty);
+    }
+};
+
 // The transition's right clip stands on the first track, its left clip on
 // the second: it is scaled once, and only then fitted.
-TEST_F(TransitionRoom, ATransitionOnTwoTracksIsFittedAfterItIsScaled) {
-    const auto upper = newTrack();
-    const MediaPtr l = clip(20), r = clip(20), n = clip(20);
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, l, 0)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, r, 20)));
-    const TransitionPtr cross = transition();
-    cross->setDuration(6);
-    ASSERT_TRUE(project->execute(AddTransitionCmd::create(upper, l, cross, TransitionEditCmd::Right)));
-    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(upper, r)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, r, 20)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, n, 40)));
-    const TransitionPtr local = put(r, 6, TransitionEditCmd::Right);
-    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, r, 9)));
-    const std::string atThirty = document();
-    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
-    EXPECT_EQ(r->duration(), 22);
-    EXPECT_EQ(cross->duration() + local->duration(), 23);
+TEST_F(TransitionAcross, TwoTracks) {
+    const SharedAcross made = build(newTrack());
+    expectFittedAndBack(made);
     ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(15, 1)));
-    EXPECT_EQ(cross->duration(), 3); // 6 → 12 → 11 (fitted) → 3: halved once
-    ASSERT_TRUE(project->undo());
-    ASSERT_TRUE(project->undo());
-    EXPECT_EQ(document(), atThirty);
+    EXPECT_EQ(made.cross->duration(), 3); // 6 → 12 → 11 (fitted) → 6 → 3: halved once
 }
 
-// The same with the two tracks in two mixers: the project's change fits
-// once every mixer is scaled.
-TEST_F(TransitionRoom, ATransitionOnTwoMixersIsFittedAfterItIsScaled) {
+// The two tracks in two mixers: the project's change fits once every mixer
+// is scaled.
+TEST_F(TransitionAcross, TwoMixers) {
     const auto second = project->newMixer("second");
     tracks.push_back(project->timeline()->newTrack());
     project->timeline()->addTrack(second, tracks.back());
-    const auto upper = tracks.back();
-    const MediaPtr l = clip(20), r = clip(20), n = clip(20);
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, l, 0)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(upper, r, 20)));
-    const TransitionPtr cross = transition();
-    cross->setDuration(6);
-    ASSERT_TRUE(project->execute(AddTransitionCmd::create(upper, l, cross, TransitionEditCmd::Right)));
-    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(upper, r)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, r, 20)));
-    ASSERT_TRUE(project->execute(AddMediaCmd::create(track, n, 40)));
-    const TransitionPtr local = put(r, 6, TransitionEditCmd::Right);
-    ASSERT_TRUE(project->execute(TrimEndCmd::create(track, r, 9)));
-    const std::string atThirty = document();
-    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(60000, 1001)));
-    EXPECT_EQ(r->duration(), 22);
-    EXPECT_EQ(cross->duration() + local->duration(), 23);
-    ASSERT_TRUE(project->execute(ChangeProjectEditRateCmd::create(30, 1)));
-    EXPECT_EQ(document(), atThirty);
+    expectFittedAndBack(build(tracks.back()));
 }
 
 // A cut whose pieces stand as the delete left them is joined again; a clip
