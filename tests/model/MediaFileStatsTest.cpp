@@ -183,6 +183,11 @@ TEST_F(MediaFileStatsTest, ObserversHearRealChangesOnly) {
     EXPECT_EQ(observer.count, 4);
     EXPECT_EQ(observer.last, stats.get());
     EXPECT_EQ(stats->trackType(0), TrackType::Image);
+    MediaFileStats::Contents contents = stats->contents();
+    stats->setContents(contents); // the same: nothing to hear
+    contents.filename = "c.mov";
+    stats->setContents(contents);
+    EXPECT_EQ(observer.count, 5);
     stats->detach(&observer);
 }
 
