@@ -15,12 +15,12 @@ bool TransitionEditCmd::reexecute(CommandHandler*) {
 }
 
 void TransitionEditCmd::saveSlots(const std::vector<MediaPtr>& clips) {
-    saved_ = clips;
+    recorded_ = clips;
     slots_.take(clips);
 }
 
 bool TransitionEditCmd::done() {
-    after_.take(saved_);
+    after_.take(recorded_);
     return true;
 }
 

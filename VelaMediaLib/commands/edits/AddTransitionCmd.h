@@ -30,7 +30,7 @@ protected:
     TrackPtr track_;
 
 private:
-    std::vector<MediaPtr> saved_;
+    std::vector<MediaPtr> recorded_; // the clips whose slots are kept
     TransitionSlots slots_, after_;
 };
 
