@@ -57,19 +57,18 @@ public:
     /// Made before the change, to know which clips have room: those of the
     /// tracks and of the groups and stitched clips on them, at any depth.
     explicit FitTransitionsStep(const std::vector<TrackPtr>& tracks) {
+        if (!tracks.empty()) token_ = tracks.front()->projectMutex();
         for (const TrackPtr& track : tracks) take(*track);
     }
 
     bool execute(CommandHandler*) override {
         saved_.clear();
-        if (roomy_.empty()) return true;
-        ScopedWriteLock lock(roomy_.front()->projectMutex());
+        ScopedWriteLock lock(token_);
         for (const MediaPtr& clip : roomy_) fit(*clip);
         return true;
     }
     bool unexecute(CommandHandler*) override {
-        if (roomy_.empty()) return true;
-        ScopedWriteLock lock(roomy_.front()->projectMutex());
+        ScopedWriteLock lock(token_);
         for (auto entry = saved_.rbegin(); entry != saved_.rend(); ++entry)
             entry->first->setDuration(entry->second);
         return true;
@@ -97,6 +96,7 @@ private:
         }
     }
 
+    boost::weak_ptr<const ThreadSafe> token_; // the tracks' project
     std::vector<MediaPtr> roomy_;
     std::vector<std::pair<TransitionPtr, VelaTime>> saved_;
 };

@@ -14,17 +14,14 @@ SafeRational RationalTemporalEditor::mediaDurationFor(const MediaState& state, V
 namespace {
 
 // Where a value's denominator outgrew the exact arithmetic (many edit-rate
-// changes multiply them) it is rounded, and the slice could then reach a
-// hair past its media: the start gives way, so the slice stays inside. A
-// slice truly past its media is left for the checks to refuse.
+// changes multiply them) it is rounded, and a start trim's slice could then
+// reach a hair past the end of its media: its start gives way, so the slice
+// stays inside. (A start a hair before the media's is snapped to it already;
+// an end trim keeps its start and its check refuses a slice past the end.)
 void keepInside(MediaState& next) {
-    const SafeRational hair(1, 10000);
     if (!next.maxUnbounded() && next.mediaEnd() > next.maxMediaEnd &&
-        next.mediaEnd() - next.maxMediaEnd < hair)
+        next.mediaEnd() - next.maxMediaEnd < SafeRational(1, 10000))
         next.mediaStart = next.maxMediaEnd - next.mediaDuration;
-    if (!next.minUnbounded() && next.mediaStart < next.minMediaStart &&
-        next.minMediaStart - next.mediaStart < hair)
-        next.mediaStart = next.minMediaStart;
 }
 
 } // namespace
@@ -78,7 +75,6 @@ MediaState RationalTemporalEditor::trimEnd(const MediaState& state, VelaTime off
     MediaState next = state;
     next.duration -= offset;
     next.mediaDuration = mediaDurationFor(state, next.duration);
-    keepInside(next);
     return next;
 }
 
