@@ -133,8 +133,11 @@ void lineUp(SoakState& state, Random& random, GenericTrack& track, int count, bo
     VelaTime end = 0;
     for (int i = 0; i < count; ++i) {
         const MediaPtr clip = state.newClip(random, placeholders);
-        if (chance(random, 30)) clip->setRightTransition(state.newTransition(between(random, 0, 8)));
-        if (chance(random, 20)) clip->setLeftTransition(state.newTransition(between(random, 0, 8)));
+        // Only where they fit: the project starts as the edits keep it.
+        const TransitionPtr right = chance(random, 30) ? state.newTransition(between(random, 0, 8)) : nullptr;
+        if (right && Transition::roomFor(*clip, right, nullptr)) clip->setRightTransition(right);
+        const TransitionPtr left = chance(random, 20) ? state.newTransition(between(random, 0, 8)) : nullptr;
+        if (left && Transition::roomFor(*clip, left, nullptr)) clip->setLeftTransition(left);
         if (gaps && chance(random, 40)) end += between(random, 1, 30);
         track.addMedia(clip, end);
         end += clip->duration();
