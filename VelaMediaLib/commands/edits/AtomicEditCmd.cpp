@@ -157,7 +157,7 @@ bool AddMediaCmd::execute(CommandHandler* handler) {
     need(handler);
     // A clip whose transitions were lengthened while it was off the track is
     // placed only with the room they need (an undo putting a clip back asks not).
-    if (media_ && media_->duration() < Transition::minimumTrackDuration(*media_)) return false;
+    if (media_ && !Transition::keepsRoom(*media_, media_->duration())) return false;
     saveState(media_ ? Range<VelaTime>(amount_, media_->duration()) : Range<VelaTime>());
     return keep(handler->addMedia(track_, media_, amount_));
 }

@@ -54,8 +54,7 @@ CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::stretchMedia(con
     bool roomy = true;
     const TrackAndMedia done = attempt(track, media, [&] {
         // The clip's transitions keep their room, as a trim keeps it.
-        const VelaTime duration = media->trackRangeWithRationalStretch(factor).duration();
-        roomy = duration >= Transition::minimumTrackDuration(*media);
+        roomy = Transition::keepsRoom(*media, media->trackRangeWithRationalStretch(factor).duration());
         if (roomy) track->stretch(media, factor);
     });
     return roomy ? done : TrackAndMedia();

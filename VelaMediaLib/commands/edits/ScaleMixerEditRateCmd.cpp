@@ -77,7 +77,7 @@ public:
 private:
     void take(const Track& track) {
         for (const MediaPtr& clip : track.medias()) {
-            if (clip->duration() >= Transition::minimumTrackDuration(*clip)) roomy_.push_back(clip);
+            if (Transition::keepsRoom(*clip, clip->duration())) roomy_.push_back(clip);
             if (const Group* group = Group::asGroup(clip.get()))
                 for (const TrackPtr& inner : group->mixer()->tracks()) take(*inner);
             if (const auto* stitched = dynamic_cast<const StitchedMedia*>(clip.get()))

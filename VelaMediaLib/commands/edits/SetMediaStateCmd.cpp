@@ -31,7 +31,7 @@ bool SetMediaStateCmd::execute(CommandHandler* handler) {
             track_ = boost::dynamic_pointer_cast<Track>(parent);
         });
     }
-    if (!track_ || (keepRoom_ && state_.duration < Transition::minimumTrackDuration(*media_))) return false;
+    if (!track_ || (keepRoom_ && !Transition::keepsRoom(*media_, state_.duration))) return false;
     saveState();
     return keep(handler->restoreMediaState(track_, media_, state_));
 }

@@ -15,7 +15,7 @@ bool StretchTrimCmd::execute(CommandHandler* handler) {
     if (amount_ >= saved_.duration || amount_ < -kLongest || saved_.mediaDuration <= SafeRational(0))
         return false;
     const VelaTime duration = saved_.duration - amount_;
-    if (duration < Transition::minimumTrackDuration(*media_)) return false; // as a trim keeps it
+    if (!Transition::keepsRoom(*media_, duration)) return false; // as a trim keeps it
     MediaState next = saved_;
     next.duration = duration;
     next.scalar = SafeRational(duration) / saved_.mediaDuration;

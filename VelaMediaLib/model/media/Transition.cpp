@@ -30,9 +30,7 @@ bool Transition::roomFor(const Media& clip, const TransitionPtr& in, const Trans
 }
 
 VelaTime Transition::minimumTrackDuration(const Media& clip) {
-    const TransitionPtr left = clip.leftTransition(), right = clip.rightTransition();
-    const VelaTime sum = (left ? left->duration() : 0) + (right ? right->duration() : 0);
-    return sum - 1 > 0 ? sum - 1 : 0;
+    return minimumTrackDuration(lengthOf(clip.leftTransition()), lengthOf(clip.rightTransition()));
 }
 
 namespace {

@@ -56,10 +56,22 @@ public:
     /// later take one tick more (the temporal editor's minimum).
     static bool roomFor(const Media& clip, const boost::shared_ptr<Transition>& in,
                         const boost::shared_ptr<Transition>& out);
-    /// The shortest track duration the clip's transitions allow: both lengths
+    /// The shortest track duration transitions of these lengths allow: both
     /// together less one tick, never negative. Trims, stretches and states
     /// set on a clip keep at least this.
+    static VelaTime minimumTrackDuration(VelaTime left, VelaTime right) {
+        return left + right - 1 > 0 ? left + right - 1 : 0;
+    }
+    /// The same for the clip's own transitions.
     static VelaTime minimumTrackDuration(const Media& clip);
+    /// Whether a clip of this duration keeps the room its transitions need.
+    static bool keepsRoom(const Media& clip, VelaTime duration) {
+        return duration >= minimumTrackDuration(clip);
+    }
+    /// A transition's length, 0 for none.
+    static VelaTime lengthOf(const boost::shared_ptr<Transition>& transition) {
+        return transition ? transition->duration() : 0;
+    }
 
     boost::shared_ptr<Transition> clone() const {
         const boost::shared_ptr<Transition> copy(new Transition(name_, duration_));

@@ -51,17 +51,19 @@ bool StitchPartsCmd::unexecute(CommandHandler*) {
 
 namespace {
 
-VelaTime lengthOf(const TransitionPtr& transition) { return transition ? transition->duration() : 0; }
-
 // Whether the end parts, placed as they will be, keep the room the stitched
 // clip's transitions need (a tick less than their length, as a trimmed clip
 // keeps); asked before anything is taken out.
 bool endsHaveRoom(const std::vector<StitchedMedia::Placement>& placements, const TransitionPtr& left,
                   const TransitionPtr& right) {
+    const auto length = &Transition::lengthOf;
     const StitchedMedia::Placement &first = placements.front(), &last = placements.back();
-    if (first.media == last.media) return lengthOf(left) + lengthOf(right) - 1 <= first.state.duration;
-    return lengthOf(left) + lengthOf(first.media->rightTransition()) - 1 <= first.state.duration &&
-           lengthOf(last.media->leftTransition()) + lengthOf(right) - 1 <= last.state.duration;
+    if (first.media == last.media)
+        return first.state.duration >= Transition::minimumTrackDuration(length(left), length(right));
+    return first.state.duration >=
+               Transition::minimumTrackDuration(length(left), length(first.media->rightTransition())) &&
+           last.state.duration >=
+               Transition::minimumTrackDuration(length(last.media->leftTransition()), length(right));
 }
 
 } // namespace
