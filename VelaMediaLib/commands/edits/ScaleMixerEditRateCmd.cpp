@@ -90,6 +90,7 @@ private:
             const TransitionPtr longer =
                 !right || (left && left->duration() >= right->duration()) ? left : right;
             const VelaTime taken = std::min(missing, longer->duration());
+            if (taken <= 0) return; // nothing left to give (one transition in both slots)
             saved_.emplace_back(longer, longer->duration());
             longer->setDuration(longer->duration() - taken);
             missing -= taken;

@@ -94,12 +94,13 @@ private:
 
     void checkClip(const Media& clip, size_t c) {
         const MediaState s = clip.state();
-        // As the clip's own restore check measures it: after many edit-rate
-        // changes denominators outgrow exact arithmetic and a value is
-        // rounded, so a slice may pass a bound by a hair the model accepts.
-        const double kAccepted = 0.001;
-        if ((!s.minUnbounded() && (s.minMediaStart - s.mediaStart).asDouble() > kAccepted) ||
-            (!s.maxUnbounded() && (s.mediaEnd() - s.maxMediaEnd).asDouble() > kAccepted))
+        // As the clip's own restore check measures it: no start before the
+        // media's, and an end past it by no more than 0.001 (after many
+        // edit-rate changes denominators outgrow exact arithmetic and a value
+        // is rounded, so the end may pass by a hair the model accepts).
+        const double kAcceptedPastEnd = 0.001;
+        if (s.mediaStart < s.minMediaStart ||
+            (!s.maxUnbounded() && (s.mediaEnd() - s.maxMediaEnd).asDouble() > kAcceptedPastEnd))
             out_ << "clip " << c << ": media outside its limits; ";
         if (!Group::asGroup(&clip) && !dynamic_cast<const StitchedMedia*>(&clip) &&
             s.duration != RationalUtil::toVelaTime(RationalUtil::Round(s.mediaDuration * s.scalar)))
