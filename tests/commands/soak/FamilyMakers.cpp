@@ -250,7 +250,7 @@ EditMaker makeReplace(bool ripple) {
 }
 
 Edit makeDisplace(Random& random, SoakState& state) {
-    const TrackPtr track = chance(random, 8) ? TrackPtr() : state.randomTrack(random); // none: throws
+    const TrackPtr track = chance(random, 15) ? TrackPtr() : state.randomTrack(random); // none: throws
     const long long kind = between(random, 0, 9);
     const MediaPtr clip = kind < 6   ? freshClip(random, state)
                           : kind < 9 ? state.randomPlaced(random) // dragged from where it stands

@@ -18,14 +18,25 @@
 #include <VelaMediaLib/model/timeline/Timeline.h>
 
 #include <algorithm>
+#include <cstdint>
+#include <limits>
 #include <stdexcept>
 
 namespace VelaMediaLib {
 namespace soak {
 
+// Drawn from the engine's raw output with rejection rather than through a
+// standard distribution, whose draws differ between standard libraries: a
+// seed names the same edits under every compiler.
 long long between(Random& random, long long low, long long high) {
     if (high < low) high = low; // a track may end before 0
-    return std::uniform_int_distribution<long long>(low, high)(random);
+    const uint64_t span = uint64_t(high) - uint64_t(low) + 1;
+    const uint64_t most = std::numeric_limits<uint64_t>::max();
+    if (span == 0) return (long long)random(); // the whole range
+    const uint64_t limit = most - most % span; // a multiple of span: every value as likely
+    uint64_t draw = random();
+    while (draw >= limit) draw = random();
+    return (long long)(uint64_t(low) + draw % span);
 }
 
 bool chance(Random& random, int percent) { return between(random, 1, 100) <= percent; }
