@@ -48,7 +48,7 @@ double millisecondsOf(const std::function<void()>& step) {
     return std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - start).count();
 }
 
-// An edit and its undo, each timed alone, alternating with a batch of
+// An edit, its undo and its redo, each timed alone, alternating with a batch of
 // mediaAtTime queries on the same track (taking turns at going first), so
 // that "edit / mediaAtTime" tells the edit's cost in queries on a noisy
 // machine: the median over the iterations of edit time over one query's.
@@ -64,11 +64,11 @@ void editAgainstQueries(benchmark::State& state, const std::function<CommandPtr(
     }();
     const size_t batch = 2000;
     size_t next = 0;
-    std::vector<double> editRatios, undoRatios, edits, undos, queries;
+    std::vector<double> editRatios, undoRatios, redoRatios, edits, undos, redos, queries;
     bool queriesFirst = true;
     for (auto _ : state) {
         const CommandPtr command = make(setup);
-        double query = 0, edit = 0, undo = 0;
+        double query = 0, edit = 0, undo = 0, redo = 0;
         const auto ask = [&] {
             query = millisecondsOf([&] {
                         for (size_t i = 0; i < batch; ++i)
@@ -81,6 +81,10 @@ void editAgainstQueries(benchmark::State& state, const std::function<CommandPtr(
             if (!setup.project->execute(command)) state.SkipWithError("the edit was refused");
         });
         undo = millisecondsOf([&] { setup.project->undo(); });
+        redo = millisecondsOf([&] {
+            if (!setup.project->redo()) state.SkipWithError("the redo was refused");
+        });
+        setup.project->undo();
         if (!queriesFirst) ask();
         queriesFirst = !queriesFirst;
         // Dropped outside the timing: the next edit would release it.
@@ -88,15 +92,19 @@ void editAgainstQueries(benchmark::State& state, const std::function<CommandPtr(
         history->restoreState(CommandHistoryState{history->undoStack(), {}});
         editRatios.push_back(edit / query);
         undoRatios.push_back(undo / query);
+        redoRatios.push_back(redo / query);
         edits.push_back(edit);
         undos.push_back(undo);
+        redos.push_back(redo);
         queries.push_back(query);
     }
     state.counters["edit_us"] = Interleaved::median(edits) * 1e3;
     state.counters["undo_us"] = Interleaved::median(undos) * 1e3;
+    state.counters["redo_us"] = Interleaved::median(redos) * 1e3;
     state.counters["mediaAtTime_ns"] = Interleaved::median(queries) * 1e6;
     state.counters["edit / mediaAtTime"] = Interleaved::median(editRatios);
     state.counters["undo / mediaAtTime"] = Interleaved::median(undoRatios);
+    state.counters["redo / mediaAtTime"] = Interleaved::median(redoRatios);
 }
 
 // Target: 50 us each, history included.
