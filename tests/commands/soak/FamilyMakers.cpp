@@ -222,11 +222,11 @@ Edit makeRepeat(Random& random, SoakState& state) {
     const MediaPtr pattern = chance(random, 80) ? state.randomPlaced(random) : state.randomKnown(random);
     const VelaTime most =
         std::max<VelaTime>(1, std::min<VelaTime>(200, (pattern ? pattern->duration() : 1) * 4));
-    const Range<VelaTime> range =
-        chance(random, 60)
-            ? Range<VelaTime>(trackEnd(track) + between(random, 0, 20), between(random, 1, most))
-            : Range<VelaTime>(between(random, -5, trackEnd(track)),
-                              between(random, -2, most)); // no length: throws
+    const bool after = chance(random, 60);
+    const VelaTime start =
+        after ? trackEnd(track) + between(random, 0, 20) : between(random, -5, trackEnd(track));
+    const VelaTime length = after ? between(random, 1, most) : between(random, -2, most); // no length: throws
+    const Range<VelaTime> range(start, length);
     return edit(RepeatMediaToFillRangeCmd::create(track, pattern, range),
                 Described(state).track(track).clip(pattern)
                     << "over" << range.start() << "for" << range.duration());
@@ -602,8 +602,9 @@ std::vector<OnClip> edgeModifications(const SoakState& state) {
 EdgeModificationPtr newModification(Random& random, const MediaPtr& clip) {
     const VelaTime most = clip ? clip->duration() : 10;
     const VelaTime duration = chance(random, 92) ? between(random, 0, most) : most + between(random, 1, 5);
-    return EdgeModificationPtr(new EdgeModification(duration, chance(random, 70) ? "fade" : "duck",
-                                                    double(between(random, 0, 4)) / 4));
+    const char* kind = chance(random, 70) ? "fade" : "duck";
+    const double level = double(between(random, 0, 4)) / 4;
+    return EdgeModificationPtr(new EdgeModification(duration, kind, level));
 }
 
 Edit makeEdgeMod(Random& random, SoakState& state) {
@@ -805,7 +806,8 @@ Edit makeKeyframes(Random& random, SoakState& state) {
     }
     case 5:
     case 6: {
-        const Range<RationalTime> range(RationalTime(between(random, 0, duration)),
+        const long long from = between(random, 0, duration);
+        const Range<RationalTime> range(RationalTime(from),
                                         RationalTime(between(random, chance(random, 3) ? -1 : 1, 20)));
         const double value = chance(random, 98) ? double(between(random, 0, 4)) / 4
                                                 : std::numeric_limits<double>::quiet_NaN(); // throws
@@ -813,7 +815,8 @@ Edit makeKeyframes(Random& random, SoakState& state) {
                     what << "hold" << value << "from" << range.start());
     }
     case 7: { // placeholders have no volume: throws
-        const Range<VelaTime> range(between(random, 0, duration), between(random, 1, 20));
+        const VelaTime from = between(random, 0, duration);
+        const Range<VelaTime> range(from, between(random, 1, 20));
         return edit(SetVolumeInRangeCmd::create(t.clip, range, 0.5), what << "volume");
     }
     default: {
@@ -849,7 +852,8 @@ std::string copied(Random& random, const SoakState& state, Described& what, size
     const size_t first = size_t(between(random, 0, (long long)all.size() - 1));
     const size_t last = std::min(all.size() - 1, first + size_t(between(random, 0, 2)));
     const std::vector<TrackPtr> from(all.begin() + first, all.begin() + last + 1);
-    const Range<VelaTime> range(between(random, 0, mixerEnd(state)), between(random, 1, 80));
+    const VelaTime at = between(random, 0, mixerEnd(state));
+    const Range<VelaTime> range(at, between(random, 1, 80));
     what << "copy of" << from.size() << "tracks from" << range.start() << "for" << range.duration();
     count = from.size();
     return CopyRangeClippingCmd::clippingDocument(*state.project, from, range);
@@ -883,8 +887,8 @@ Edit makePaste(Random& random, SoakState& state) {
 Edit makeCopyAndPaste(Random& random, SoakState& state) {
     Described what(state);
     std::vector<TrackPtr> tracks = someTracks(random, state, what);
-    const Range<VelaTime> range(between(random, 0, mixerEnd(state)),
-                                between(random, chance(random, 3) ? 0 : 1, 60));
+    const VelaTime from = between(random, 0, mixerEnd(state));
+    const Range<VelaTime> range(from, between(random, chance(random, 3) ? 0 : 1, 60));
     VelaTime end = 0;
     for (const TrackPtr& track : tracks) end = std::max(end, track->endTime());
     const VelaTime time = chance(random, 60) ? end + between(random, 0, 20) : between(random, -3, end);
