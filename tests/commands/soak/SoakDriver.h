@@ -30,6 +30,9 @@ namespace soak {
 typedef std::mt19937_64 Random;
 
 /// A whole number from low to high, both included (low when high is below it).
+/// The same seed gives the same numbers under every standard library; keep
+/// it so by never passing two draws as arguments of one call (the compiler
+/// picks their order): draw each into a variable of its own.
 long long between(Random& random, long long low, long long high);
 /// True with the chance percent / 100.
 bool chance(Random& random, int percent);
