@@ -178,6 +178,9 @@ TEST_F(GroupCommand, ResizeUndoesToTheSizeBefore) {
     EXPECT_EQ(std::make_pair(group->width(), group->height()), std::make_pair(640, 360));
     EXPECT_FALSE(project->execute(ResizeGroupCmd::create(group, 640, 360))); // nothing to record
     EXPECT_EQ(steps(), 1u);
+    ASSERT_TRUE(project->execute(ResizeGroupCmd::create(group, 1280, 360))); // the width alone
+    EXPECT_EQ(group->width(), 1280);
+    ASSERT_TRUE(project->undo());
     ASSERT_TRUE(project->undo());
     EXPECT_EQ(group->groupMediaState().width, 300);
     EXPECT_EQ(group->groupMediaState().height, 200);

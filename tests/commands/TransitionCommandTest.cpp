@@ -48,6 +48,9 @@ TEST_F(TransitionCommand, RemoveReplaceSplitAndTrimUndoExactly) {
     expectExactUndo(SplitTransitionCmd::create(track, wipe));
     EXPECT_EQ(a->rightTransition(), wipe);
     EXPECT_TRUE(b->leftTransition() && b->leftTransition() != wipe);
+    const auto elsewhere = newTrack(); // the clips are not on it
+    expectRefused(RemoveTransitionCmd::create(elsewhere, wipe));
+    expectRefused(ReplaceTransitionCmd::create(elsewhere, wipe, transition()));
     expectExactUndo(RemoveTransitionCmd::create(track, wipe));
     EXPECT_FALSE(a->rightTransition());
     expectRefused(TrimTransitionCmd::create(track, fade, -1));
