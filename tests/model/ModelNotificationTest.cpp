@@ -88,6 +88,10 @@ TEST_F(ModelNotification, EditsThatChangeNothingTellNobody) {
     media->setRightTransition(fade);
     media->setIdentifier("clip");
     media->setLeftEdgeModificationLength(4);
+    // The quiet setter tells its caller whether to notify.
+    EXPECT_FALSE(media->setLeftEdgeModificationsUnnotified(media->leftEdgeModifications()));
+    EXPECT_TRUE(
+        media->setRightEdgeModificationsUnnotified({EdgeModificationPtr(new EdgeModification(2, "g", 0))}));
     EXPECT_EQ(counter.count, 0);
     media->move(1);
     media->detach(&counter);
