@@ -73,6 +73,10 @@ TEST_F(TransitionRoom, StretchesAndStatesKeepTheRoomATrimKeeps) {
     put(a, 6, TransitionEditCmd::Left);
     put(a, 6, TransitionEditCmd::Right);
     expectRefusedDocument(StretchCmd::create(a, SafeRational(1, 2)));
+    // The model itself refuses it, to a host editing without commands too.
+    EXPECT_THROW(track->stretch(a, SafeRational(1, 2)), ValueException<double>);
+    EXPECT_THROW(a->trackRangeWithRationalStretch(SafeRational(1, 2)), ValueException<double>);
+    EXPECT_EQ(a->duration(), 20);
     expectRefusedDocument(StretchTrimEndCmd::create(a, 10));
     expectRefusedDocument(StretchTrimStartCmd::create(a, 10));
     MediaState tooShort = a->state();
@@ -83,6 +87,9 @@ TEST_F(TransitionRoom, StretchesAndStatesKeepTheRoomATrimKeeps) {
     expectExactDocumentUndo(StretchTrimEndCmd::create(a, 9));
     ASSERT_TRUE(project->undo());
     expectExactDocumentUndo(TrimEndCmd::create(track, a, 9));
+    EXPECT_EQ(a->duration(), 11);
+    ASSERT_TRUE(project->undo());
+    expectExactDocumentUndo(StretchCmd::create(a, SafeRational(11, 20))); // to the least exactly
     EXPECT_EQ(a->duration(), 11);
 }
 

@@ -1,7 +1,6 @@
 #include <VelaMediaLib/model/timeline/CollisionException.h>
 #include <VelaMediaLib/commands/edits/CommandHandler.h>
 
-#include <VelaMediaLib/model/media/Transition.h>
 #include <VelaMediaLib/model/timeline/GenericTrack.h>
 
 namespace VelaMediaLib {
@@ -22,7 +21,7 @@ CommandHandler::TrackAndMedia attempt(const TrackPtr& track, const MediaPtr& med
         return CommandHandler::TrackAndMedia();
     } catch (const AddRemoveException&) {
         return CommandHandler::TrackAndMedia();
-    } catch (const ValueException<double>&) { // a stretch to nothing
+    } catch (const ValueException<double>&) { // a stretch to nothing, or too short for its transitions
         return CommandHandler::TrackAndMedia();
     } catch (const ValueException<const SafeRational>&) { // a state the clip does not accept
         return CommandHandler::TrackAndMedia();
@@ -51,13 +50,7 @@ ProjectIndependentCommandHandler::trimMediaEnd(const TrackPtr& track, const Medi
 CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::stretchMedia(const TrackPtr& track,
                                                                              const MediaPtr& media,
                                                                              const SafeRational& factor) {
-    bool roomy = true;
-    const TrackAndMedia done = attempt(track, media, [&] {
-        // The clip's transitions keep their room, as a trim keeps it.
-        roomy = Transition::keepsRoom(*media, media->trackRangeWithRationalStretch(factor).duration());
-        if (roomy) track->stretch(media, factor);
-    });
-    return roomy ? done : TrackAndMedia();
+    return attempt(track, media, [&] { track->stretch(media, factor); });
 }
 
 CommandHandler::TrackAndMedia ProjectIndependentCommandHandler::restoreMediaState(const TrackPtr& track,

@@ -31,6 +31,9 @@ MediaState RationalMediaEditor::stretch(const MediaState& state, const SafeRatio
     stretched.duration = durationFor(state.mediaDuration, stretched.scalar);
     if (stretched.duration <= 0 || stretched.scalar <= 0)
         throw ValueException<double>("invalid duration after media stretch (<=0)", factor.asDouble());
+    if (stretched.duration < minimumTrackDuration()) // as a trim keeps it
+        throw ValueException<double>("a stretch must leave the clip room for its transitions",
+                                     factor.asDouble());
     return stretched;
 }
 

@@ -27,7 +27,8 @@ public:
     /// range and the start kept, and the duration the media duration times the
     /// new scalar to the nearest tick (not the old, already rounded duration
     /// scaled, which would drift). Throws ValueException<double>
-    /// "invalid duration after media stretch (<=0)".
+    /// "invalid duration after media stretch (<=0)", and "a stretch must
+    /// leave the clip room for its transitions" below minimumTrackDuration.
     virtual MediaState stretch(const MediaState& state, const SafeRational& factor) const;
     virtual VelaTime trimEndLimit(const MediaState& state) const = 0;
     virtual VelaTime trimStartLimit(const MediaState& state) const = 0;
