@@ -86,6 +86,15 @@ TEST(ReadWriteMutexConcurrency, AWriterNeverOverlapsAnyoneElse) {
 // tightest race between a reader's announcement and the writer's flag.
 // Returns how often both were inside at once.
 namespace {
+// Spins, to start close together on two cores, but yields after a while: on
+// a loaded machine the other thread may share this one's core, and a pure
+// spin would hold it for whole time slices.
+template <typename Ready>
+void spinUntil(const Ready& ready) {
+    for (int spins = 0; !ready(); ++spins)
+        if (spins > 2000) std::this_thread::yield();
+}
+
 int overlapsOfReaderAndWriterStartingTogether(ReadWriteMutex& mutex, int rounds) {
     std::atomic<int> round{-1}, arrived{0}, overlaps{0};
     std::atomic<bool> readerIn{false}, writerIn{false};
@@ -97,13 +106,13 @@ int overlapsOfReaderAndWriterStartingTogether(ReadWriteMutex& mutex, int rounds)
     std::thread reader([&] {
         for (int r = 0; r < rounds; ++r) {
             ++arrived;
-            while (round.load(std::memory_order_acquire) != r) {}
+            spinUntil([&] { return round.load(std::memory_order_acquire) == r; });
             ScopedReadLock lock(mutex);
             inside(readerIn, writerIn);
         }
     });
     for (int r = 0; r < rounds; ++r) {
-        while (arrived.load() != r + 1) {}
+        spinUntil([&] { return arrived.load() == r + 1; });
         round.store(r, std::memory_order_release);
         for (volatile int spin = 0; spin < r % 97; ++spin) { // sweeps the writer across the reader's entry
         }
