@@ -181,6 +181,7 @@ TEST_F(GroupCommand, ResizeUndoesToTheSizeBefore) {
     ASSERT_TRUE(project->execute(ResizeGroupCmd::create(group, 1280, 360))); // the width alone
     EXPECT_EQ(group->width(), 1280);
     ASSERT_TRUE(project->undo());
+    EXPECT_EQ(std::make_pair(group->width(), group->height()), std::make_pair(640, 360));
     ASSERT_TRUE(project->undo());
     EXPECT_EQ(group->groupMediaState().width, 300);
     EXPECT_EQ(group->groupMediaState().height, 200);

@@ -15,6 +15,8 @@
 #include <VelaMediaLib/commands/edits/TrimCmd.h>
 #include <VelaMediaLib/commands/edits/UnstitchMediaCmd.h>
 #include <VelaMediaLib/model/media/StitchedMedia.h>
+#include <VelaMediaLib/commands/edits/CreateGroupCmd.h>
+#include <VelaMediaLib/model/media/Group.h>
 
 using namespace VelaMediaLib;
 using namespace VelaMediaLib::testing;
@@ -216,6 +218,85 @@ TEST_F(TransitionRoom, UnstitchingRefusesAnEndPartTooShortForItsTransition) {
     const MediaPtr stitched = stitch->stitchedMedia();
     put(stitched, 15, TransitionEditCmd::Left);
     expectRefusedDocument(UnstitchMediaCmd::create(track, stitched));
+}
+
+struct StretchCounter : Observer {
+    int count = 0;
+    void update(Observable*) override { ++count; }
+};
+
+// A refused model stretch of a clip sharing a transition with a touching
+// neighbour leaves the document, the neighbour and the observers alone.
+TEST_F(TransitionRoom, ARefusedModelStretchLeavesEverythingAlone) {
+    const MediaPtr a = place(0, 20), b = place(20, 20);
+    const TransitionPtr shared = put(a, 6, TransitionEditCmd::Right);
+    put(a, 6, TransitionEditCmd::Left);
+    ASSERT_EQ(b->leftTransition(), shared);
+    StretchCounter onA, onB;
+    a->attach(&onA);
+    b->attach(&onB);
+    const std::string before = document();
+    EXPECT_THROW(a->rationalStretch(SafeRational(1, 2)), ValueException<double>);
+    EXPECT_THROW(track->stretch(a, 0.5), ValueException<double>);
+    EXPECT_THROW(a->trackRangeWithStretch(0.5), ValueException<double>);
+    EXPECT_EQ(document(), before);
+    EXPECT_EQ(onA.count + onB.count, 0);
+    EXPECT_EQ(track->mediaAtTime(20), Track::Pair(a, b));
+    EXPECT_EQ(a->trackRangeWithRationalStretch(SafeRational(11, 20)).duration(), 11);
+    a->detach(&onA);
+    b->detach(&onB);
+    // Off the track the clip refuses the same.
+    ASSERT_TRUE(project->execute(RemoveMediaCmd::create(track, a)));
+    const MediaState off = a->state();
+    EXPECT_THROW(a->rationalStretch(SafeRational(1, 2)), ValueException<double>);
+    EXPECT_TRUE(a->state() == off);
+}
+
+// A group and a stitched clip count their own transitions, not their parts'.
+TEST_F(TransitionRoom, GroupsAndStitchedClipsKeepTheirOwnRoom) {
+    const MediaPtr a = place(0, 10), b = place(10, 10);
+    const auto group = CreateGroupCmd::create({a, b});
+    ASSERT_TRUE(project->execute(group));
+    const MediaPtr g = group->createdGroup();
+    ASSERT_EQ(g->duration(), 20);
+    put(g, 6, TransitionEditCmd::Left);
+    put(g, 6, TransitionEditCmd::Right);
+    expectRefusedDocument(StretchCmd::create(g, SafeRational(1, 2)));
+    EXPECT_THROW(g->rationalStretch(SafeRational(1, 2)), ValueException<double>);
+    expectExactDocumentUndo(StretchCmd::create(g, SafeRational(11, 20)));
+    ASSERT_TRUE(project->undo());
+    // Inside the group the clip's own transitions count (it has none).
+    ASSERT_TRUE(project->execute(StretchCmd::create(a, SafeRational(1, 5))));
+    EXPECT_EQ(a->duration(), 2);
+    ASSERT_TRUE(project->undo());
+
+    const MediaPtr c = place(40, 10), d = place(50, 10);
+    const auto stitch = StitchMediaCmd::create(track, {c, d});
+    ASSERT_TRUE(project->execute(stitch));
+    const MediaPtr s = stitch->stitchedMedia();
+    put(s, 6, TransitionEditCmd::Left);
+    put(s, 6, TransitionEditCmd::Right);
+    expectRefusedDocument(StretchCmd::create(s, SafeRational(1, 2)));
+    expectExactDocumentUndo(StretchCmd::create(s, SafeRational(11, 20)));
+}
+
+// A redo and an undo put states back without asking for room: the host
+// lengthens the transitions between them.
+TEST_F(TransitionRoom, UndoAndRedoOfAStretchAskNoRoom) {
+    const MediaPtr a = place(0, 20);
+    const TransitionPtr l = put(a, 4, TransitionEditCmd::Left), r = put(a, 4, TransitionEditCmd::Right);
+    ASSERT_TRUE(project->execute(StretchCmd::create(a, SafeRational(1, 2))));
+    project->commandHistory()->combineNextCommand();
+    ASSERT_TRUE(project->execute(StretchCmd::create(a, SafeRational(2, 5)))); // combined: 8 ticks
+    EXPECT_EQ(steps(), 4u);
+    EXPECT_EQ(a->duration(), 8);
+    ASSERT_TRUE(project->undo());
+    l->setDuration(9);
+    r->setDuration(9);
+    ASSERT_TRUE(project->redo());
+    EXPECT_EQ(a->duration(), 8);
+    ASSERT_TRUE(project->undo());
+    EXPECT_EQ(a->duration(), 20);
 }
 
 } // namespace

@@ -125,7 +125,9 @@ public:
     virtual void trimStart(VelaTime offset) = 0;
     virtual void trimEnd(VelaTime offset) = 0;
     virtual void setTrackStart(VelaTime start) = 0;
-    /// Returns the new scalar.
+    /// Returns the new scalar. Throws ValueException<double> for a stretch
+    /// to no tick, or below the room the clip's transitions need (the
+    /// previews above refuse the same).
     virtual double stretch(double factor) = 0;
     virtual SafeRational rationalStretch(const SafeRational& factor) = 0;
 

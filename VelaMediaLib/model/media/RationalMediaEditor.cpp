@@ -31,7 +31,7 @@ MediaState RationalMediaEditor::stretch(const MediaState& state, const SafeRatio
     stretched.duration = durationFor(state.mediaDuration, stretched.scalar);
     if (stretched.duration <= 0 || stretched.scalar <= 0)
         throw ValueException<double>("invalid duration after media stretch (<=0)", factor.asDouble());
-    if (stretched.duration < minimumTrackDuration()) // as a trim keeps it
+    if (stretched.duration < minimumTrackDuration()) // the least a temporal trim leaves
         throw ValueException<double>("a stretch must leave the clip room for its transitions",
                                      factor.asDouble());
     return stretched;
